@@ -1,0 +1,104 @@
+// BMimeType: what the system knows about a type of file.
+#pragma once
+
+#include <SupportDefs.h>
+
+#include <StorageDefs.h>
+
+class BBitmap;
+class BMessage;
+struct entry_ref;
+
+enum icon_size { B_LARGE_ICON = 32, B_MINI_ICON = 16 };
+
+typedef enum { B_OPEN = 0 } app_verb;
+
+#define B_APP_MIME_TYPE "application/x-vnd.Be-elfexecutable"
+#define B_ELF_APP_MIME_TYPE "application/x-vnd.Be-elfexecutable"
+#define B_PEF_APP_MIME_TYPE "application/x-be-executable"
+#define B_PE_APP_MIME_TYPE "application/x-vnd.Be-peexecutable"
+#define B_RESOURCE_MIME_TYPE "application/x-be-resource"
+#define B_FILE_MIME_TYPE "application/octet-stream"
+
+enum {
+	B_META_MIME_CHANGED = 'MMCH',
+	B_META_MIME_MODIFIED = B_META_MIME_CHANGED,
+	B_META_MIME_DELETED = 'MMDL'
+};
+
+enum {
+	B_ICON_CHANGED = 0x00000001,
+	B_PREFERRED_APP_CHANGED = 0x00000002,
+	B_ATTR_INFO_CHANGED = 0x00000004,
+	B_FILE_EXTENSIONS_CHANGED = 0x00000008,
+	B_SHORT_DESCRIPTION_CHANGED = 0x00000010,
+	B_LONG_DESCRIPTION_CHANGED = 0x00000020,
+	B_ICON_FOR_TYPE_CHANGED = 0x00000040,
+	B_APP_HINT_CHANGED = 0x00000080,
+	B_MIME_TYPE_CREATED = 0x00000100,
+	B_MIME_TYPE_DELETED = 0x00000200,
+	B_SNIFFER_RULE_CHANGED = 0x00000400,
+	B_SUPPORTED_TYPES_CHANGED = 0x00000800,
+	B_EVERYTHING_CHANGED = (int)0xFFFFFFFF
+};
+
+
+// Answers from the desktop's shared MIME database. What a program sets is kept in the user's part
+// of that database ($XDG_DATA_HOME/mime/packages), where other programs see it too.
+class BMimeType {
+public:
+	BMimeType();
+	BMimeType(const char* type);
+	virtual ~BMimeType();
+
+	status_t SetTo(const char* type);
+	void Unset();
+	status_t InitCheck() const;
+
+	const char* Type() const;
+	bool IsValid() const;
+	bool IsSupertypeOnly() const;
+	bool IsInstalled() const;
+	status_t GetSupertype(BMimeType* _type) const;
+	bool Contains(const BMimeType* type) const;
+
+	bool operator==(const BMimeType& type) const;
+	bool operator==(const char* type) const;
+
+	status_t Install();
+	status_t Delete();
+
+	// `description` has room for B_MIME_TYPE_LENGTH + 1 bytes.
+	status_t GetShortDescription(char* description) const;
+	status_t SetShortDescription(const char* description);
+	status_t GetLongDescription(char* description) const;
+	status_t SetLongDescription(const char* description);
+	// Strings in the field "extensions", without the leading dot.
+	status_t GetFileExtensions(BMessage* _extensions) const;
+	status_t SetFileExtensions(const BMessage* extensions);
+	status_t GetPreferredApp(char* signature, app_verb verb = B_OPEN) const;
+	status_t SetPreferredApp(const char* signature, app_verb verb = B_OPEN);
+	status_t GetIcon(BBitmap* icon, icon_size size) const;
+
+	// Strings in the field "super_types", or in "types".
+	static status_t GetInstalledSupertypes(BMessage* _supertypes);
+	static status_t GetInstalledTypes(BMessage* _types);
+	static status_t GetInstalledTypes(const char* supertype, BMessage* _types);
+
+	// By the file's name and first bytes; by bytes alone; by name alone.
+	static status_t GuessMimeType(const entry_ref* file, BMimeType* _type);
+	static status_t GuessMimeType(const void* buffer, int32 length, BMimeType* _type);
+	static status_t GuessMimeType(const char* filename, BMimeType* _type);
+
+	static bool IsValid(const char* type);
+
+private:
+	BMimeType(const BMimeType&);
+	BMimeType& operator=(const BMimeType&);
+
+	char* fType; // owned; NULL when unset
+	status_t fCStatus;
+};
+
+
+status_t update_mime_info(const char* path, int recursive, int synchronous, int force);

@@ -1,0 +1,19 @@
+// The whole Storage Kit.
+#pragma once
+
+#include <AppFileInfo.h>
+#include <Directory.h>
+#include <Entry.h>
+#include <EntryList.h>
+#include <File.h>
+#include <FindDirectory.h>
+#include <Mime.h>
+#include <Node.h>
+#include <NodeInfo.h>
+#include <Path.h>
+#include <ResourceStrings.h>
+#include <Resources.h>
+#include <Statable.h>
+#include <StorageDefs.h>
+#include <SymLink.h>
+#include <Volume.h>
