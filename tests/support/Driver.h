@@ -1,0 +1,71 @@
+// Driver: mouse and keys for tests, entered at the headless backend.
+#pragma once
+
+#include <string>
+#include <string_view>
+
+#include <GraphicsDefs.h>
+#include <Point.h>
+#include <Rect.h>
+#include <SupportDefs.h>
+
+class BView;
+class BWindow;
+
+
+// Each call waits until the program is idle, acts, and waits again: what the input has caused is
+// done when it returns. Modifiers are the platform's bits; B_CONTROL_KEY and B_COMMAND_KEY are one
+// key. Clicks of separate calls never make a double click. Use it from the test's thread, with no
+// window locked (a view's place is found under its window's lock).
+class Driver {
+public:
+	// Screen coordinates of a point in a view, or of the middle of its visible part.
+	static BPoint PointIn(BView* view, BPoint where);
+	static BPoint MiddleOf(BView* view);
+
+	void MoveTo(BPoint screen, uint32 modifiers = 0);
+	void MoveTo(BView* view);
+	void MoveTo(BView* view, BPoint where, uint32 modifiers = 0);
+	void Press(uint32 button = 1, uint32 modifiers = 0, int32 clicks = 1); // where the pointer is
+	void Release(uint32 button = 1, uint32 modifiers = 0);
+
+	void Click(BPoint screen, int32 times = 1, uint32 button = 1, uint32 modifiers = 0);
+	void Click(BView* view, int32 times = 1, uint32 button = 1, uint32 modifiers = 0);
+	void Click(BView* view, BPoint where, int32 times = 1, uint32 button = 1, uint32 modifiers = 0);
+	void Drag(BPoint from, BPoint to, int32 steps = 10, uint32 button = 1, uint32 modifiers = 0);
+	void Drag(BView* from, BPoint fromWhere, BView* to, BPoint toWhere, int32 steps = 10);
+	void Wheel(BPoint screen, float deltaX, float deltaY);
+	void Wheel(BView* view, float deltaX, float deltaY);
+
+	void Type(std::string_view utf8); // '\n' is Return, '\t' Tab
+	// A name of the play language ("Return", "Left", "F1", ...) or one character.
+	void Key(const char* name, uint32 modifiers = 0, int32 times = 1);
+	void KeyDown(const char* name, uint32 modifiers = 0);
+	void KeyUp(const char* name, uint32 modifiers = 0);
+
+	// As by the window's frame, from the desktop.
+	void ResizeWindow(BWindow* window, float width, float height); // right - left, bottom - top
+	void MoveWindow(BWindow* window, BPoint leftTop);
+	void CloseWindow(BWindow* window);
+	void ActivateWindow(BWindow* window);
+
+	// Input that is entered without waiting before or after, for races on purpose.
+	void SetWaiting(bool wait) { fWait = wait; }
+
+	// Aborts the test after a minute, as a hang.
+	static void WaitUntilIdle();
+
+	rgb_color PixelAt(BPoint screen); // of what the screen shows; scale 1
+	rgb_color PixelAt(BView* view, BPoint where);
+	bool Screenshot(const char* path); // PNG
+
+private:
+	void _Wait() const;
+	void _Pointer(int type, BPoint where, uint32 button, uint32 modifiers);
+	void _Key(bool down, const char* name, uint32 modifiers);
+
+	bool fWait = true;
+	BPoint fWhere;
+	uint32 fButtons = 0;
+	bigtime_t fTime = 0; // of the last event entered
+};
