@@ -1,0 +1,137 @@
+// Archives that lose nothing: what a class does to read and write its fields exactly.
+//
+// A view that was read from an archive keeps (shares) that message. When it is archived again,
+// - a field whose value is still what was read comes out as it was read: present or absent, with
+//   its type, its entries and its place among the others;
+// - a field whose value has changed is written in the platform's type, at its old place;
+// - a field that no constructor of the class chain looked up comes out untouched;
+// - a field that was looked up and is no longer written is gone.
+//
+// What the author of a class does, for all of this to hold:
+//
+// 1. In the archive constructor, read with the typed Find functions of the given message, after
+//    calling the base class's constructor, which has taken care of the rest:
+//
+//	BSlider::BSlider(BMessage* archive) : BControl(archive)
+//	{
+//		if (archive->FindInt32("_minv", &fMinValue) != B_OK)
+//			fMinValue = 0;
+//	}
+//
+// 2. In Archive(), call the base class first and write every field that the constructor reads with
+//    an ArchiveWriter, whether it is wanted or not:
+//
+//	status_t BSlider::Archive(BMessage* archive, bool deep) const
+//	{
+//		const status_t status = BControl::Archive(archive, deep);
+//		if (status != B_OK)
+//			return status;
+//		ArchiveWriter writer(archive);
+//		writer.Int32("_minv", fMinValue, 0);
+//		writer.String("_minlbl", fMinLabel, NULL, fMinLabel != NULL);
+//		return writer.Status();
+//	}
+//
+//    The third argument is the value that the constructor takes when it cannot read the field; the
+//    fourth says whether a view that was never archived, or whose value has changed, has the field
+//    at all. Where the constructor's rule is another one (it clamps, or combines fields), ask
+//    Keep() and add the field by hand. A field that is only added by hand (AddInt32() and so on)
+//    keeps its place and is not doubled either, but is always present in the platform's type.
+//
+// 3. Never adjust an archived view because it is attached: frame, colours, divider, selection and
+//    marks stay until a user or a setter changes them. is_revived() tells.
+//
+// Objects that are no views (list and menu items, tabs) hold an ArchiveSource of their own, made in
+// their base class's archive constructor, and call Begin() first in its Archive().
+#pragma once
+
+#include <memory>
+#include <span>
+#include <string_view>
+
+#include <GraphicsDefs.h>
+#include <Message.h>
+#include <Point.h>
+#include <Rect.h>
+
+class BView;
+
+namespace BPrivate {
+
+
+// Whether the view was made from an archive.
+_EXPORT bool is_revived(const BView* view);
+
+
+// What an object was read from. Shares the fields of the message, whose look-up marks tell later
+// which fields are known.
+class _EXPORT ArchiveSource {
+public:
+	explicit ArchiveSource(BMessage* archive);
+	~ArchiveSource();
+	ArchiveSource(const ArchiveSource&) = delete;
+	ArchiveSource& operator=(const ArchiveSource&) = delete;
+
+	// Puts the unknown fields into the archive and lets every field that is written afterwards take
+	// its old place. Call it before anything is written.
+	void Begin(BMessage* archive) const;
+	// The message, for a look that leaves no marks.
+	const BMessage& Message() const;
+	bool IsManaged() const;
+
+private:
+	struct Data;
+	std::unique_ptr<Data> fData;
+};
+
+
+// Writes fields into an archive that Begin() was called for, or into one of a new object.
+class _EXPORT ArchiveWriter {
+public:
+	explicit ArchiveWriter(BMessage* archive);
+
+	void Bool(const char* name, bool value, bool absent, bool wanted = true);
+	void Int8(const char* name, int8 value, int8 absent, bool wanted = true);
+	void Int16(const char* name, int16 value, int16 absent, bool wanted = true);
+	void Int32(const char* name, int32 value, int32 absent, bool wanted = true);
+	void Int64(const char* name, int64 value, int64 absent, bool wanted = true);
+	void Float(const char* name, float value, float absent, bool wanted = true);
+	void Point(const char* name, BPoint value, BPoint absent, bool wanted = true);
+	void Rect(const char* name, BRect value, BRect absent, bool wanted = true);
+	// NULL stands for no string and is never written.
+	void String(const char* name, const char* value, const char* absent, bool wanted = true);
+	// NULL stands for no message and is never written. Compares the contents.
+	void Message(const char* name, const BMessage* value, bool wanted = true);
+
+	// Several entries under one name, each of which is read alone.
+	void Int16s(const char* name, std::span<const int16> values, std::span<const int16> absent,
+		bool wanted = true);
+	void Int32s(const char* name, std::span<const int32> values, std::span<const int32> absent,
+		bool wanted = true);
+	void Floats(const char* name, std::span<const float> values, std::span<const float> absent,
+		bool wanted = true);
+	void Data(
+		const char* name, type_code type, const void* bytes, ssize_t size, bool wanted = true);
+
+	// Writes the field as it was read, or leaves it out as it was, if the object has a source and
+	// says that its value is unchanged. Otherwise false: the caller adds the field, or not.
+	bool Keep(const char* name, bool unchanged);
+	// What the object was read from; NULL for a new object. A look leaves no marks.
+	const BMessage* Source() const;
+
+	// The first error; nothing is written after it.
+	status_t Status() const { return fStatus; }
+
+private:
+	template<typename Value, typename Find, typename Add>
+	void _Write(const char* name, std::span<const Value> values, std::span<const Value> absent,
+		bool wanted, Find find, Add add);
+	void _Note(status_t status);
+
+	BMessage* fArchive; // borrowed
+	const BMessage* fSource; // borrowed from the archive's source
+	status_t fStatus = B_OK;
+};
+
+
+} // namespace BPrivate
