@@ -1,0 +1,30 @@
+// ImageDecoder: turns the bytes of an image file into a surface.
+#pragma once
+
+#include <memory>
+#include <string>
+
+#include "server/paint/Surface.h"
+#include "support/private/Result.h"
+
+namespace BPrivate {
+
+// Larger images are refused from their header, before memory is taken for their pixels.
+constexpr int32 kMaxImageSide = 16384;
+constexpr int64 kMaxImagePixels = 64 * 1024 * 1024;
+
+
+struct DecodedImage {
+	std::unique_ptr<Surface> surface; // kAlpha
+	std::string format; // "png", "jpeg" and so on
+};
+
+// The bytes may be anything. B_NO_TRANSLATOR: no known format; B_BAD_DATA: damaged or over the
+// limits; B_NO_MEMORY. Any thread.
+Result<DecodedImage> DecodeImage(const void* data, size_t size);
+
+// The surface as a file of the format ("png", "jpeg", "bmp"); B_NO_TRANSLATOR if unknown.
+Result<std::string> EncodeImage(const Surface& surface, const char* format);
+
+
+} // namespace BPrivate
