@@ -1,0 +1,52 @@
+// ArchiveSource: what a revived object keeps of the archive that it was made from.
+#pragma once
+
+#include <Message.h>
+
+namespace BPrivate {
+
+
+// Shares the archive's bytes, so it costs little more than a pointer, and knows which fields any
+// constructor of the object looked up. instantiate_object() starts the recording on the message
+// that it hands to Instantiate(); look-ups through other messages, also those that share the same
+// fields, are not recorded, so a later reader of the archive disturbs nothing.
+class ArchiveSource {
+public:
+	ArchiveSource();
+	// Starts the recording on the message if instantiate_object() has not done so.
+	explicit ArchiveSource(BMessage* archive);
+	ArchiveSource(const ArchiveSource& other);
+	ArchiveSource(ArchiveSource&& other);
+	~ArchiveSource();
+	ArchiveSource& operator=(ArchiveSource other);
+
+	bool IsSet() const;
+
+	// The archive as it was read. Look-ups through the result are not recorded.
+	BMessage Archive() const;
+
+	// A field counts as known when it was looked up, also in vain.
+	bool IsKnown(const char* name) const;
+	void SetKnown(const char* name);
+
+	// Whether the archive was part of a managed one; see ManagedArchive.h.
+	bool WasManaged() const;
+
+	// Turns what the object archives now into what is written. "before" is what the same object
+	// would archive if nothing had changed since it was revived. A field that is the same in both
+	// is written as it was read: same presence, type, entries and place. One that differs is
+	// written as in "now", in the place that it had, or at the end. All other fields of the
+	// archive, the ones never looked up among them, stay as they were read. Nested messages that
+	// are equal count as the same. Fields named in "own" are always taken from "now": the caller
+	// has already settled them ("_views").
+	status_t Merge(const BMessage& before, BMessage* now, const char* const* own = nullptr,
+		int32 ownCount = 0) const;
+
+private:
+	MessageData* fData = nullptr; // shared
+	LookUps* fLookUps = nullptr; // shared
+	uint32 fWhat = 0;
+};
+
+
+} // namespace BPrivate

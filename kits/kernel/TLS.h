@@ -1,0 +1,4 @@
+// Storage of one thread; see OS.h.
+#pragma once
+
+#include <OS.h>

@@ -1,0 +1,37 @@
+// The managed form of a deep archive: children as numbers into a list that the root carries.
+#pragma once
+
+#include <Message.h>
+
+namespace BPrivate {
+
+
+// Whether the message carries the mark of a managed archive's root.
+bool is_managed_archive(const BMessage& archive);
+
+// Turns a managed archive into the nested form in place: each token of "_views" becomes the message
+// that it names. A note stays with the message and with each child (no field: it is not flattened,
+// and goes along with copies) of where it came from, and with the root of all objects that are no
+// children of a view. A token out of range, or one that would put a view into itself or into two
+// places, is left out. Does nothing to an archive that is not managed. instantiate_object() does
+// this before the class sees the archive, and gives the caller's message back as it was.
+status_t unmanage_archive(BMessage* archive);
+
+// The opposite, for a tree whose root carries a note: collects the children below "_views" into the
+// list in the order that the form asks for (unchanged trees: the order that was read) and
+// renumbers every token field through one map. A child without a note is new; one with a note of
+// another archive too.
+status_t manage_archive(BMessage* archive);
+
+// The note of where an archive came from. Give a freshly written archive the note of its source,
+// child and root alike, before the parent adds it to "_views".
+void copy_managed_note(const BMessage& from, BMessage* to);
+void clear_managed_note(BMessage* archive);
+bool has_managed_note(const BMessage& archive); // any
+bool is_managed_root(const BMessage& archive); // of the root
+
+// Whether objects that are no views, and may hold tokens in fields that we do not know, are kept.
+bool keeps_foreign_objects(const BMessage& archive);
+
+
+} // namespace BPrivate
