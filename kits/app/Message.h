@@ -3,6 +3,7 @@
 
 #include <GraphicsDefs.h>
 #include <Messenger.h>
+#include <OS.h>
 #include <Point.h>
 #include <Rect.h>
 #include <SupportDefs.h>
@@ -74,14 +75,12 @@ public:
 	// The message is copied.
 	status_t SendReply(uint32 command, BHandler* replyTo = NULL);
 	status_t SendReply(
-		BMessage* reply, BHandler* replyTo = NULL, bigtime_t timeout = 9223372036854775807LL);
-	status_t SendReply(
-		BMessage* reply, BMessenger replyTo, bigtime_t timeout = 9223372036854775807LL);
+		BMessage* reply, BHandler* replyTo = NULL, bigtime_t timeout = B_INFINITE_TIMEOUT);
+	status_t SendReply(BMessage* reply, BMessenger replyTo, bigtime_t timeout = B_INFINITE_TIMEOUT);
 	// Synchronous: waits for the answer to the reply.
 	status_t SendReply(uint32 command, BMessage* replyToReply);
 	status_t SendReply(BMessage* reply, BMessage* replyToReply,
-		bigtime_t sendTimeout = 9223372036854775807LL,
-		bigtime_t replyTimeout = 9223372036854775807LL);
+		bigtime_t sendTimeout = B_INFINITE_TIMEOUT, bigtime_t replyTimeout = B_INFINITE_TIMEOUT);
 
 	// Bytes. Flatten() writes the R5 form in the host's byte order; see MessageForm.h for others.
 	// Unflatten() reads every form, and on an error leaves the message empty. The one that takes

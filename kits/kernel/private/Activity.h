@@ -3,7 +3,7 @@
 
 #include <atomic>
 
-#include <SupportDefs.h>
+#include <OS.h>
 
 namespace BPrivate {
 
