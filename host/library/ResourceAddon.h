@@ -2,8 +2,8 @@
 #pragma once
 
 #include <BeBuild.h>
-#include <image.h>
 #include <SupportDefs.h>
+#include <image.h>
 
 #include "host/library/ItemEditor.h"
 #include "host/library/ResourceAddonBase.h"
@@ -37,10 +37,10 @@ public:
 	virtual float PreciseQuality(const BResourceItem* item) const;
 
 	// The caller owns the editor. NULL when there is none. The configuration may be NULL.
-	virtual BMiniItemEditor* MakeMiniEditor(const BResourceAddonArgs& args, BResourceHandle handle,
-		const BMessage* configuration);
-	virtual BFullItemEditor* MakeFullEditor(const BResourceAddonArgs& args, BResourceHandle handle,
-		const BMessage* configuration);
+	virtual BMiniItemEditor* MakeMiniEditor(
+		const BResourceAddonArgs& args, BResourceHandle handle, const BMessage* configuration);
+	virtual BFullItemEditor* MakeFullEditor(
+		const BResourceAddonArgs& args, BResourceHandle handle, const BMessage* configuration);
 
 	// Data from the clipboard, from a drop, and from an imported file.
 	virtual float PasteQuality(const BMessage* clip) const;

@@ -46,7 +46,7 @@ private:
 	BResourceAddonBase& operator=(const BResourceAddonBase&) = delete;
 
 	BResourceCollection* fCollection; // borrowed
-	BHandler* fHandler;               // borrowed, may be NULL
+	BHandler* fHandler; // borrowed, may be NULL
 	BResourceHandle fPrimaryItem;
 };
 

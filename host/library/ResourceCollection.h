@@ -34,7 +34,7 @@ class _EXPORT BResourceCollection {
 public:
 	// What AddItem() does when an item of the same type and id exists.
 	enum conflict_resolution {
-		B_FAIL_ON_CONFLICT,   // B_NAME_IN_USE, nothing changes
+		B_FAIL_ON_CONFLICT, // B_NAME_IN_USE, nothing changes
 		B_REPLACE_ON_CONFLICT, // the existing item gets the new name and data
 		B_RENUMBER_ON_CONFLICT // the new item gets the next free id
 	};
@@ -45,8 +45,8 @@ public:
 	BResourceCollection& operator=(const BResourceCollection&) = delete;
 
 	int32 CountItems() const;
-	BResourceHandle HandleAt(int32 index) const;                  // invalid when out of range
-	BResourceHandle FindItem(type_code type, int32 id) const;     // invalid when there is none
+	BResourceHandle HandleAt(int32 index) const; // invalid when out of range
+	BResourceHandle FindItem(type_code type, int32 id) const; // invalid when there is none
 
 	// NULL when the handle's item is gone. Read lock.
 	const BResourceItem* Item(const BResourceHandle& handle) const;

@@ -23,7 +23,7 @@ public:
 	int32 ID() const;
 	const char* Name() const; // never NULL; "" for an item without a name
 	const void* Data() const; // NULL when Size() is 0
-	size_t Size() const;      // in bytes
+	size_t Size() const; // in bytes
 
 	// For items got by BResourceCollection::WriteItem(). A type and id that another item has give
 	// B_NAME_IN_USE and change nothing. Data is copied. Setting what is already there is no change.

@@ -1,0 +1,97 @@
+#include "archive/BitmapView.h"
+
+#include <Bitmap.h>
+#include <Message.h>
+
+namespace {
+
+
+constexpr const char* kClassName = "BitmapView";
+constexpr const char* kBitmapField = "bitmap";
+
+
+} // namespace
+
+
+// The bitmap of a revived view, and the archive that it came from: it is written back as it was.
+struct BitmapView::Source {
+	BMessage archive;
+	std::unique_ptr<BBitmap> bitmap;
+};
+
+
+BitmapView::BitmapView(BRect frame, const char* name, uint32 resizingMode, uint32 flags) :
+	BView(frame, name, resizingMode, flags), fBitmap(nullptr)
+{
+}
+
+
+BitmapView::BitmapView(BMessage* archive) : BView(archive), fBitmap(nullptr)
+{
+	auto source = std::make_unique<Source>();
+	if (archive->FindMessage(kBitmapField, &source->archive) == B_OK) {
+		source->bitmap = std::make_unique<BBitmap>(&source->archive);
+		fBitmap = source->bitmap.get();
+		fSource = std::move(source);
+	}
+}
+
+
+BitmapView::~BitmapView()
+{
+}
+
+
+BArchivable*
+BitmapView::Instantiate(BMessage* archive)
+{
+	if (!validate_instantiation(archive, kClassName))
+		return nullptr;
+	return new BitmapView(archive);
+}
+
+
+status_t
+BitmapView::Archive(BMessage* archive, bool deep) const
+{
+	BView::Archive(archive, deep);
+	if (!deep || fBitmap == nullptr)
+		return B_OK;
+
+	if (fSource != nullptr) {
+		archive->AddMessage(kBitmapField, &fSource->archive);
+		return B_OK;
+	}
+
+	BMessage bitmapArchive;
+	if (fBitmap->Archive(&bitmapArchive, deep) == B_OK)
+		archive->AddMessage(kBitmapField, &bitmapArchive);
+	return B_OK;
+}
+
+
+void
+BitmapView::AttachedToWindow()
+{
+	BView::AttachedToWindow();
+	if (fBitmap != nullptr && fBitmap->IsValid())
+		SetViewBitmap(fBitmap, B_FOLLOW_ALL_SIDES, B_TILE_BITMAP);
+}
+
+
+BBitmap*
+BitmapView::Bitmap() const
+{
+	return fBitmap;
+}
+
+
+void
+BitmapView::SetBitmap(BBitmap* bitmap)
+{
+	if (bitmap == fBitmap)
+		return;
+
+	fBitmap = bitmap;
+	fSource.reset();
+}

@@ -1,0 +1,25 @@
+// Loading, comparing, printing and converting archives of view trees.
+#pragma once
+
+#include <SupportDefs.h>
+
+class BMessage;
+class BView;
+
+// The view archived in the application's own resources under type 'ARCV', or NULL when there is no
+// such resource, its bytes are no message, or the object is no view. The caller owns the view.
+BView* ViewFromResource(int32 id);
+BView* ViewFromResource(const char* name);
+
+// Whether two archives have the same code and the same fields: same types, same entries in the
+// same order, byte for byte, nested archives by the same rule. The order of fields does not matter.
+// False when either is NULL.
+bool Equal(const BMessage* a, const BMessage* b);
+
+// Prints an archive on standard output, indented by that many tabs.
+void DumpMessage(const BMessage* message, int depth);
+
+// Converts an archive and every archive nested in it between the resource form, where the class
+// list of a placeholder ends with "LayoutInheritedView", and the live form, where it starts with
+// it. The caller passes depth 0.
+void SwapInheritedViews(BMessage* archive, int depth);

@@ -1,0 +1,50 @@
+// EditorInterface: base of the property panels, a labelled box with a target view.
+#pragma once
+
+#include <Box.h>
+
+#include "archive/ViewWatch.h"
+
+class BMenu;
+
+
+// A panel shows and edits the properties that one platform class gives to a view. It changes the
+// live view directly, under the lock of the view's window, and tells nobody. The editor makes each
+// panel once and shows it while UseView() accepts the selection.
+class EditorInterface : public BBox {
+public:
+	// Tells that the target was moved or resized in the work area; does nothing by default.
+	virtual void FrameChanged();
+
+	// Takes the view as the target if it is of the panel's class, loads every control from it, and
+	// returns whether it is. The view is borrowed; NULL for none.
+	virtual bool UseView(BView* view) = 0;
+
+	void AllAttached() override;
+
+protected:
+	// The platform class is the one whose properties are edited ("BButton"); the height in pixels
+	// less one.
+	EditorInterface(const char* name, const char* platformClass, float height);
+
+	// Sets the target, which a panel has tested to be of its class. Returns whether there is one.
+	bool TakeTarget(BView* view);
+
+	// Whether there is a target and it still exists: messages may come after it was deleted.
+	bool TargetLives() const;
+
+	// The place of the rows: margins at the left and right, the top of the first row.
+	BRect RowArea() const;
+
+	BView* target; // borrowed; NULL when the panel has no view
+
+private:
+	ViewWatch fTargetWatch;
+};
+
+
+// The layout that the panels share, in pixels.
+constexpr float kRowStep = 28;
+constexpr float kRowHeight = 12;
+constexpr float kColumnWidth = 100;
+constexpr float kColumnStep = 120;

@@ -1,0 +1,62 @@
+#include "editors/IntControl.h"
+
+#include <algorithm>
+#include <climits>
+#include <cstdio>
+#include <cstdlib>
+
+
+IntControl::IntControl(BRect frame, const char* name, const char* label, BMessage* message,
+	int value, int min, int max, uint32 resizingMode, uint32 flags) :
+	BTextControl(frame, name, label, "", message, resizingMode, flags),
+	min(min), max(max)
+{
+	SetValue(value);
+}
+
+
+void
+IntControl::SetValue(int value)
+{
+	if (value < min)
+		value = min;
+	if (value > max)
+		value = max;
+
+	char text[16];
+	snprintf(text, sizeof(text), "%d", value);
+	SetText(text);
+}
+
+
+int
+IntControl::Value() const
+{
+	// A number beyond the type counts as the type's own limit.
+	const long value = strtol(Text(), nullptr, 10);
+	return static_cast<int>(std::clamp<long>(value, INT_MIN, INT_MAX));
+}
+
+
+void
+IntControl::SetMin(int min)
+{
+	this->min = min > max ? max : min;
+	SetValue(Value());
+}
+
+
+void
+IntControl::SetMax(int max)
+{
+	this->max = max < min ? min : max;
+	SetValue(Value());
+}
+
+
+status_t
+IntControl::Invoke(BMessage* message)
+{
+	SetValue(Value());
+	return BTextControl::Invoke(message);
+}

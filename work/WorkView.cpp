@@ -1,0 +1,301 @@
+#include "work/WorkView.h"
+
+#include <cmath>
+#include <cstdio>
+
+#include <Beep.h>
+#include <Message.h>
+#include <MessageFilter.h>
+#include <Window.h>
+
+#include "archive/EditorCodes.h"
+#include "archive/ViewTree.h"
+#include "work/HiliteView.h"
+#include "work/WorkBackgroundView.h"
+#include "work/WorkViewFilter.h"
+
+namespace {
+
+
+constexpr float kScrollBarSize = 14;
+constexpr float kMargin = 8; // round the edited tree
+constexpr int32 kInitialRange = 500;
+constexpr float kGroundSize = 10000;
+constexpr uint32 kTargetFlags = B_FULL_UPDATE_ON_RESIZE | B_WILL_DRAW | B_FRAME_EVENTS;
+
+// A press whose distances to the right and to the bottom edge add up to less starts a resize.
+constexpr float kResizeZone = 12;
+
+// The third bit has no use here; masks are kept as they are given.
+constexpr uint32 kResizeEventMask = B_POINTER_EVENTS | 0x4;
+
+
+// A scroll view is made round its target, so the target is made first.
+BView*
+MakeScrollTarget(BRect frame)
+{
+	frame.right -= kScrollBarSize;
+	frame.bottom -= kScrollBarSize;
+	BView* target = new BView(frame, "scroll target", B_FOLLOW_ALL_SIDES, kTargetFlags);
+	target->SetViewColor(B_TRANSPARENT_COLOR);
+	return target;
+}
+
+
+} // namespace
+
+
+WorkView::WorkView(BRect frame, uint32 resizingMode, BHandler* editor) :
+	BScrollView("WorkView", MakeScrollTarget(frame), resizingMode, B_FRAME_EVENTS, true, true,
+		B_FANCY_BORDER),
+	fScrollOrigin(0, 0), fResizing(false), fLastResizePoint(0, 0), fRangeWidth(kInitialRange),
+	fRangeHeight(kInitialRange), fEditor(editor), fEditView(nullptr)
+{
+	fContainer = new WorkBackgroundView(BRect(0, 0, kGroundSize, kGroundSize), "container",
+		B_FOLLOW_LEFT | B_FOLLOW_TOP, kTargetFlags);
+	fHiliteView = new HiliteView(
+		fContainer->Bounds(), "hilite view", B_FOLLOW_LEFT | B_FOLLOW_TOP, B_WILL_DRAW, this);
+	Target()->AddChild(fContainer);
+	Target()->AddChild(fHiliteView);
+
+	SetRange(this, fRangeWidth, fRangeHeight);
+}
+
+
+void
+WorkView::AttachedToWindow()
+{
+	Window()->AddCommonFilter(new BMessageFilter(B_ANY_DELIVERY, B_ANY_SOURCE, WorkViewFilter));
+}
+
+
+void
+WorkView::FrameResized(float width, float height)
+{
+	BScrollView::FrameResized(width, height);
+	SetRange(this, fRangeWidth, fRangeHeight);
+	fContainer->Invalidate();
+}
+
+
+void
+WorkView::KeyDown(const char* bytes, int32 numBytes)
+{
+	if (SelectedView() == nullptr) {
+		beep();
+		return;
+	}
+
+	for (int32 i = 0; i < numBytes; i++) {
+		printf("%x\n", static_cast<unsigned char>(bytes[i])); // a trace kept on purpose
+		_HandleKey(bytes[i]);
+	}
+}
+
+
+void
+WorkView::MouseMoved(BPoint where, uint32 transit, const BMessage* drag)
+{
+	BView* selection = SelectedView();
+	if (!fResizing || selection == nullptr)
+		return;
+
+	const BPoint point = selection->ConvertFromScreen(ConvertToScreen(where));
+	selection->ResizeBy(point.x - fLastResizePoint.x, point.y - fLastResizePoint.y);
+	fLastResizePoint = point;
+	selection->Invalidate();
+
+	BMessage moved(kSelectionMoved);
+	_NotifyEditor(&moved);
+}
+
+
+void
+WorkView::MouseUp(BPoint where)
+{
+	SetEventMask(0, 0);
+	fResizing = false;
+}
+
+
+void
+WorkView::SetEditView(BView* view)
+{
+	if (fEditView != nullptr) {
+		fSelectedView.Set(nullptr);
+		fContainer->RemoveChild(fEditView);
+		delete fEditView;
+	}
+
+	fContainer->ScrollTo(BPoint(0, 0));
+	fEditView = view;
+	if (view == nullptr)
+		return;
+
+	const BRect bounds = view->Bounds();
+	fRangeWidth = static_cast<int32>(std::lround(bounds.Width() + 2 * kMargin));
+	fRangeHeight = static_cast<int32>(std::lround(bounds.Height() + 2 * kMargin));
+	SetRange(this, fRangeWidth, fRangeHeight);
+
+	ColorfulAddChild(fContainer, view);
+	fContainer->Invalidate();
+	SetSelectedView(view);
+
+	fScrollOrigin = view->Frame().LeftTop() - BPoint(kMargin, kMargin);
+	fContainer->ScrollTo(fScrollOrigin);
+}
+
+
+BView*
+WorkView::EditView() const
+{
+	return fEditView;
+}
+
+
+BPoint
+WorkView::ScrollOrigin() const
+{
+	return fScrollOrigin;
+}
+
+
+void
+WorkView::SetSelectedView(BView* view)
+{
+	if (view == SelectedView())
+		return;
+
+	Window()->BeginViewTransaction();
+	fHiliteView->InvalidateSelection();
+	fSelectedView.Set(view);
+	PostHiliteRedraw();
+	BMessage changed(kSelectionChanged);
+	changed.AddPointer(kSelectedViewField, view);
+	_NotifyEditor(&changed);
+	Window()->EndViewTransaction();
+	Window()->Flush();
+}
+
+
+BView*
+WorkView::SelectedView() const
+{
+	return fSelectedView.View();
+}
+
+
+WorkBackgroundView*
+WorkView::Container() const
+{
+	return fContainer;
+}
+
+
+void
+WorkView::PostHiliteRedraw()
+{
+	Window()->PostMessage(kDrawHilite, fHiliteView);
+}
+
+
+void
+WorkView::HandleFilteredMouse(BMessage* message, BView* view, int32 modifiers)
+{
+	BPoint where;
+	if (message->FindPoint("where", &where) != B_OK)
+		return;
+
+	MakeFocus(true);
+	if (view != SelectedView()) {
+		SetSelectedView(view);
+		return;
+	}
+
+	const BRect bounds = view->Bounds();
+	if (!FrameControled(view)
+		&& (bounds.right - where.x) + (bounds.bottom - where.y) < kResizeZone) {
+		_BeginResize(where);
+		return;
+	}
+	beep();
+}
+
+
+// The root and views whose parents place them stay where they are.
+bool
+WorkView::_MayMove(const BView* view) const
+{
+	return view != fEditView && !FrameControled(view);
+}
+
+
+void
+WorkView::_BeginResize(BPoint where)
+{
+	SetEventMask(kResizeEventMask, 0);
+	fResizing = true;
+	fLastResizePoint = where;
+}
+
+
+void
+WorkView::_DeleteSelection()
+{
+	BView* view = SelectedView();
+	if (!_MayMove(view)) {
+		beep();
+		return;
+	}
+
+	BView* parent = view->Parent();
+	SetSelectedView(parent);
+	parent->RemoveChild(view);
+	delete view;
+}
+
+
+void
+WorkView::_HandleKey(char key)
+{
+	switch (key) {
+		case B_BACKSPACE:
+		case B_DELETE:
+			_DeleteSelection();
+			break;
+		case B_LEFT_ARROW:
+			_MoveSelection(-1, 0);
+			break;
+		case B_RIGHT_ARROW:
+			_MoveSelection(1, 0);
+			break;
+		case B_UP_ARROW:
+			_MoveSelection(0, -1);
+			break;
+		case B_DOWN_ARROW:
+			_MoveSelection(0, 1);
+			break;
+	}
+}
+
+
+void
+WorkView::_MoveSelection(float x, float y)
+{
+	BView* view = SelectedView();
+	if (!_MayMove(view)) {
+		beep();
+		return;
+	}
+
+	view->MoveBy(x, y);
+	BMessage moved(kSelectionMoved);
+	_NotifyEditor(&moved);
+}
+
+
+void
+WorkView::_NotifyEditor(BMessage* message)
+{
+	Window()->PostMessage(message, fEditor);
+}

@@ -1,0 +1,63 @@
+// WorkView: the design surface, where the edited views are shown, selected, moved and resized.
+#pragma once
+
+#include <ScrollView.h>
+
+#include "archive/ViewWatch.h"
+
+class HiliteView;
+class WorkBackgroundView;
+
+
+// The edited views are ordinary views that know nothing of the editor: a filter on the window takes
+// the mouse from them, so that a click on a button selects the button. One work view a window; the
+// filter finds it by its name, "WorkView". All calls with the window locked.
+class WorkView : public BScrollView {
+public:
+	// The editor is told, by posted messages, of a new selection (kSelectionChanged) and of a move
+	// or resize of the selected view (kSelectionMoved). It is borrowed and outlives this view.
+	WorkView(BRect frame, uint32 resizingMode, BHandler* editor);
+
+	void AttachedToWindow() override;
+	void FrameResized(float width, float height) override;
+	void KeyDown(const char* bytes, int32 numBytes) override;
+	void MouseMoved(BPoint where, uint32 transit, const BMessage* drag) override;
+	void MouseUp(BPoint where) override;
+
+	// Replaces the edited tree, deletes the former one, and selects the new root. Takes ownership;
+	// NULL for no tree.
+	void SetEditView(BView* view);
+	BView* EditView() const;
+	BPoint ScrollOrigin() const;
+
+	// The view must be in the edited tree.
+	void SetSelectedView(BView* view);
+	BView* SelectedView() const; // NULL for none, also when the view is gone
+
+	WorkBackgroundView* Container() const;
+
+	// Has the highlight drawn after the updates that are pending.
+	void PostHiliteRedraw();
+
+	// A press of the primary button on an edited view.
+	void HandleFilteredMouse(BMessage* message, BView* view, int32 modifiers);
+
+private:
+	bool _MayMove(const BView* view) const;
+	void _BeginResize(BPoint where);
+	void _DeleteSelection();
+	void _HandleKey(char key);
+	void _MoveSelection(float x, float y);
+	void _NotifyEditor(BMessage* message);
+
+	BPoint fScrollOrigin; // where SetEditView() last scrolled the container to
+	bool fResizing;
+	BPoint fLastResizePoint; // in the selected view's coordinates
+	int32 fRangeWidth;
+	int32 fRangeHeight;
+	WorkBackgroundView* fContainer; // child of the scroll target
+	BHandler* fEditor; // borrowed
+	BView* fEditView; // child of the container, or NULL
+	HiliteView* fHiliteView; // child of the scroll target
+	ViewWatch fSelectedView;
+};
