@@ -5,6 +5,7 @@
 #include <cstdio>
 #include <vector>
 
+#include <AppDefs.h>
 #include <Bitmap.h>
 #include <Handler.h>
 #include <Invoker.h>
