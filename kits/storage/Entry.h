@@ -1,6 +1,8 @@
 // BEntry and entry_ref: a place in a directory, whether or not something is there.
 #pragma once
 
+#include <memory>
+
 #include <SupportDefs.h>
 
 #include <Statable.h>
@@ -8,6 +10,10 @@
 
 class BDirectory;
 class BPath;
+
+namespace BPrivate {
+class Descriptor;
+}
 
 
 // A directory by its number, and a name in it. A small value that owns its name.
@@ -78,10 +84,12 @@ private:
 
 	virtual status_t set_stat(struct stat& stat, uint32 what);
 	status_t _SetTo(int directoryFd, const char* path, bool traverse);
+	status_t _SetToDirectory(int fd);
 	status_t _Rename(int targetFd, const char* path, bool clobber);
-	void _Clear(status_t status);
+	int _DirectoryFd() const;
 
-	int fDirectoryFd; // our own, -1 when unset
+	// Shared by copies; NULL when unset.
+	std::shared_ptr<BPrivate::Descriptor> fDirectory;
 	char* fName; // owned leaf name; "." for the root directory
 	status_t fStatus;
 };

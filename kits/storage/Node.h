@@ -13,6 +13,10 @@ class BEntry;
 class BString;
 struct entry_ref;
 
+namespace BPrivate {
+class Descriptor;
+}
+
 
 // A node by its number. A small value.
 struct node_ref {
@@ -79,8 +83,11 @@ public:
 	int Dup();
 
 private:
-	friend class BFile;
 	friend class BDirectory;
+	friend class BEntry;
+	friend class BFile;
+	friend class BNodeInfo;
+	friend class BResources;
 	friend class BSymLink;
 
 	struct AttributeNames;
@@ -88,11 +95,12 @@ private:
 	virtual void close_fd();
 	virtual status_t set_stat(struct stat& stat, uint32 what);
 	status_t _SetTo(int directoryFd, const char* path);
-	// Takes the descriptor over.
-	status_t _Adopt(int fd, status_t status);
-	status_t _AdoptDuplicate(int fd, status_t status);
+	// Takes the descriptor over; a negative one means that `error` is why there is none.
+	status_t _Adopt(int fd, status_t error);
+	int _Fd() const;
 
-	int fFd; // -1 when unset
+	// Copies share it, as they share the position. NULL when unset.
+	std::shared_ptr<BPrivate::Descriptor> fDescriptor;
 	status_t fCStatus;
 	std::unique_ptr<AttributeNames> fAttributes; // the iteration; NULL before the first step
 };
