@@ -403,7 +403,10 @@ BDirectory::_Open(int directoryFd, const char* path)
 {
 	if (path == NULL || path[0] == '\0') {
 		Unset();
-		return fCStatus = path == NULL ? B_BAD_VALUE : B_ENTRY_NOT_FOUND;
+		fCStatus = B_ENTRY_NOT_FOUND;
+		if (path == NULL)
+			fCStatus = B_BAD_VALUE;
+		return fCStatus;
 	}
 	// A directory that may be passed but not listed still is one.
 	int fd = OpenAt(directoryFd, path, O_RDONLY | O_DIRECTORY);
@@ -449,5 +452,7 @@ create_directory(const char* path, mode_t mode)
 	struct stat stat;
 	if (::stat(path, &stat) < 0)
 		return LastStatus();
-	return S_ISDIR(stat.st_mode) ? B_OK : B_NOT_A_DIRECTORY;
+	if (!S_ISDIR(stat.st_mode))
+		return B_NOT_A_DIRECTORY;
+	return B_OK;
 }

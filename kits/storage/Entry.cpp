@@ -424,7 +424,10 @@ BEntry::_SetTo(int directoryFd, const char* path, bool traverse)
 {
 	if (path == NULL || path[0] == '\0') {
 		Unset();
-		return fStatus = path == NULL ? B_BAD_VALUE : B_ENTRY_NOT_FOUND;
+		fStatus = B_ENTRY_NOT_FOUND;
+		if (path == NULL)
+			fStatus = B_BAD_VALUE;
+		return fStatus;
 	}
 
 	std::string rest(path);

@@ -40,6 +40,9 @@ public:
 	BFile& operator=(const BFile& file);
 
 private:
+	friend class BDirectory;
+	friend class BResources;
+
 	virtual void close_fd();
 	status_t _Open(int directoryFd, const char* path, uint32 openMode);
 

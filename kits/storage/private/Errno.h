@@ -1,14 +1,16 @@
-// The host's error numbers as the kits' status codes.
+// Why the host's last call failed.
 #pragma once
 
-#include <SupportDefs.h>
+#include <errno.h>
+
+#include "support/private/Errno.h"
 
 namespace BPrivate {
 
-// The status for an errno value; B_OK for 0, B_ERROR for one without a name of its own.
-status_t StatusFromErrno(int error);
-
-// The status for the current errno, which must not be 0.
-status_t LastStatus();
+inline status_t
+LastStatus()
+{
+	return status_from_errno(errno);
+}
 
 } // namespace BPrivate
