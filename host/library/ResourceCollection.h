@@ -9,7 +9,7 @@
 #include "host/library/ResourceHandle.h"
 #include "host/library/ResourceItem.h"
 
-class BHandler;
+class BMessenger;
 
 namespace BResEditor {
 
@@ -68,10 +68,34 @@ public:
 	// one item merged into one. Invalid handle at the end. Read lock; each user from its own thread.
 	BResourceHandle GetNextChange(BResourceAddonBase* user, uint32* _changes) const;
 
+protected:
+	// What a collection that keeps undo steps builds on; all are called in the thread that holds
+	// the write lock. An item is reported with its present state before each change; a new item
+	// after it was made.
+	virtual void StepBegins(const char* operation);
+	virtual void ItemChanges(const BResourceItem* item, uint32 change);
+	virtual void StepEnds();
+
+	// The access behind the locks of BResourceAddonBase.
+	bool LockForReading() const;
+	void UnlockForReading() const;
+	bool LockForWriting(const char* operation);
+	void UnlockForWriting();
+
+	// Puts an item back as it was, under its former handle and at that index; for undo.
+	BResourceItem* RestoreItem(const BResourceItem& state, int32 index);
+	int32 IndexOf(const BResourceHandle& handle) const; // -1 when the item is gone
+
 private:
 	friend class BResourceAddonBase;
 	friend class BResourceItem;
-	friend class ResourceJournal;
+
+	int32 _NextFreeID(type_code type, int32 id) const;
+	void _WillChange(BResourceItem* item, uint32 change);
+	void _Rekey(BResourceItem* item, type_code type, int32 id);
+	void _Register(BResourceAddonBase* user);
+	void _Unregister(BResourceAddonBase* user);
+	void _SetMessenger(BResourceAddonBase* user, const BMessenger& messenger);
 
 	class Private;
 	std::unique_ptr<Private> fPrivate;

@@ -1,6 +1,7 @@
 // BResourceItem: one typed resource of a collection: its type, id, name and bytes.
 #pragma once
 
+#include <memory>
 #include <vector>
 
 #include <BeBuild.h>
@@ -25,6 +26,9 @@ public:
 	const void* Data() const; // NULL when Size() is 0
 	size_t Size() const; // in bytes
 
+	// A copy keeps the state of the moment and shares the bytes; it is for reading only.
+	BResourceItem(const BResourceItem& other);
+
 	// For items got by BResourceCollection::WriteItem(). A type and id that another item has give
 	// B_NAME_IN_USE and change nothing. Data is copied. Setting what is already there is no change.
 	status_t SetType(type_code type);
@@ -36,15 +40,16 @@ private:
 	friend class BResourceCollection;
 
 	BResourceItem(BResourceCollection* collection, const BResourceHandle& handle);
-	BResourceItem(const BResourceItem&) = delete;
 	BResourceItem& operator=(const BResourceItem&) = delete;
+
+	status_t _SetKey(type_code type, int32 id);
 
 	BResourceCollection* fCollection; // borrowed: the collection owns the item
 	BResourceHandle fHandle;
 	type_code fType;
 	int32 fID;
 	BString fName;
-	std::vector<uint8> fData;
+	std::shared_ptr<const std::vector<uint8>> fData; // shared with the undo steps; never NULL
 };
 
 
