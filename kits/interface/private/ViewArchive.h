@@ -41,18 +41,19 @@
 // 3. Never adjust an archived view because it is attached: frame, colours, divider, selection and
 //    marks stay until a user or a setter changes them. is_revived() tells.
 //
-// Objects that are no views (list and menu items, tabs) hold an ArchiveSource of their own, made in
-// their base class's archive constructor, and call Begin() first in its Archive().
+// Objects that are no views (list and menu items, tabs) hold an ArchiveSource of their own, made of
+// the message in their base class's archive constructor, and call begin_archive() first in that
+// class's Archive().
 #pragma once
 
-#include <memory>
 #include <span>
-#include <string_view>
 
 #include <GraphicsDefs.h>
 #include <Message.h>
 #include <Point.h>
 #include <Rect.h>
+
+#include "app/private/ArchiveSource.h"
 
 class BView;
 
@@ -63,29 +64,13 @@ namespace BPrivate {
 _EXPORT bool is_revived(const BView* view);
 
 
-// What an object was read from. Shares the fields of the message, whose look-up marks tell later
-// which fields are known.
-class _EXPORT ArchiveSource {
-public:
-	explicit ArchiveSource(BMessage* archive);
-	~ArchiveSource();
-	ArchiveSource(const ArchiveSource&) = delete;
-	ArchiveSource& operator=(const ArchiveSource&) = delete;
-
-	// Puts the unknown fields into the archive and lets every field that is written afterwards take
-	// its old place. Call it before anything is written.
-	void Begin(BMessage* archive) const;
-	// The message, for a look that leaves no marks.
-	const BMessage& Message() const;
-	bool IsManaged() const;
-
-private:
-	struct Data;
-	std::unique_ptr<Data> fData;
-};
+// Lets every field that is written into the archive from now on take the place that it had in the
+// source, and puts the fields in that no constructor looked up. Call it before anything is written;
+// BView::Archive() does. Nothing happens without a source.
+_EXPORT void begin_archive(const ArchiveSource* source, BMessage* archive);
 
 
-// Writes fields into an archive that Begin() was called for, or into one of a new object.
+// Writes fields into an archive that begin_archive() was called for, or into one of a new object.
 class _EXPORT ArchiveWriter {
 public:
 	explicit ArchiveWriter(BMessage* archive);
@@ -116,8 +101,8 @@ public:
 	// Writes the field as it was read, or leaves it out as it was, if the object has a source and
 	// says that its value is unchanged. Otherwise false: the caller adds the field, or not.
 	bool Keep(const char* name, bool unchanged);
-	// What the object was read from; NULL for a new object. A look leaves no marks.
-	const BMessage* Source() const;
+	// What the object was read from; empty for a new object. A look leaves no marks.
+	const BMessage& Source() const { return fSource; }
 
 	// The first error; nothing is written after it.
 	status_t Status() const { return fStatus; }
@@ -129,7 +114,8 @@ private:
 	void _Note(status_t status);
 
 	BMessage* fArchive; // borrowed
-	const BMessage* fSource; // borrowed from the archive's source
+	BMessage fSource;
+	bool fHasSource;
 	status_t fStatus = B_OK;
 };
 
