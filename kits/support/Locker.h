@@ -25,7 +25,7 @@ public:
 	thread_id LockingThread() const; // -1 when nobody holds it
 	bool IsLocked() const; // by the calling thread
 	int32 CountLocks() const;
-	int32 CountLockRequests() const; // holders and waiters
+	int32 CountLockRequests() const; // holders and waiters, also those that gave up
 	sem_id Sem() const;
 
 private:
