@@ -7,10 +7,7 @@
 
 #include <File.h>
 
-namespace BPrivate {
-class ResourceFile;
-class ResourceTable;
-} // namespace BPrivate
+struct entry_ref;
 
 
 // SetTo() reads the table, not the data: an item's bytes are read when they are first asked for.
@@ -26,8 +23,8 @@ public:
 	virtual ~BResources();
 
 	// Pending changes of the previous file are written first. With `clobber` what the file holds
-	// is given up for an empty set of resources, at once. The caller keeps his BFile; note that a
-	// save replaces the file under its name, so his descriptor still shows the old bytes then.
+	// is given up for an empty set of resources, at once. The caller may close his BFile. While he
+	// keeps it, it shows the new file after a save, at the same position.
 	status_t SetTo(const BFile* file, bool clobber = false);
 	status_t SetTo(const char* path, bool clobber = false);
 	status_t SetTo(const entry_ref* ref, bool clobber = false);
@@ -75,13 +72,14 @@ private:
 	BResources(const BResources&);
 	BResources& operator=(const BResources&);
 
+	struct State;
+
 	status_t _SetTo(bool clobber);
+	status_t _Read(BFile& file);
 	status_t _Save();
 	status_t _CheckChange() const;
+	const void* _Load(void* item);
 
-	BFile fFile; // our own duplicate
-	std::unique_ptr<BPrivate::ResourceFile> fContainer; // NULL without a file
-	std::unique_ptr<BPrivate::ResourceTable> fTable; // never NULL
-	bool fReadOnly;
-	bool fChanged;
+	BFile fFile; // shares its descriptor with the caller's, so that both follow a save
+	std::unique_ptr<State> fState; // never NULL
 };

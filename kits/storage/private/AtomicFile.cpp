@@ -244,8 +244,10 @@ AtomicFile::_CheckTarget()
 	if (fstat(fTarget->Fd(), &target) < 0 || fstat(Fd(), &file) < 0)
 		return LastStatus();
 	status_t status = B_OK;
-	if (!S_ISREG(target.st_mode))
-		status = S_ISDIR(target.st_mode) ? B_IS_A_DIRECTORY : B_BAD_VALUE;
+	if (S_ISDIR(target.st_mode))
+		status = B_IS_A_DIRECTORY;
+	else if (!S_ISREG(target.st_mode))
+		status = B_BAD_VALUE;
 	else if (faccessat(fFolder->Fd(), fName.c_str(), W_OK, AT_EACCESS) < 0)
 		status = LastStatus();
 	else if ((target.st_uid != file.st_uid || target.st_gid != file.st_gid)
@@ -274,6 +276,9 @@ AtomicFile::_CopyMetadata()
 status_t
 AtomicFile::_CopyAttributes()
 {
+	// The folder may have given the new file an access list that the old one does not have.
+	fremovexattr(Fd(), "system.posix_acl_access");
+
 	const std::string path = ProcPathOf(fTarget->Fd());
 	const ssize_t length = listxattr(path.c_str(), NULL, 0);
 	if (length < 0)
