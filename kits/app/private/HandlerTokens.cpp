@@ -29,11 +29,11 @@ TheTokens()
 
 
 int32
-HandlerTokens::Add(BHandler* handler, BLooper* looper)
+HandlerTokens::Add(BHandler* handler, const std::atomic<BLooper*>& looper)
 {
 	Table& table = TheTokens();
 	std::lock_guard lock(table.lock);
-	while (!table.entries.try_emplace(table.nextToken, Entry { handler, looper }).second)
+	while (!table.entries.try_emplace(table.nextToken, Entry { handler, looper.load() }).second)
 		table.nextToken = table.nextToken == INT32_MAX ? 1 : table.nextToken + 1;
 
 	const int32 token = table.nextToken;
@@ -43,12 +43,12 @@ HandlerTokens::Add(BHandler* handler, BLooper* looper)
 
 
 void
-HandlerTokens::SetLooper(int32 token, BLooper* looper)
+HandlerTokens::Update(int32 token, const std::atomic<BLooper*>& looper)
 {
 	Table& table = TheTokens();
 	std::lock_guard lock(table.lock);
 	if (const auto found = table.entries.find(token); found != table.entries.end())
-		found->second.looper = looper;
+		found->second.looper = looper.load();
 }
 
 

@@ -1,6 +1,8 @@
 // HandlerTokens: finds handlers by the numbers that messages name them with.
 #pragma once
 
+#include <atomic>
+
 #include <SupportDefs.h>
 
 class BHandler;
@@ -12,8 +14,9 @@ namespace BPrivate {
 // Any thread. A handler that is found in a looper stays alive as long as that looper is locked.
 class HandlerTokens {
 public:
-	static int32 Add(BHandler* handler, BLooper* looper);
-	static void SetLooper(int32 token, BLooper* looper);
+	static int32 Add(BHandler* handler, const std::atomic<BLooper*>& looper);
+	// Takes over what the handler's link now says.
+	static void Update(int32 token, const std::atomic<BLooper*>& looper);
 	static void Remove(int32 token);
 
 	// The handler of this number if it belongs to the looper, else NULL.

@@ -8,6 +8,8 @@
 #include <AppDefs.h>
 #include <Message.h>
 
+#include "app/private/Delivery.h"
+
 namespace BPrivate {
 namespace {
 
@@ -42,6 +44,12 @@ struct LooperCore::Waiter {
 	bool granted = false;
 	std::condition_variable wake;
 };
+
+
+LooperCore::LooperCore(BLooper* looper, int32 capacity) :
+	fLooper(looper), fCapacity(std::max<int32>(capacity, 1)) {
+	fQueue.fCore = this;
+}
 
 
 LooperCore::~LooperCore()
@@ -195,14 +203,16 @@ LooperCore::Put(std::unique_ptr<BMessage> message, bool ahead)
 
 
 void
-LooperCore::RequestUpdate()
+LooperCore::RequestUpdate(int32 token)
 {
 	std::unique_lock lock(fQueue.fLock);
 	if (fUpdateWaits || fClosed)
 		return;
 
 	fUpdateWaits = true;
-	fQueue.fMessages.push_front(new BMessage(_UPDATE_));
+	auto* message = new BMessage(_UPDATE_);
+	Delivery::Of(*message).target = token;
+	fQueue.fMessages.push_front(message);
 	_Added();
 }
 
@@ -294,6 +304,28 @@ LooperCore::BeginLoop(thread_id thread)
 	fThread = thread;
 	fCounting = true;
 	fWorker.AddWork(int32(fQueue.fMessages.size()));
+	if (thread == ThisThread())
+		sRunsLoop = true;
+}
+
+
+void
+LooperCore::EnterLoop()
+{
+	sRunsLoop = true;
+}
+
+
+void
+LooperCore::EndLoop()
+{
+	std::unique_lock lock(fQueue.fLock);
+	sRunsLoop = false;
+	if (fCounting)
+		fWorker.WorkDone(int32(fQueue.fMessages.size()) + fInWork);
+	fCounting = false;
+	fInWork = 0;
+	fThread = -1;
 }
 
 
@@ -321,6 +353,7 @@ LooperCore::Die()
 
 	std::unique_lock lock(fMutex);
 	fGone = true;
+	fLooper = nullptr;
 	fOwner = -1;
 	fLockCount = 0;
 	for (Waiter* waiter : fWaiters)

@@ -23,7 +23,7 @@ namespace BPrivate {
 // Shared by the looper, the port table and everyone who is just locking or posting. Any thread.
 class LooperCore final : public Port {
 public:
-	explicit LooperCore(int32 capacity) : fCapacity(capacity) { fQueue.fCore = this; }
+	LooperCore(BLooper* looper, int32 capacity);
 	~LooperCore() override;
 
 	// The lock: recursive, granted in the order of the requests. B_BAD_PORT_ID when the looper
@@ -39,7 +39,7 @@ public:
 	status_t Receive(std::unique_ptr<BMessage> message, bigtime_t timeout) override;
 	// Without regard to the capacity; false when the looper is gone.
 	bool Put(std::unique_ptr<BMessage> message, bool ahead);
-	void RequestUpdate();
+	void RequestUpdate(int32 token);
 	bool CancelUpdate();
 	BMessage* TakeMatching(const std::function<bool(const BMessage&)>& wanted);
 	bool WaitForArrival(bigtime_t timeout);
@@ -50,6 +50,9 @@ public:
 	void WorkDone();
 	// From the start of the loop on, waiting messages count as work of the program.
 	void BeginLoop(thread_id thread);
+	// The same thread, before its first message.
+	void EnterLoop();
+	void EndLoop();
 
 	// Nothing arrives and nobody gets the lock any more; the waiting messages are deleted.
 	void Die();
@@ -59,6 +62,7 @@ public:
 	Worker& Activity() { return fWorker; }
 	bool IsLooping() const { return fThread.load() >= 0; }
 	thread_id Thread() const { return fThread.load(); }
+	BLooper* Looper() const { return fLooper.load(); } // NULL when it is gone
 	int32 Capacity() const { return fCapacity; }
 	int32 PortId() const { return fPortId; }
 	void SetPortId(int32 id) { fPortId = id; }
@@ -91,6 +95,7 @@ private:
 	bool fCounting = false;
 	int32 fInWork = 0; // taken by the loop, not done yet
 
+	std::atomic<BLooper*> fLooper;
 	const int32 fCapacity;
 	int32 fPortId = -1;
 	std::atomic<thread_id> fThread { -1 };
