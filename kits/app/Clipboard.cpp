@@ -10,7 +10,9 @@ BClipboard* be_clipboard = nullptr;
 
 
 BClipboard::BClipboard(const char* name, bool transient) :
-	fStore(BPrivate::ClipboardStore::Named(name != nullptr ? name : "system")) {}
+	fStore(BPrivate::ClipboardStore::Named(name != nullptr ? name : "system"))
+{
+}
 
 
 BClipboard::~BClipboard() = default;

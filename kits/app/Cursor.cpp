@@ -50,17 +50,21 @@ BCursor::BCursor(const void* cursorData)
 }
 
 
-BCursor::BCursor(const BCursor& other)
+BCursor::BCursor(const BCursor& other) : BArchivable()
 {
 	*this = other;
 }
 
 
-BCursor::BCursor(BCursorID id) : fID(id) {}
+BCursor::BCursor(BCursorID id) : fID(id)
+{
+}
 
 
 // Cursors have no archived form; the instance is the default one.
-BCursor::BCursor(BMessage* data) : fID(B_CURSOR_ID_SYSTEM_DEFAULT), fStatus(B_BAD_VALUE) {}
+BCursor::BCursor(BMessage* data) : fID(B_CURSOR_ID_SYSTEM_DEFAULT), fStatus(B_BAD_VALUE)
+{
+}
 
 
 BCursor::~BCursor() = default;

@@ -103,8 +103,8 @@ BHandler::MessageReceived(BMessage* message)
 		return;
 	}
 
-	const bool expectsAnswer
-		= message->WasDropped() || message->HasSpecifiers() || message->IsSourceWaiting();
+	const bool expectsAnswer =
+		message->WasDropped() || message->HasSpecifiers() || message->IsSourceWaiting();
 	if (!expectsAnswer || message->what == B_MESSAGE_NOT_UNDERSTOOD)
 		return;
 

@@ -7,11 +7,15 @@
 BInvoker::BInvoker() = default;
 
 
-BInvoker::BInvoker(BMessage* message, BMessenger target) : fMessage(message), fTarget(target) {}
+BInvoker::BInvoker(BMessage* message, BMessenger target) : fMessage(message), fTarget(target)
+{
+}
 
 
 BInvoker::BInvoker(BMessage* message, const BHandler* handler, const BLooper* looper) :
-	fMessage(message), fTarget(handler, looper) {}
+	fMessage(message), fTarget(handler, looper)
+{
+}
 
 
 BInvoker::~BInvoker()
@@ -137,7 +141,7 @@ BInvoker::InvokeKind(bool* _notify)
 {
 	if (_notify != nullptr)
 		*_notify = fNotifyKind != 0;
-	return fNotifyKind != 0 ? fNotifyKind : B_CONTROL_INVOKED;
+	return fNotifyKind != 0 ? fNotifyKind : uint32(B_CONTROL_INVOKED);
 }
 
 

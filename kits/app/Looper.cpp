@@ -63,7 +63,7 @@ BLooper::_Init(int32 priority, int32 portCapacity)
 	fPriority = priority;
 	fHandlers = std::make_unique<HandlerTable>();
 	fCore = std::make_shared<LooperCore>(this, portCapacity);
-	fCore->SetPortId(BPrivate::PortTable::Add(fCore));
+	fCore->SetAddress(BPrivate::PortTable::Add(fCore), HandlerPrivate(this).Token());
 	fCore->Lock(B_INFINITE_TIMEOUT);
 	LooperTable::Add(this, fCore);
 	AddHandler(this);
@@ -123,7 +123,7 @@ BLooper::Archive(BMessage* data, bool deep) const
 status_t
 BLooper::PostMessage(uint32 command)
 {
-	return _Post(BMessage(command), HandlerPrivate(this).Token(), nullptr);
+	return _Post(BMessage(command), fCore->OwnToken(), nullptr);
 }
 
 
@@ -132,7 +132,7 @@ BLooper::PostMessage(BMessage* message)
 {
 	if (message == nullptr)
 		return B_BAD_VALUE;
-	return _Post(*message, HandlerPrivate(this).Token(), nullptr);
+	return _Post(*message, fCore->OwnToken(), nullptr);
 }
 
 
@@ -301,7 +301,7 @@ BLooper::HandlerAt(int32 index) const
 		return nullptr;
 	_CompactHandlers();
 	return index >= 0 && size_t(index) < fHandlers->slots.size() ? fHandlers->slots[index]
-																  : nullptr;
+																 : nullptr;
 }
 
 
@@ -344,8 +344,8 @@ BLooper::Run()
 	if (!_CheckLocked("Run"))
 		return B_ERROR;
 
-	const thread_id thread
-		= spawn_thread(&_ThreadEntry, Name() != nullptr ? Name() : "looper", fPriority, this);
+	const thread_id thread =
+		spawn_thread(&_ThreadEntry, Name() != nullptr ? Name() : "looper", fPriority, this);
 	if (thread < B_OK)
 		return thread;
 
@@ -555,7 +555,7 @@ BLooper::Quit()
 		const std::shared_ptr<LooperCore> core = fCore;
 		const bool ownThread = !fInCallersThread;
 		auto message = std::make_unique<BMessage>(_QUIT_);
-		Delivery::Of(*message).target = HandlerPrivate(this).Token();
+		Delivery::Of(*message).target = fCore->OwnToken();
 		core->Put(std::move(message), false);
 		core->UnlockAll();
 		core->WaitUntilDead();

@@ -84,6 +84,7 @@ public:
 
 private:
 	friend class BApplication;
+	friend class BHandler;
 	friend class BWindow;
 	friend class BPrivate::LooperPrivate;
 

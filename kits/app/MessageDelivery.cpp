@@ -23,8 +23,7 @@ constexpr const char* kPrevious = "_previous_";
 // Where a synchronous sender waits for its answer: the first one counts.
 class ReplyPort final : public Port {
 public:
-	status_t
-	Receive(std::unique_ptr<BMessage> message, bigtime_t) override
+	status_t Receive(std::unique_ptr<BMessage> message, bigtime_t) override
 	{
 		std::lock_guard lock(fLock);
 		if (!fReply)
@@ -33,8 +32,7 @@ public:
 		return B_OK;
 	}
 
-	std::unique_ptr<BMessage>
-	Wait(bigtime_t timeout)
+	std::unique_ptr<BMessage> Wait(bigtime_t timeout)
 	{
 		std::unique_lock lock(fLock);
 		const auto arrived = [&] { return fReply != nullptr; };
@@ -112,8 +110,8 @@ deliver_and_wait(const BMessenger& target, const BMessage& message, bool isReply
 	if (reply == nullptr)
 		return B_BAD_VALUE;
 
-	const auto looper = std::dynamic_pointer_cast<LooperCore>(
-		PortTable::Find(MessengerPrivate::Port(target)));
+	const auto looper =
+		std::dynamic_pointer_cast<LooperCore>(PortTable::Find(MessengerPrivate::Port(target)));
 	if (looper && looper->Thread() == find_thread(NULL))
 		return B_MESSAGE_TO_SELF;
 

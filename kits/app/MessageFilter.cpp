@@ -4,27 +4,35 @@
 
 
 BMessageFilter::BMessageFilter(uint32 command, filter_hook hook) :
-	BMessageFilter(B_ANY_DELIVERY, B_ANY_SOURCE, command, hook) {}
+	BMessageFilter(B_ANY_DELIVERY, B_ANY_SOURCE, command, hook)
+{
+}
 
 
-BMessageFilter::BMessageFilter(
-	message_delivery delivery, message_source source, filter_hook hook) :
-	fFiltersAny(true),
-	fWhat(0), fDelivery(delivery), fSource(source), fHook(hook) {}
+BMessageFilter::BMessageFilter(message_delivery delivery, message_source source, filter_hook hook) :
+	fFiltersAny(true), fWhat(0), fDelivery(delivery), fSource(source), fHook(hook)
+{
+}
 
 
 BMessageFilter::BMessageFilter(
 	message_delivery delivery, message_source source, uint32 command, filter_hook hook) :
 	fFiltersAny(false),
-	fWhat(command), fDelivery(delivery), fSource(source), fHook(hook) {}
+	fWhat(command), fDelivery(delivery), fSource(source), fHook(hook)
+{
+}
 
 
 BMessageFilter::BMessageFilter(const BMessageFilter& other) :
 	fFiltersAny(other.fFiltersAny), fWhat(other.fWhat), fDelivery(other.fDelivery),
-	fSource(other.fSource), fHook(other.fHook) {}
+	fSource(other.fSource), fHook(other.fHook)
+{
+}
 
 
-BMessageFilter::BMessageFilter(const BMessageFilter* other) : BMessageFilter(*other) {}
+BMessageFilter::BMessageFilter(const BMessageFilter* other) : BMessageFilter(*other)
+{
+}
 
 
 BMessageFilter::~BMessageFilter() = default;

@@ -11,12 +11,16 @@ using BPrivate::Timer;
 
 BMessageRunner::BMessageRunner(
 	BMessenger target, const BMessage* message, bigtime_t interval, int32 count) :
-	BMessageRunner(target, message, interval, count, BPrivate::reply_address(nullptr)) {}
+	BMessageRunner(target, message, interval, count, BPrivate::reply_address(nullptr))
+{
+}
 
 
 BMessageRunner::BMessageRunner(BMessenger target, const BMessage* message, bigtime_t interval,
 	int32 count, BMessenger replyTo) :
-	fToken(Timer::Get().Add(target, message, interval, count, replyTo)) {}
+	fToken(Timer::Get().Add(target, message, interval, count, replyTo))
+{
+}
 
 
 BMessageRunner::~BMessageRunner()
@@ -63,8 +67,8 @@ BMessageRunner::StartSending(
 
 
 status_t
-BMessageRunner::StartSending(BMessenger target, const BMessage* message, bigtime_t interval,
-	int32 count, BMessenger replyTo)
+BMessageRunner::StartSending(
+	BMessenger target, const BMessage* message, bigtime_t interval, int32 count, BMessenger replyTo)
 {
 	const int32 token = Timer::Get().Add(target, message, interval, count, replyTo);
 	return token < 0 ? token : B_OK;

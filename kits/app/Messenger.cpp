@@ -123,13 +123,12 @@ BMessenger::SendMessage(uint32 command, BMessage* reply) const
 
 
 status_t
-BMessenger::SendMessage(BMessage* message, BMessage* reply, bigtime_t deliveryTimeout,
-	bigtime_t replyTimeout) const
+BMessenger::SendMessage(
+	BMessage* message, BMessage* reply, bigtime_t deliveryTimeout, bigtime_t replyTimeout) const
 {
 	if (message == nullptr)
 		return B_BAD_VALUE;
-	return BPrivate::deliver_and_wait(
-		*this, *message, false, reply, deliveryTimeout, replyTimeout);
+	return BPrivate::deliver_and_wait(*this, *message, false, reply, deliveryTimeout, replyTimeout);
 }
 
 

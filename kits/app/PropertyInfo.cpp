@@ -28,7 +28,9 @@ Contains(const uint32 (&list)[10], uint32 wanted)
 
 
 BPropertyInfo::BPropertyInfo(property_info* properties, value_info* values, bool freeOnDelete) :
-	fProperties(properties), fValues(values), fFreeOnDelete(freeOnDelete) {}
+	fProperties(properties), fValues(values), fFreeOnDelete(freeOnDelete)
+{
+}
 
 
 BPropertyInfo::~BPropertyInfo()
@@ -49,8 +51,8 @@ BPropertyInfo::FindMatch(BMessage* message, int32 index, BMessage* specifier, in
 	for (int32 i = 0; i < CountProperties(); i++) {
 		const property_info& entry = fProperties[i];
 		// A command is for the object that the last specifier names.
-		const bool commandFits
-			= index != 0 || message == nullptr || Contains(entry.commands, message->what);
+		const bool commandFits =
+			index != 0 || message == nullptr || Contains(entry.commands, message->what);
 		if (strcmp(entry.name, property) == 0 && commandFits
 			&& Contains(entry.specifiers, uint32(form))) {
 			if (data != nullptr)

@@ -33,21 +33,25 @@ WaitFor(Condition& condition, Lock& lock, bigtime_t timeout, Predicate done)
 		condition.wait(lock, done);
 		return true;
 	}
-	return condition.wait_for(lock, std::chrono::microseconds(std::max<bigtime_t>(timeout, 0)), done);
+	return condition.wait_for(
+		lock, std::chrono::microseconds(std::max<bigtime_t>(timeout, 0)), done);
 }
 
 } // namespace
 
 
 struct LooperCore::Waiter {
-	thread_id thread;
+	explicit Waiter(thread_id who) : thread(who) {}
+
+	const thread_id thread;
 	bool granted = false;
 	std::condition_variable wake;
 };
 
 
 LooperCore::LooperCore(BLooper* looper, int32 capacity) :
-	fLooper(looper), fCapacity(std::max<int32>(capacity, 1)) {
+	fLooper(looper), fCapacity(std::max<int32>(capacity, 1))
+{
 	fQueue.fCore = this;
 }
 
@@ -55,6 +59,14 @@ LooperCore::LooperCore(BLooper* looper, int32 capacity) :
 LooperCore::~LooperCore()
 {
 	fQueue.fCore = nullptr;
+}
+
+
+void
+LooperCore::SetAddress(int32 portId, int32 ownToken)
+{
+	fPortId = portId;
+	fOwnToken = ownToken;
 }
 
 
@@ -79,7 +91,7 @@ LooperCore::Lock(bigtime_t timeout)
 		return B_OK;
 	}
 
-	Waiter waiter { self };
+	Waiter waiter(self);
 	const auto place = fWaiters.insert(fWaiters.end(), &waiter);
 	WaitFor(waiter.wake, lock, timeout, [&] { return waiter.granted || fGone; });
 	if (waiter.granted)
@@ -203,7 +215,7 @@ LooperCore::Put(std::unique_ptr<BMessage> message, bool ahead)
 
 
 void
-LooperCore::RequestUpdate(int32 token)
+LooperCore::RequestUpdate()
 {
 	std::unique_lock lock(fQueue.fLock);
 	if (fUpdateWaits || fClosed)
@@ -211,7 +223,7 @@ LooperCore::RequestUpdate(int32 token)
 
 	fUpdateWaits = true;
 	auto* message = new BMessage(_UPDATE_);
-	Delivery::Of(*message).target = token;
+	Delivery::Of(*message).target = fOwnToken;
 	fQueue.fMessages.push_front(message);
 	_Added();
 }
@@ -490,7 +502,36 @@ LooperTable::WindowAt(int32 index)
 {
 	Table& table = TheLoopers();
 	std::lock_guard lock(table.lock);
-	return index >= 0 && index < int32(table.windows.size()) ? table.windows[index].window : nullptr;
+	return index >= 0 && index < int32(table.windows.size()) ? table.windows[index].window
+															 : nullptr;
+}
+
+
+std::shared_ptr<LooperCore>
+LooperTable::NextWindow(const std::vector<std::shared_ptr<LooperCore>>& known)
+{
+	Table& table = TheLoopers();
+	std::lock_guard lock(table.lock);
+	for (const WindowEntry& entry : table.windows) {
+		const std::shared_ptr<LooperCore>& core = table.cores[entry.looper];
+		if (std::find(known.begin(), known.end(), core) == known.end())
+			return core;
+	}
+	return nullptr;
+}
+
+
+std::vector<BLooper*>
+LooperTable::AllWindows()
+{
+	Table& table = TheLoopers();
+	std::lock_guard lock(table.lock);
+	std::vector<BLooper*> windows;
+	for (BLooper* looper : table.loopers) {
+		if (table.cores[looper]->IsWindow())
+			windows.push_back(looper);
+	}
+	return windows;
 }
 
 

@@ -7,6 +7,7 @@
 #include <list>
 #include <memory>
 #include <mutex>
+#include <vector>
 
 #include <MessageQueue.h>
 #include <OS.h>
@@ -39,7 +40,7 @@ public:
 	status_t Receive(std::unique_ptr<BMessage> message, bigtime_t timeout) override;
 	// Without regard to the capacity; false when the looper is gone.
 	bool Put(std::unique_ptr<BMessage> message, bool ahead);
-	void RequestUpdate(int32 token);
+	void RequestUpdate();
 	bool CancelUpdate();
 	BMessage* TakeMatching(const std::function<bool(const BMessage&)>& wanted);
 	bool WaitForArrival(bigtime_t timeout);
@@ -65,7 +66,10 @@ public:
 	BLooper* Looper() const { return fLooper.load(); } // NULL when it is gone
 	int32 Capacity() const { return fCapacity; }
 	int32 PortId() const { return fPortId; }
-	void SetPortId(int32 id) { fPortId = id; }
+	int32 OwnToken() const { return fOwnToken; }
+	void SetAddress(int32 portId, int32 ownToken);
+	void MarkAsWindow() { fIsWindow = true; }
+	bool IsWindow() const { return fIsWindow; }
 
 private:
 	friend class ::BMessageQueue;
@@ -98,6 +102,8 @@ private:
 	std::atomic<BLooper*> fLooper;
 	const int32 fCapacity;
 	int32 fPortId = -1;
+	int32 fOwnToken = -1;
+	std::atomic<bool> fIsWindow { false };
 	std::atomic<thread_id> fThread { -1 };
 	Worker fWorker;
 };
@@ -118,6 +124,11 @@ public:
 	static void AddWindow(BLooper* looper, BWindow* window);
 	static int32 CountWindows();
 	static BWindow* WindowAt(int32 index);
+	// The first window that is not among those; NULL when there is none.
+	static std::shared_ptr<LooperCore> NextWindow(
+		const std::vector<std::shared_ptr<LooperCore>>& known);
+	// Those that were never shown, too.
+	static std::vector<BLooper*> AllWindows();
 };
 
 

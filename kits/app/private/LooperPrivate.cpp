@@ -3,7 +3,6 @@
 #include <Message.h>
 
 #include "app/private/Delivery.h"
-#include "app/private/HandlerPrivate.h"
 #include "app/private/LooperCore.h"
 
 namespace BPrivate {
@@ -31,7 +30,7 @@ LooperPrivate::Activity()
 void
 LooperPrivate::PostSystem(BMessage* message, bool toPreferred)
 {
-	const int32 token = toPreferred ? kPreferredToken : HandlerPrivate(fLooper).Token();
+	const int32 token = toPreferred ? kPreferredToken : fLooper->fCore->OwnToken();
 	fLooper->fCore->Put(Addressed(message, token), false);
 }
 
@@ -39,14 +38,14 @@ LooperPrivate::PostSystem(BMessage* message, bool toPreferred)
 void
 LooperPrivate::PostAhead(BMessage* message)
 {
-	fLooper->fCore->Put(Addressed(message, HandlerPrivate(fLooper).Token()), true);
+	fLooper->fCore->Put(Addressed(message, fLooper->fCore->OwnToken()), true);
 }
 
 
 void
 LooperPrivate::RequestUpdate()
 {
-	fLooper->fCore->RequestUpdate(HandlerPrivate(fLooper).Token());
+	fLooper->fCore->RequestUpdate();
 }
 
 
@@ -86,6 +85,13 @@ LooperPrivate::IsTerminating() const
 
 
 void
+LooperPrivate::MarkAsWindow()
+{
+	fLooper->fCore->MarkAsWindow();
+}
+
+
+void
 LooperPrivate::RegisterWindow(BWindow* window)
 {
 	LooperTable::AddWindow(fLooper, window);
@@ -110,6 +116,14 @@ bool
 LooperPrivate::IsAlive(const BLooper* looper)
 {
 	return LooperTable::Find(looper) != nullptr;
+}
+
+
+bool
+LooperPrivate::IsRunning(const BLooper* looper)
+{
+	const std::shared_ptr<LooperCore> core = LooperTable::Find(looper);
+	return core && core->IsLooping();
 }
 
 

@@ -47,6 +47,8 @@ public:
 	bool IsRunning() const;
 	bool IsTerminating() const;
 
+	// Told by the window's constructor: the application ends it, if nobody else does.
+	void MarkAsWindow();
 	// Makes it a window of the application, in the order of these calls, until it is deleted.
 	void RegisterWindow(BWindow* window);
 
@@ -55,6 +57,7 @@ public:
 	static int32 CountLoopers();
 	static BLooper* LooperAt(int32 index);
 	static bool IsAlive(const BLooper* looper);
+	static bool IsRunning(const BLooper* looper); // false when it is gone
 
 private:
 	BLooper* fLooper; // borrowed

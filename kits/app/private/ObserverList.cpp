@@ -54,8 +54,8 @@ ObserverList::Send(uint32 what, BMessage* notice)
 	for (const Observer& observer : fObservers) {
 		if (observer.what != what && observer.what != B_OBSERVER_OBSERVE_ALL)
 			continue;
-		const BMessenger target
-			= observer.handler != nullptr ? BMessenger(observer.handler) : observer.messenger;
+		const BMessenger target =
+			observer.handler != nullptr ? BMessenger(observer.handler) : observer.messenger;
 		if (std::find(told.begin(), told.end(), target) != told.end())
 			continue;
 		told.push_back(target);

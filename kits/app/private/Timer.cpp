@@ -40,8 +40,8 @@ Timer::Add(const BMessenger& target, const BMessage* message, bigtime_t interval
 	interval = std::max(interval, kShortest);
 	const int32 id = fNextId++;
 	const bigtime_t due = system_time() + interval;
-	fEntries.emplace(id,
-		Entry { target, replyTo, std::make_unique<BMessage>(*message), interval, count, due });
+	fEntries.emplace(
+		id, Entry { target, replyTo, std::make_unique<BMessage>(*message), interval, count, due });
 	fSchedule.emplace(due, id);
 	fChanged.notify_one();
 	return id;
