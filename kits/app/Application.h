@@ -6,14 +6,9 @@
 #include <Point.h>
 
 class BCursor;
-class BMessageRunner;
 class BResources;
 class BWindow;
 struct app_info;
-
-namespace BPrivate {
-class ApplicationLink;
-}
 
 
 // One per program, made before any window, font or bitmap, in the thread that will call Run().
@@ -71,16 +66,13 @@ public:
 
 private:
 	void _Init(const char* signature, status_t* _error);
-	void _PostArguments();
-	void _HandleArguments(BMessage* message);
-	bool _AskWindows();
-	void _EndWindows();
+	void _HandleArguments();
+	bool _QuitAllWindows();
 
 	char* fSignature = nullptr;
 	status_t fInitError = B_OK;
-	std::unique_ptr<BPrivate::ApplicationLink> fLink;
-	std::unique_ptr<BMessageRunner> fPulseRunner;
-	bool fCursorHidden = false;
+	bigtime_t fPulseRate = 0;
+	class BMessageRunner* fPulseRunner = nullptr;
 	bool fRunCalled = false;
 	bool fReadyToRunCalled = false;
 };

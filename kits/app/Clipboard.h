@@ -1,7 +1,6 @@
 // BClipboard: the place where cut and copied data wait to be pasted.
 #pragma once
 
-#include <AppDefs.h>
 #include <Messenger.h>
 
 class BMessage;
@@ -46,6 +45,7 @@ public:
 
 private:
 	BPrivate::ClipboardStore* fStore; // shared by the clipboards of one name
+	char* fName;
 };
 
 extern _EXPORT BClipboard* be_clipboard;

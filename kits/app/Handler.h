@@ -74,13 +74,8 @@ public:
 private:
 	friend class BPrivate::HandlerPrivate;
 
-	friend class BLooper;
-
-	bool _CheckLooperLocked(const char* function) const;
-	status_t _AskToWatch(const BMessenger& observed, uint32 request, uint32 what);
-	bool _HandleRequest(BMessage* message);
-	bool _HandleWatchRequest(const BMessage& message);
-	status_t _ReplyToScript(BMessage* message);
+	void _CheckLooperLocked(const char* function) const;
+	status_t _Watch(BMessage* request, const BMessenger& observed);
 
 	char* fName = nullptr;
 	std::atomic<BLooper*> fLooper { nullptr };

@@ -1,7 +1,6 @@
 // BInvoker: a message and the place to send it to.
 #pragma once
 
-#include <AppDefs.h>
 #include <Messenger.h>
 
 class BMessage;
@@ -34,15 +33,15 @@ public:
 
 	// Sends a copy of the given message, or of the own one: B_BAD_VALUE when there is none.
 	virtual status_t Invoke(BMessage* message = NULL);
-	// As Invoke(), with InvokeKind() being `kind` meanwhile. A control tells its watchers too.
-	status_t InvokeNotify(BMessage* message, uint32 kind = B_CONTROL_INVOKED);
+	// As Invoke(), with InvokeKind() being `kind` meanwhile, and notices to the target's watchers.
+	status_t InvokeNotify(BMessage* message, uint32 kind = 'CIVK');
 	status_t SetTimeout(bigtime_t timeout);
 	bigtime_t Timeout() const;
 
 protected:
 	// *_notify tells whether Invoke() runs inside InvokeNotify().
 	uint32 InvokeKind(bool* _notify = NULL);
-	void BeginInvokeNotify(uint32 kind = B_CONTROL_INVOKED);
+	void BeginInvokeNotify(uint32 kind = 'CIVK');
 	void EndInvokeNotify();
 
 private:

@@ -84,7 +84,6 @@ public:
 
 private:
 	friend class BApplication;
-	friend class BHandler;
 	friend class BWindow;
 	friend class BPrivate::LooperPrivate;
 
@@ -95,23 +94,20 @@ private:
 	// nested. Needs the lock.
 	void _Deliver(BMessage* message, BHandler* target);
 
-	void _Init(int32 priority, int32 portCapacity);
-	bool _CheckLocked(const char* function) const;
+	void _Init(const char* name, int32 priority, int32 portCapacity);
+	void _CheckLocked(const char* function) const;
 	void _RunLoop();
 	static status_t _ThreadEntry(void* looper);
-	void _HandleNext();
+	bool _HandleNext();
 	BHandler* _TargetOf(BMessage* message);
 	BHandler* _ResolveScripting(BMessage* message, BHandler* target);
-	bool _FilterCommon(BMessage* message, BHandler** target);
+	bool _Filter(BMessage* message, BHandler** target);
 	bool _FilterByHandler(BMessage* message, BHandler** target);
-	bool _CheckTarget(const BHandler* target) const;
-	status_t _Post(const BMessage& message, int32 token, BHandler* replyTo);
 	void _HandleQuitRequest(BMessage* message);
 	void _CompactHandlers() const;
 
 	std::shared_ptr<BPrivate::LooperCore> fCore; // shared with those who post
-	struct Dispatch;
-	Dispatch* fDispatch = nullptr; // the innermost one, on the loop's stack
+	BMessage* fCurrentMessage = nullptr;
 	BHandler* fPreferredHandler = nullptr; // borrowed
 	BList* fCommonFilters = nullptr;
 	int32 fPriority = B_NORMAL_PRIORITY;

@@ -51,5 +51,6 @@ private:
 	message_delivery fDelivery;
 	message_source fSource;
 	filter_hook fHook;
+	bool fInstalled = false;
 	const BHandler* fOwner = nullptr; // borrowed: whose list it is in
 };

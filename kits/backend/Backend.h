@@ -97,6 +97,8 @@ public:
 
 	virtual BRect ScreenFrame() const = 0; // logical
 	virtual float Scale() const = 0; // device pixels per logical unit
+	// Whether requests to windows are carried out, and reported, before the call returns.
+	virtual bool IsImmediate() const = 0;
 
 	// The window shows what this image holds, which outlives it.
 	virtual std::unique_ptr<BackendWindow> MakeWindow(
@@ -107,6 +109,8 @@ public:
 	// its place, or is the active one.
 	virtual void Inject(const BackendEvent& event) = 0;
 
+	// Whether the desktop made this window active because of the press that is being reported.
+	virtual bool ActivatedByPress(const BackendWindow* window) const = 0;
 	virtual void SetPointerGrab(BackendWindow* window) = 0; // every press comes in; NULL ends it
 	virtual void SetCursorHidden(bool hidden) = 0;
 	virtual void Beep() = 0;
@@ -114,7 +118,7 @@ public:
 	// The translucent picture under the pointer; NULL ends it. Bits are 32-bit BGRA, device pixels.
 	virtual void SetDragPicture(const ScreenPicture* picture, BPoint offset) = 0;
 	// Hands the drag over to the desktop, until a DragFinished event comes. False if it cannot.
-	virtual bool StartDesktopDrag(const DataOffer& offer, uint32 buttons) = 0;
+	virtual bool StartDesktopDrag(const DataOffer& offer, int32 session, uint32 buttons) = 0;
 
 	virtual void SetClipboard(const DataOffer& offer) = 0;
 	virtual DataOffer Clipboard() = 0; // valid until control returns to the loop

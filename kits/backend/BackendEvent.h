@@ -36,6 +36,7 @@ struct BackendEvent {
 		DragMoved,
 		DragLeft,
 		Dropped, // where, message
+		FolderDropped, // injected only: the desktop's drag ends on the folder that text names
 		DragFinished // flag: a desktop drag ended, accepted or not
 	};
 

@@ -12,6 +12,7 @@ namespace BPrivate {
 // picture: size, depth, hot spot (row, column), 32 bytes of colour, 32 bytes of mask.
 struct CursorShape {
 	static constexpr int32 kFromBits = -1;
+	static constexpr int32 kProgram = -2; // a window's: the one that the program has set
 	static constexpr int32 kArrow = 1;
 	static constexpr int32 kTextBeam = 2;
 	static constexpr int32 kNone = 12;

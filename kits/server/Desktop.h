@@ -21,12 +21,15 @@ struct CursorShape;
 struct ScreenPicture;
 
 
+constexpr uint32 kClipboardChanged = 'CLCH';
+
+
 // What the application hears from its desktop, on the display thread.
 class ApplicationClient {
 public:
 	virtual ~ApplicationClient() = default;
 
-	// B_APP_ACTIVATED, B_REFS_RECEIVED, B_QUIT_REQUESTED, B_CLIPBOARD_CHANGED. Takes ownership; may
+	// B_APP_ACTIVATED, B_REFS_RECEIVED, B_QUIT_REQUESTED, kClipboardChanged. Takes ownership; may
 	// take the lock of a message queue, never that of a looper.
 	virtual void PostToApplication(BMessage* message) = 0;
 };
@@ -88,12 +91,13 @@ public:
 	uint32 ClipboardSerial() const;
 
 	// For tests and play scripts.
-	void Inject(const BackendEvent& event); // at the backend's own entry
+	// At the backend's own entry. The id is of the window that the event names, 0 for none.
+	void Inject(const BackendEvent& event, uint32 window = 0);
 	ScreenPicture Picture(BRect screen);
 	status_t SavePicture(const char* path, BRect screen); // PNG
 	void OpenFile(const char* path); // what the desktop does when a file is opened
-	void SetInspector(Inspector* inspector); // borrowed; NULL before it goes
-	Inspector* GetInspector() const;
+	// Borrowed; NULL before it goes, which waits until nobody is using it.
+	void SetInspector(Inspector* inspector);
 	std::string BackendName() const;
 
 	DesktopThread& Thread() { return *fThread; }

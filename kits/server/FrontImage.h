@@ -19,8 +19,7 @@ public:
 	~FrontImage();
 
 	// Takes the size of `back` if it has changed, else only the damaged part; logical coordinates.
-	// Returns whether nothing was pending before, that is, whether a flush must be asked for.
-	bool CopyFrom(const Surface& back, const BRegion& damage);
+	void CopyFrom(const Surface& back, const BRegion& damage);
 
 	// What was copied since the last call, in device pixels.
 	BRegion TakePending();
@@ -37,6 +36,8 @@ public:
 	};
 
 private:
+	void _Copy(const Surface& back, const BRegion& damage);
+
 	std::mutex fLock;
 	std::unique_ptr<Surface> fSurface;
 	BRegion fPending; // device pixels

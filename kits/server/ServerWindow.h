@@ -14,7 +14,10 @@ class Surface;
 class WindowRecord;
 struct CursorShape;
 
-// Menus, drawn above everything. Never active, and no first click, modality or capture applies.
+// Menus, drawn above everything. Never active; no first click, modality or capture applies to them.
+// While one is shown that wants all pointer events, presses outside menus reach only such windows
+// (marked "elsewhere") and are lost for the window under the pointer, and keys go to the menu window
+// that was shown last instead of the active window.
 constexpr uint32 kMenuWindowFeel = 1025;
 
 // A bool in a mouse message: true if the pointer is not over this window, because it is over
@@ -69,6 +72,9 @@ public:
 
 	// While set, every pointer event of the program comes here, see kPointerElsewhere.
 	void SetWantsAllPointerEvents(bool wants);
+	// To be called before a mouse message is dispatched, so that a drag started meanwhile belongs
+	// to the press that is being handled, even if it has long been released.
+	void BeginInput(const BMessage& message);
 	void SetCursor(const CursorShape& shape);
 	void SetTextSpot(BRect screen);
 

@@ -1,6 +1,7 @@
 // Driver: mouse and keys for tests, entered at the headless backend.
 #pragma once
 
+#include <memory>
 #include <string>
 #include <string_view>
 
@@ -12,6 +13,11 @@
 class BView;
 class BWindow;
 
+namespace BPrivate {
+class ScriptedInput;
+struct BackendEvent;
+} // namespace BPrivate
+
 
 // Each call waits until the program is idle, acts, and waits again: what the input has caused is
 // done when it returns. Modifiers are the platform's bits; B_CONTROL_KEY and B_COMMAND_KEY are one
@@ -19,6 +25,9 @@ class BWindow;
 // window locked (a view's place is found under its window's lock).
 class Driver {
 public:
+	Driver();
+	~Driver();
+
 	// Screen coordinates of a point in a view, or of the middle of its visible part.
 	static BPoint PointIn(BView* view, BPoint where);
 	static BPoint MiddleOf(BView* view);
@@ -61,11 +70,9 @@ public:
 
 private:
 	void _Wait() const;
-	void _Pointer(int type, BPoint where, uint32 button, uint32 modifiers);
 	void _Key(bool down, const char* name, uint32 modifiers);
+	void _Window(BWindow* window, BPrivate::BackendEvent event);
 
+	std::unique_ptr<BPrivate::ScriptedInput> fInput;
 	bool fWait = true;
-	BPoint fWhere;
-	uint32 fButtons = 0;
-	bigtime_t fTime = 0; // of the last event entered
 };

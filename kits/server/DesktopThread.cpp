@@ -1,0 +1,517 @@
+#include "server/DesktopThread.h"
+
+#include <algorithm>
+#include <condition_variable>
+#include <cstdlib>
+#include <filesystem>
+
+#include <AppDefs.h>
+
+#include "server/ClipboardBridge.h"
+#include "server/Desktop.h"
+#include "server/input/KeyboardInput.h"
+#include "server/input/PointerInput.h"
+#include "server/input/WindowPolicy.h"
+#include "server/play/PlayRunner.h"
+
+namespace BPrivate {
+
+namespace {
+
+// How long a desktop may take to carry out a request before nobody waits for it any more.
+constexpr bigtime_t kExpectationTimeout = 1000000;
+
+} // namespace
+
+
+class StartSignal {
+public:
+	void Send(status_t status)
+	{
+		std::lock_guard lock(fLock);
+		fStatus = status;
+		fSent = true;
+		fChanged.notify_all();
+	}
+
+	status_t Wait()
+	{
+		std::unique_lock lock(fLock);
+		fChanged.wait(lock, [this] { return fSent; });
+		return fStatus;
+	}
+
+private:
+	std::mutex fLock;
+	std::condition_variable fChanged;
+	status_t fStatus = B_OK;
+	bool fSent = false;
+};
+
+
+DesktopThread::DesktopThread(ApplicationClient* client) :
+	fClient(client), fPointer(std::make_unique<PointerInput>(*this)),
+	fKeyboard(std::make_unique<KeyboardInput>(*this)),
+	fPolicy(std::make_unique<WindowPolicy>(*this)),
+	fClipboard(std::make_unique<ClipboardBridge>(*this))
+{
+}
+
+
+DesktopThread::~DesktopThread()
+{
+	Stop();
+}
+
+
+status_t
+DesktopThread::Start()
+{
+	StartSignal signal;
+	fThread = std::thread([this, &signal] { _Run(signal); });
+	const status_t status = signal.Wait();
+	if (status != B_OK) {
+		fThread.join();
+		return status;
+	}
+
+	const char* script = std::getenv("ARCHWAY_PLAY");
+	if (script != nullptr && script[0] != '\0') {
+		fPlay = std::make_unique<PlayRunner>(*this, script);
+		fPlay->Start();
+	}
+	return B_OK;
+}
+
+
+void
+DesktopThread::Stop()
+{
+	if (fPlay != nullptr) {
+		fPlay->Stop();
+		fPlay.reset();
+	}
+	if (!fThread.joinable())
+		return;
+
+	Post([this] { fBackend->Stop(); });
+	fThread.join();
+}
+
+
+void
+DesktopThread::_Run(StartSignal& signal)
+{
+	fThreadId = std::this_thread::get_id();
+	std::unique_ptr<Backend> backend = make_backend();
+	const status_t status = backend != nullptr ? backend->Open(this) : B_ERROR;
+	if (status == B_OK) {
+		std::lock_guard lock(fPostLock);
+		fBackendName = backend->Name();
+		fBackend = std::move(backend);
+		_ScreenChanged();
+	}
+	signal.Send(status);
+	if (status != B_OK)
+		return;
+
+	fBackend->Run();
+
+	fPointer->Clear();
+	fWindows.clear();
+	for (const std::string& folder : fFolders) {
+		std::error_code ignored;
+		std::filesystem::remove_all(folder, ignored);
+	}
+	std::lock_guard lock(fPostLock);
+	fBackend.reset();
+}
+
+
+// #pragma mark - any thread
+
+
+void
+DesktopThread::Post(std::function<void()> task)
+{
+	std::lock_guard lock(fPostLock);
+	if (fBackend == nullptr)
+		return;
+
+	fActivity.AddWork();
+	fBackend->Post([this, task = std::move(task)] {
+		task();
+		fActivity.WorkDone();
+	});
+}
+
+
+void
+DesktopThread::RunOnDisplay(const std::function<void()>& task)
+{
+	if (IsDisplayThread()) {
+		task();
+		return;
+	}
+
+	// The signal is sent when the task is let go of, run or not: a loop that ends drops its tasks,
+	// and must not leave the caller waiting.
+	struct Ender {
+		StartSignal& signal;
+		~Ender() { signal.Send(B_OK); }
+	};
+	StartSignal signal;
+	auto ender = std::make_shared<Ender>(signal);
+	Post([&task, ender = std::move(ender)] { task(); });
+	signal.Wait();
+}
+
+
+bool
+DesktopThread::IsDisplayThread() const
+{
+	return std::this_thread::get_id() == fThreadId.load();
+}
+
+
+BRect
+DesktopThread::ScreenFrame() const
+{
+	std::lock_guard lock(fLock);
+	return fScreenFrame;
+}
+
+
+void
+DesktopThread::PostToApplication(std::unique_ptr<BMessage> message)
+{
+	if (fClient != nullptr)
+		fClient->PostToApplication(message.release());
+}
+
+
+void
+DesktopThread::SetInspector(Inspector* inspector)
+{
+	std::lock_guard lock(fInspectorLock);
+	fInspector = inspector;
+}
+
+
+bool
+DesktopThread::Inspect(const std::function<void(Inspector&)>& use)
+{
+	std::lock_guard lock(fInspectorLock);
+	if (fInspector == nullptr)
+		return false;
+	use(*fInspector);
+	return true;
+}
+
+
+WindowReference
+DesktopThread::AddWindow(WindowClient* client, const WindowRecord::Properties& properties)
+{
+	auto window = std::make_shared<WindowRecord>(fNextId++, client, properties);
+	Post([this, window] {
+		fWindows.push_back(window);
+		window->native = fBackend->MakeWindow(&window->Front(), window->Traits());
+		window->native->SetCursor(fProgramCursor);
+	});
+	return window;
+}
+
+
+void
+DesktopThread::RemoveWindow(const WindowReference& window)
+{
+	window->Detach();
+	Post([this, window] {
+		Show(window, false);
+		fPointer->WindowGone(window);
+		fPolicy->WindowGone(window);
+		std::erase(fWindows, window);
+		std::erase_if(fExpectations, [this, &window](const Expectation& expectation) {
+			const bool ours = expectation.window == window->Id();
+			if (ours)
+				fActivity.WorkDone();
+			return ours;
+		});
+		UpdateOwners();
+		window->native.reset();
+	});
+}
+
+
+void
+DesktopThread::ReportQuit()
+{
+	if (fPlay != nullptr)
+		fPlay->ProgramEnds();
+}
+
+
+// #pragma mark - windows
+
+
+WindowReference
+DesktopThread::Find(const BackendWindow* native) const
+{
+	if (native == nullptr)
+		return nullptr;
+	for (const WindowReference& window : fWindows) {
+		if (window->native.get() == native)
+			return window;
+	}
+	return nullptr;
+}
+
+
+WindowReference
+DesktopThread::Find(uint32 id) const
+{
+	for (const WindowReference& window : fWindows) {
+		if (window->Id() == id)
+			return window;
+	}
+	return nullptr;
+}
+
+
+WindowReference
+DesktopThread::WindowAt(BPoint screen) const
+{
+	return Find(fBackend->WindowAt(screen));
+}
+
+
+void
+DesktopThread::Show(const WindowReference& window, bool show)
+{
+	if (window->native == nullptr || window->nativeShown == show)
+		return;
+
+	window->nativeShown = show;
+	if (show) {
+		window->shownSerial = fNextSerial++;
+		UpdateOwners();
+		Expect(window, BackendEvent::Type::WindowShown);
+	} else {
+		Settle(window, BackendEvent::Type::WindowShown);
+		Settle(window, BackendEvent::Type::WindowActivated);
+		fPointer->WindowHidden(window);
+	}
+	window->native->SetShown(show);
+	if (!show)
+		fPolicy->WindowHidden(window);
+	fPointer->WindowsRearranged();
+}
+
+
+void
+DesktopThread::ApplyTraits(const WindowReference& window)
+{
+	if (window->native == nullptr)
+		return;
+	window->native->SetTraits(window->Traits());
+	UpdateOwners();
+	fPointer->WindowsRearranged();
+}
+
+
+void
+DesktopThread::Activate(const WindowReference& window)
+{
+	if (window->native == nullptr || !window->nativeShown)
+		return;
+	if (!window->Traits().takesFocus) {
+		window->native->Raise();
+		return;
+	}
+	if (!window->active)
+		Expect(window, BackendEvent::Type::WindowActivated);
+	window->native->Activate();
+	fPointer->WindowsRearranged();
+}
+
+
+void
+DesktopThread::Flush(const WindowReference& window)
+{
+	window->flushPending = false;
+	const BRegion pending = window->Front().TakePending();
+	if (window->native == nullptr || pending.CountRects() == 0)
+		return;
+	window->flushes++;
+	window->native->Flush(pending);
+}
+
+
+// A floating or modal window stays above the window that it belongs to: one of its subset, or the
+// one that was active last before it.
+void
+DesktopThread::UpdateOwners()
+{
+	for (const WindowReference& window : fWindows) {
+		if (window->native != nullptr)
+			window->native->SetOwner(fPolicy->OwnerOf(window));
+	}
+}
+
+
+void
+DesktopThread::SetProgramCursor(const CursorShape& shape)
+{
+	fProgramCursor = shape;
+	for (const WindowReference& window : fWindows) {
+		if (!window->hasCursor)
+			window->native->SetCursor(shape);
+	}
+}
+
+
+void
+DesktopThread::SetWindowCursor(const WindowReference& window, const CursorShape& shape)
+{
+	if (window->native == nullptr || (window->hasCursor && window->cursor == shape))
+		return;
+	window->hasCursor = shape.id != CursorShape::kProgram;
+	window->cursor = shape;
+	window->native->SetCursor(window->hasCursor ? shape : fProgramCursor);
+}
+
+
+// #pragma mark - events
+
+
+void
+DesktopThread::HandleEvent(const BackendEvent& event)
+{
+	using Type = BackendEvent::Type;
+
+	switch (event.type) {
+		case Type::KeyPressed:
+		case Type::KeyReleased:
+		case Type::ModifiersChanged:
+		case Type::TextEntered:
+		case Type::TextComposed:
+			fKeyboard->HandleEvent(event);
+			break;
+
+		case Type::WindowActivated:
+			fPolicy->Activated(Find(event.window));
+			break;
+
+		case Type::WindowChanged:
+			_WindowChanged(event);
+			break;
+
+		case Type::WindowShown:
+			if (WindowReference window = Find(event.window))
+				Settle(window, Type::WindowShown);
+			break;
+
+		case Type::CloseRequested:
+			if (WindowReference window = Find(event.window))
+				window->Deliver(std::make_unique<BMessage>(B_QUIT_REQUESTED));
+			break;
+
+		case Type::Minimized:
+			if (WindowReference window = Find(event.window)) {
+				auto message = std::make_unique<BMessage>(B_MINIMIZE);
+				message->AddInt64("when", system_time());
+				message->AddBool("minimize", event.flag);
+				window->Deliver(std::move(message));
+			}
+			break;
+
+		case Type::ScreenChanged:
+			_ScreenChanged();
+			break;
+
+		case Type::ClipboardChanged:
+			fClipboard->Changed();
+			break;
+
+		default:
+			fPointer->HandleEvent(event);
+			break;
+	}
+}
+
+
+void
+DesktopThread::_WindowChanged(const BackendEvent& event)
+{
+	WindowReference window = Find(event.window);
+	if (window == nullptr || !window->ReportFrame(event.frame))
+		return;
+
+	const BRect before = window->reportedFrame;
+	const BRect now = event.frame;
+	window->reportedFrame = now;
+	if (now.LeftTop() != before.LeftTop()) {
+		auto message = std::make_unique<BMessage>(B_WINDOW_MOVED);
+		message->AddInt64("when", system_time());
+		message->AddPoint("where", now.LeftTop());
+		window->Deliver(std::move(message));
+	}
+	if (now.Width() != before.Width() || now.Height() != before.Height()) {
+		auto message = std::make_unique<BMessage>(B_WINDOW_RESIZED);
+		message->AddInt64("when", system_time());
+		message->AddInt32("width", static_cast<int32>(now.Width()));
+		message->AddInt32("height", static_cast<int32>(now.Height()));
+		window->Deliver(std::move(message));
+	}
+	fPointer->WindowsRearranged();
+}
+
+
+void
+DesktopThread::_ScreenChanged()
+{
+	const BRect frame = fBackend->ScreenFrame();
+	fScale = fBackend->Scale();
+	{
+		std::lock_guard lock(fLock);
+		fScreenFrame = frame;
+	}
+	for (const WindowReference& window : fWindows) {
+		auto message = std::make_unique<BMessage>(B_SCREEN_CHANGED);
+		message->AddInt64("when", system_time());
+		message->AddRect("frame", frame);
+		message->AddInt32("mode", B_RGB32);
+		window->Deliver(std::move(message));
+	}
+}
+
+
+void
+DesktopThread::Expect(const WindowReference& window, BackendEvent::Type event)
+{
+	if (fBackend->IsImmediate())
+		return;
+
+	const int64 serial = fNextSerial++;
+	fActivity.AddWork();
+	fExpectations.push_back({ window->Id(), event, serial });
+	fBackend->PostLater(kExpectationTimeout, [this, serial] {
+		const auto expired = [serial](const Expectation& other) { return other.serial == serial; };
+		if (std::erase_if(fExpectations, expired) > 0)
+			fActivity.WorkDone();
+	});
+}
+
+
+void
+DesktopThread::Settle(const WindowReference& window, BackendEvent::Type event)
+{
+	const size_t settled = std::erase_if(fExpectations, [&](const Expectation& expectation) {
+		return expectation.window == window->Id() && expectation.event == event;
+	});
+	if (settled > 0)
+		fActivity.WorkDone(static_cast<int32>(settled));
+}
+
+
+} // namespace BPrivate

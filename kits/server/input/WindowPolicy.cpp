@@ -1,0 +1,178 @@
+#include "server/input/WindowPolicy.h"
+
+#include <algorithm>
+
+#include <AppDefs.h>
+
+#include "server/DesktopThread.h"
+
+namespace BPrivate {
+
+namespace {
+
+constexpr uint32 kAcceptsFirstClick = 0x10, kAvoidFocus = 0x2000, kAvoidFront = 0x80;
+constexpr uint32 kModalSubsetFeel = 2, kFloatingSubsetFeel = 5;
+
+
+std::unique_ptr<BMessage>
+ActivationMessage(bool active)
+{
+	auto message = std::make_unique<BMessage>(B_WINDOW_ACTIVATED);
+	message->AddInt64("when", system_time());
+	message->AddBool("active", active);
+	return message;
+}
+
+} // namespace
+
+
+WindowPolicy::WindowPolicy(DesktopThread& desktop) : fDesktop(desktop)
+{
+}
+
+
+void
+WindowPolicy::Activated(const WindowReference& window)
+{
+	if (window != nullptr)
+		fDesktop.Settle(window, BackendEvent::Type::WindowActivated);
+	if (window == fActive)
+		return;
+
+	const WindowReference before = fActive;
+	fActive = window;
+	fActiveId = window != nullptr ? window->Id() : 0;
+	if (before != nullptr) {
+		before->active = false;
+		before->Deliver(ActivationMessage(false));
+	}
+	if (window != nullptr) {
+		for (const WindowReference& other : fDesktop.Windows())
+			other->inFront = other == window;
+		window->active = true;
+		window->Deliver(ActivationMessage(true));
+		if (!window->IsModal() && !window->IsFloating())
+			fLastNormal = window;
+	}
+	if ((before == nullptr) != (window == nullptr))
+		fDesktop.PostToApplication(ActivationMessage(window != nullptr));
+
+	const WindowReference blocker = BlockerOf(window);
+	if (blocker != nullptr)
+		fDesktop.Activate(blocker);
+}
+
+
+bool
+WindowPolicy::AcceptsPress(const WindowReference& window)
+{
+	if (window->IsMenu())
+		return true;
+	if (const WindowReference blocker = BlockerOf(window)) {
+		fDesktop.Activate(blocker);
+		return false;
+	}
+	if (window == fActive && !fDesktop.GetBackend().ActivatedByPress(window->native.get()))
+		return true;
+
+	const uint32 flags = window->Flags();
+	const bool takesFirst = (flags & kAcceptsFirstClick) != 0;
+	if ((flags & kAvoidFocus) != 0) {
+		if (!takesFirst && (flags & kAvoidFront) == 0)
+			window->native->Raise();
+		return true;
+	}
+	if (takesFirst)
+		return true;
+	fDesktop.Activate(window);
+	return false;
+}
+
+
+// #pragma mark - modality
+
+
+WindowReference
+WindowPolicy::BlockerOf(const WindowReference& window) const
+{
+	if (window == nullptr || window->IsMenu())
+		return nullptr;
+
+	WindowReference blocker;
+	for (const WindowReference& modal : fDesktop.Windows()) {
+		if (modal == window || !modal->nativeShown || !modal->IsModal()
+			|| !_Concerns(*modal, *window))
+			continue;
+		// Of two modal windows the one that was opened last may be used.
+		if (window->IsModal() && modal->shownSerial < window->shownSerial)
+			continue;
+		if (blocker == nullptr || modal->shownSerial > blocker->shownSerial)
+			blocker = modal;
+	}
+	return blocker;
+}
+
+
+bool
+WindowPolicy::_Concerns(const WindowRecord& modal, const WindowRecord& window) const
+{
+	if (modal.Feel() != kModalSubsetFeel)
+		return true;
+	return std::find(modal.subset.begin(), modal.subset.end(), window.Id()) != modal.subset.end();
+}
+
+
+BackendWindow*
+WindowPolicy::OwnerOf(const WindowReference& window) const
+{
+	if (!window->IsModal() && !window->IsFloating())
+		return nullptr;
+
+	const uint32 feel = window->Feel();
+	if (feel == kModalSubsetFeel || feel == kFloatingSubsetFeel) {
+		for (const uint32 id : window->subset) {
+			const WindowReference main = fDesktop.Find(id);
+			if (main != nullptr && main->nativeShown)
+				return main->native.get();
+		}
+	}
+	if (fLastNormal == nullptr || !fLastNormal->nativeShown || fLastNormal == window)
+		return nullptr;
+	return fLastNormal->native.get();
+}
+
+
+WindowReference
+WindowPolicy::LastMenu() const
+{
+	WindowReference last;
+	for (const WindowReference& window : fDesktop.Windows()) {
+		if (window->IsMenu() && window->nativeShown
+			&& (last == nullptr || window->shownSerial > last->shownSerial))
+			last = window;
+	}
+	return last;
+}
+
+
+void
+WindowPolicy::WindowHidden(const WindowReference& window)
+{
+	window->inFront = false;
+	if (fLastNormal == window) {
+		fLastNormal = nullptr;
+		fDesktop.UpdateOwners();
+	}
+	if (fActive == window)
+		Activated(nullptr);
+}
+
+
+void
+WindowPolicy::WindowGone(const WindowReference& window)
+{
+	WindowHidden(window);
+}
+
+
+} // namespace BPrivate
