@@ -159,11 +159,16 @@ BResources::~BResources()
 status_t
 BResources::SetTo(const BFile* file, bool clobber)
 {
-	// It may be our own.
+	// It may be our own, or see our file: then it follows what is saved now.
 	const BFile given = file != NULL ? *file : BFile();
+	const BFile ours(fFile);
+	const bool follows = fState->changed && given.InitCheck() == B_OK
+		&& given.fDescriptor != ours.fDescriptor && given == ours;
 	Unset();
 	if (file == NULL)
 		return B_OK;
+	if (follows)
+		given.fDescriptor->Replace(ours._Fd());
 	status_t status = given.InitCheck();
 	if (status != B_OK)
 		return status;
@@ -178,10 +183,9 @@ BResources::SetTo(const BFile* file, bool clobber)
 status_t
 BResources::SetTo(const char* path, bool clobber)
 {
-	if (path == NULL) {
-		Unset();
+	Unset(); // before the file is opened, because it may be the one that is saved now
+	if (path == NULL)
 		return B_BAD_VALUE;
-	}
 	BFile file(path, B_READ_WRITE);
 	if (file.InitCheck() != B_OK && file.InitCheck() != B_ENTRY_NOT_FOUND)
 		file.SetTo(path, B_READ_ONLY);
@@ -192,10 +196,9 @@ BResources::SetTo(const char* path, bool clobber)
 status_t
 BResources::SetTo(const entry_ref* ref, bool clobber)
 {
-	if (ref == NULL) {
-		Unset();
+	Unset(); // before the file is opened, because it may be the one that is saved now
+	if (ref == NULL)
 		return B_BAD_VALUE;
-	}
 	BFile file(ref, B_READ_WRITE);
 	if (file.InitCheck() != B_OK && file.InitCheck() != B_ENTRY_NOT_FOUND)
 		file.SetTo(ref, B_READ_ONLY);
