@@ -6,9 +6,14 @@
 #include <Point.h>
 
 class BCursor;
+class BMessageRunner;
 class BResources;
 class BWindow;
 struct app_info;
+
+namespace BPrivate {
+class ApplicationLink;
+}
 
 
 // One per program, made before any window, font or bitmap, in the thread that will call Run().
@@ -66,13 +71,16 @@ public:
 
 private:
 	void _Init(const char* signature, status_t* _error);
-	void _HandleArguments();
-	bool _QuitAllWindows();
+	void _PostArguments();
+	void _HandleArguments(BMessage* message);
+	bool _AskWindows();
+	void _EndWindows();
 
 	char* fSignature = nullptr;
 	status_t fInitError = B_OK;
-	bigtime_t fPulseRate = 0;
-	class BMessageRunner* fPulseRunner = nullptr;
+	std::unique_ptr<BPrivate::ApplicationLink> fLink;
+	std::unique_ptr<BMessageRunner> fPulseRunner;
+	bool fCursorHidden = false;
 	bool fRunCalled = false;
 	bool fReadyToRunCalled = false;
 };

@@ -1,6 +1,7 @@
 // BClipboard: the place where cut and copied data wait to be pasted.
 #pragma once
 
+#include <AppDefs.h>
 #include <Messenger.h>
 
 class BMessage;
@@ -45,7 +46,6 @@ public:
 
 private:
 	BPrivate::ClipboardStore* fStore; // shared by the clipboards of one name
-	char* fName;
 };
 
 extern _EXPORT BClipboard* be_clipboard;

@@ -74,8 +74,13 @@ public:
 private:
 	friend class BPrivate::HandlerPrivate;
 
-	void _CheckLooperLocked(const char* function) const;
-	status_t _Watch(BMessage* request, const BMessenger& observed);
+	friend class BLooper;
+
+	bool _CheckLooperLocked(const char* function) const;
+	status_t _AskToWatch(const BMessenger& observed, uint32 request, uint32 what);
+	bool _HandleRequest(BMessage* message);
+	bool _HandleWatchRequest(const BMessage& message);
+	status_t _ReplyToScript(BMessage* message);
 
 	char* fName = nullptr;
 	std::atomic<BLooper*> fLooper { nullptr };

@@ -1,6 +1,7 @@
 // BInvoker: a message and the place to send it to.
 #pragma once
 
+#include <AppDefs.h>
 #include <Messenger.h>
 
 class BMessage;
@@ -33,15 +34,15 @@ public:
 
 	// Sends a copy of the given message, or of the own one: B_BAD_VALUE when there is none.
 	virtual status_t Invoke(BMessage* message = NULL);
-	// As Invoke(), with InvokeKind() being `kind` meanwhile, and notices to the target's watchers.
-	status_t InvokeNotify(BMessage* message, uint32 kind = 'CIVK');
+	// As Invoke(), with InvokeKind() being `kind` meanwhile. A control tells its watchers too.
+	status_t InvokeNotify(BMessage* message, uint32 kind = B_CONTROL_INVOKED);
 	status_t SetTimeout(bigtime_t timeout);
 	bigtime_t Timeout() const;
 
 protected:
 	// *_notify tells whether Invoke() runs inside InvokeNotify().
 	uint32 InvokeKind(bool* _notify = NULL);
-	void BeginInvokeNotify(uint32 kind = 'CIVK');
+	void BeginInvokeNotify(uint32 kind = B_CONTROL_INVOKED);
 	void EndInvokeNotify();
 
 private:

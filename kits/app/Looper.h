@@ -84,6 +84,7 @@ public:
 
 private:
 	friend class BApplication;
+	friend class BHandler;
 	friend class BWindow;
 	friend class BPrivate::LooperPrivate;
 
@@ -94,20 +95,23 @@ private:
 	// nested. Needs the lock.
 	void _Deliver(BMessage* message, BHandler* target);
 
-	void _Init(const char* name, int32 priority, int32 portCapacity);
-	void _CheckLocked(const char* function) const;
+	void _Init(int32 priority, int32 portCapacity);
+	bool _CheckLocked(const char* function) const;
 	void _RunLoop();
 	static status_t _ThreadEntry(void* looper);
-	bool _HandleNext();
+	void _HandleNext();
 	BHandler* _TargetOf(BMessage* message);
 	BHandler* _ResolveScripting(BMessage* message, BHandler* target);
-	bool _Filter(BMessage* message, BHandler** target);
+	bool _FilterCommon(BMessage* message, BHandler** target);
 	bool _FilterByHandler(BMessage* message, BHandler** target);
+	bool _CheckTarget(const BHandler* target) const;
+	status_t _Post(const BMessage& message, int32 token, BHandler* replyTo);
 	void _HandleQuitRequest(BMessage* message);
 	void _CompactHandlers() const;
 
 	std::shared_ptr<BPrivate::LooperCore> fCore; // shared with those who post
-	BMessage* fCurrentMessage = nullptr;
+	struct Dispatch;
+	Dispatch* fDispatch = nullptr; // the innermost one, on the loop's stack
 	BHandler* fPreferredHandler = nullptr; // borrowed
 	BList* fCommonFilters = nullptr;
 	int32 fPriority = B_NORMAL_PRIORITY;

@@ -51,6 +51,5 @@ private:
 	message_delivery fDelivery;
 	message_source fSource;
 	filter_hook fHook;
-	bool fInstalled = false;
 	const BHandler* fOwner = nullptr; // borrowed: whose list it is in
 };

@@ -5,6 +5,8 @@
 
 #include <Looper.h>
 
+class BWindow;
+
 namespace BPrivate {
 
 class Worker;
@@ -12,10 +14,6 @@ class Worker;
 // A message for no handler in particular: for the preferred one, else for the looper.
 constexpr int32 kNoToken = -1;
 constexpr int32 kPreferredToken = -2;
-
-// Codes that only the kits send.
-constexpr uint32 kQuitLoop = '_QIT';
-constexpr uint32 kUpdateWindow = '_UPD';
 
 
 class LooperPrivate {
@@ -31,9 +29,9 @@ public:
 	void PostSystem(BMessage* message, bool toPreferred = false);
 	// The same, ahead of everything that waits.
 	void PostAhead(BMessage* message);
-	// Queues '_UPD' for the looper ahead of everything, unless one is waiting already. Any thread.
+	// Queues _UPDATE_ for the looper ahead of everything, unless one is waiting already. Any thread.
 	void RequestUpdate();
-	// Takes the waiting '_UPD' out, as when the update is done at once; false when none waits.
+	// Takes the waiting _UPDATE_ out, as when the update is done at once; false when none waits.
 	bool CancelUpdate();
 
 	// Takes the first waiting message out for which the function says so; NULL when there is
@@ -49,11 +47,17 @@ public:
 	bool IsRunning() const;
 	bool IsTerminating() const;
 
+	// Told by the window's constructor: the application ends it, if nobody else does.
+	void MarkAsWindow();
+	// Makes it a window of the application, in the order of these calls, until it is deleted.
+	void RegisterWindow(BWindow* window);
+
 	// Every living looper, in the order of their making. Valid until one is deleted; use
 	// BMessenger or BLooper::Lock() to reach one safely.
 	static int32 CountLoopers();
 	static BLooper* LooperAt(int32 index);
 	static bool IsAlive(const BLooper* looper);
+	static bool IsRunning(const BLooper* looper); // false when it is gone
 
 private:
 	BLooper* fLooper; // borrowed

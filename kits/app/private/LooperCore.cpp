@@ -1,0 +1,538 @@
+#include "app/private/LooperCore.h"
+
+#include <algorithm>
+#include <chrono>
+#include <unordered_map>
+#include <vector>
+
+#include <AppDefs.h>
+#include <Message.h>
+
+#include "app/private/Delivery.h"
+
+namespace BPrivate {
+namespace {
+
+thread_id
+ThisThread()
+{
+	static thread_local const thread_id sThread = find_thread(NULL);
+	return sThread;
+}
+
+// Whether this thread runs the loop of some looper.
+thread_local bool sRunsLoop = false;
+
+// Waits on a condition with the platform's relative timeout; false when the time is over.
+template<typename Condition, typename Lock, typename Predicate>
+bool
+WaitFor(Condition& condition, Lock& lock, bigtime_t timeout, Predicate done)
+{
+	// Longer than a century is for ever, and would overflow the clock.
+	if (timeout > bigtime_t(1) << 51) {
+		condition.wait(lock, done);
+		return true;
+	}
+	return condition.wait_for(
+		lock, std::chrono::microseconds(std::max<bigtime_t>(timeout, 0)), done);
+}
+
+} // namespace
+
+
+struct LooperCore::Waiter {
+	explicit Waiter(thread_id who) : thread(who) {}
+
+	const thread_id thread;
+	bool granted = false;
+	std::condition_variable wake;
+};
+
+
+LooperCore::LooperCore(BLooper* looper, int32 capacity) :
+	fLooper(looper), fCapacity(std::max<int32>(capacity, 1))
+{
+	fQueue.fCore = this;
+}
+
+
+LooperCore::~LooperCore()
+{
+	fQueue.fCore = nullptr;
+}
+
+
+void
+LooperCore::SetAddress(int32 portId, int32 ownToken)
+{
+	fPortId = portId;
+	fOwnToken = ownToken;
+}
+
+
+// #pragma mark - lock
+
+
+status_t
+LooperCore::Lock(bigtime_t timeout)
+{
+	const thread_id self = ThisThread();
+	if (fOwner.load(std::memory_order_relaxed) == self) {
+		fLockCount.fetch_add(1, std::memory_order_relaxed);
+		return B_OK;
+	}
+
+	std::unique_lock lock(fMutex);
+	if (fGone)
+		return B_BAD_PORT_ID;
+	if (fOwner < 0) {
+		fOwner = self;
+		fLockCount = 1;
+		return B_OK;
+	}
+
+	Waiter waiter(self);
+	const auto place = fWaiters.insert(fWaiters.end(), &waiter);
+	WaitFor(waiter.wake, lock, timeout, [&] { return waiter.granted || fGone; });
+	if (waiter.granted)
+		return B_OK;
+
+	fWaiters.erase(place);
+	return fGone ? B_BAD_PORT_ID : B_TIMED_OUT;
+}
+
+
+void
+LooperCore::Unlock()
+{
+	if (fLockCount.fetch_sub(1, std::memory_order_relaxed) > 1)
+		return;
+
+	std::lock_guard lock(fMutex);
+	if (fGone || fWaiters.empty()) {
+		fOwner = -1;
+		return;
+	}
+
+	// The lock goes straight to the next one, or a busy loop would never let anybody in.
+	Waiter* next = fWaiters.front();
+	fWaiters.pop_front();
+	fOwner = next->thread;
+	fLockCount = 1;
+	next->granted = true;
+	next->wake.notify_one();
+}
+
+
+void
+LooperCore::UnlockAll()
+{
+	fLockCount = 1;
+	Unlock();
+}
+
+
+bool
+LooperCore::IsLockedByCaller() const
+{
+	return fOwner.load(std::memory_order_relaxed) == ThisThread();
+}
+
+
+int32
+LooperCore::CountRequests() const
+{
+	std::lock_guard lock(fMutex);
+	return int32(fWaiters.size()) + (fOwner >= 0 ? 1 : 0);
+}
+
+
+// #pragma mark - queue
+
+
+void
+LooperCore::_Added()
+{
+	fArrivals++;
+	if (fCounting)
+		fWorker.AddWork();
+	fArrived.notify_all();
+}
+
+
+void
+LooperCore::_Removed(uint32 what)
+{
+	if (what == _UPDATE_)
+		fUpdateWaits = false;
+	if (fCounting)
+		fWorker.WorkDone();
+}
+
+
+status_t
+LooperCore::Receive(std::unique_ptr<BMessage> message, bigtime_t timeout)
+{
+	std::unique_lock lock(fQueue.fLock);
+	if (fClosed)
+		return B_BAD_PORT_ID;
+
+	// Who keeps the loop from emptying its port, or runs a loop that others may wait for, must not
+	// wait here for ever: the two would never go on.
+	const bool mayWait = timeout != B_INFINITE_TIMEOUT || (!IsLockedByCaller() && !sRunsLoop);
+	if (fInPort >= fCapacity && mayWait) {
+		if (timeout <= 0)
+			return B_WOULD_BLOCK;
+		if (!WaitFor(fRoom, lock, timeout, [&] { return fInPort < fCapacity || fClosed; }))
+			return B_TIMED_OUT;
+		if (fClosed)
+			return B_BAD_PORT_ID;
+	}
+
+	fInPort++;
+	fQueue.fMessages.push_back(message.release());
+	_Added();
+	return B_OK;
+}
+
+
+bool
+LooperCore::Put(std::unique_ptr<BMessage> message, bool ahead)
+{
+	std::unique_lock lock(fQueue.fLock);
+	if (fClosed) {
+		// Deleting it may answer its sender, which takes other locks.
+		lock.unlock();
+		return false;
+	}
+	if (ahead)
+		fQueue.fMessages.push_front(message.release());
+	else
+		fQueue.fMessages.push_back(message.release());
+	_Added();
+	return true;
+}
+
+
+void
+LooperCore::RequestUpdate()
+{
+	std::unique_lock lock(fQueue.fLock);
+	if (fUpdateWaits || fClosed)
+		return;
+
+	fUpdateWaits = true;
+	auto* message = new BMessage(_UPDATE_);
+	Delivery::Of(*message).target = fOwnToken;
+	fQueue.fMessages.push_front(message);
+	_Added();
+}
+
+
+bool
+LooperCore::CancelUpdate()
+{
+	std::unique_lock lock(fQueue.fLock);
+	if (!fUpdateWaits)
+		return false;
+	delete TakeMatching([](const BMessage& message) { return message.what == _UPDATE_; });
+	return true;
+}
+
+
+BMessage*
+LooperCore::TakeMatching(const std::function<bool(const BMessage&)>& wanted)
+{
+	std::unique_lock lock(fQueue.fLock);
+	auto& messages = fQueue.fMessages;
+	for (auto i = messages.begin(); i != messages.end(); ++i) {
+		if (!wanted(**i))
+			continue;
+
+		BMessage* message = *i;
+		messages.erase(i);
+		_Removed(message->what);
+		return message;
+	}
+	return nullptr;
+}
+
+
+bool
+LooperCore::WaitForArrival(bigtime_t timeout)
+{
+	std::unique_lock lock(fQueue.fLock);
+	const uint64 before = fArrivals;
+	return WaitFor(fArrived, lock, timeout, [&] { return fArrivals != before; });
+}
+
+
+// #pragma mark - loop
+
+
+void
+LooperCore::WaitForMessage()
+{
+	std::unique_lock lock(fQueue.fLock);
+	fArrived.wait(lock, [&] { return !fQueue.fMessages.empty(); });
+}
+
+
+BMessage*
+LooperCore::Take()
+{
+	std::unique_lock lock(fQueue.fLock);
+	if (fQueue.fMessages.empty())
+		return nullptr;
+
+	BMessage* message = fQueue.fMessages.front();
+	fQueue.fMessages.pop_front();
+	if (message->what == _UPDATE_)
+		fUpdateWaits = false;
+
+	// The loop has moved everything from the port into the queue.
+	fInPort = 0;
+	fRoom.notify_all();
+	fInWork++;
+	return message;
+}
+
+
+void
+LooperCore::WorkDone()
+{
+	std::unique_lock lock(fQueue.fLock);
+	if (fInWork == 0)
+		return;
+	fInWork--;
+	fWorker.WorkDone();
+}
+
+
+void
+LooperCore::BeginLoop(thread_id thread)
+{
+	std::unique_lock lock(fQueue.fLock);
+	fThread = thread;
+	fCounting = true;
+	fWorker.AddWork(int32(fQueue.fMessages.size()));
+	if (thread == ThisThread())
+		sRunsLoop = true;
+}
+
+
+void
+LooperCore::EnterLoop()
+{
+	sRunsLoop = true;
+}
+
+
+void
+LooperCore::EndLoop()
+{
+	std::unique_lock lock(fQueue.fLock);
+	sRunsLoop = false;
+	if (fCounting)
+		fWorker.WorkDone(int32(fQueue.fMessages.size()) + fInWork);
+	fCounting = false;
+	fInWork = 0;
+	fThread = -1;
+}
+
+
+void
+LooperCore::Die()
+{
+	std::deque<BMessage*> left;
+	{
+		std::unique_lock lock(fQueue.fLock);
+		fClosed = true;
+		left.swap(fQueue.fMessages);
+		fRoom.notify_all();
+		fArrived.notify_all();
+	}
+	// Deleted without the lock: a sender that waits is answered now. It is work until then.
+	for (BMessage* message : left)
+		delete message;
+	{
+		std::unique_lock lock(fQueue.fLock);
+		if (fCounting)
+			fWorker.WorkDone(int32(left.size()) + fInWork);
+		fCounting = false;
+		fInWork = 0;
+	}
+
+	std::unique_lock lock(fMutex);
+	fGone = true;
+	fLooper = nullptr;
+	fOwner = -1;
+	fLockCount = 0;
+	for (Waiter* waiter : fWaiters)
+		waiter->wake.notify_one();
+	fDead.notify_all();
+}
+
+
+void
+LooperCore::WaitUntilDead()
+{
+	std::unique_lock lock(fMutex);
+	fDead.wait(lock, [&] { return fGone; });
+}
+
+
+// #pragma mark - table
+
+
+namespace {
+
+struct WindowEntry {
+	BLooper* looper;
+	BWindow* window;
+};
+
+struct Table {
+	std::mutex lock;
+	std::unordered_map<const BLooper*, std::shared_ptr<LooperCore>> cores;
+	std::vector<BLooper*> loopers;
+	std::vector<WindowEntry> windows;
+};
+
+// Never destroyed: threads may still lock loopers while the program's static objects go.
+Table&
+TheLoopers()
+{
+	static Table* table = new Table;
+	return *table;
+}
+
+} // namespace
+
+
+void
+LooperTable::Add(BLooper* looper, std::shared_ptr<LooperCore> core)
+{
+	Table& table = TheLoopers();
+	std::lock_guard lock(table.lock);
+	table.cores[looper] = std::move(core);
+	table.loopers.push_back(looper);
+}
+
+
+void
+LooperTable::Remove(BLooper* looper)
+{
+	Table& table = TheLoopers();
+	std::shared_ptr<LooperCore> removed; // goes after the lock
+	std::lock_guard lock(table.lock);
+	if (const auto found = table.cores.find(looper); found != table.cores.end()) {
+		removed = std::move(found->second);
+		table.cores.erase(found);
+	}
+	std::erase(table.loopers, looper);
+	std::erase_if(table.windows, [&](const WindowEntry& entry) { return entry.looper == looper; });
+}
+
+
+std::shared_ptr<LooperCore>
+LooperTable::Find(const BLooper* looper)
+{
+	Table& table = TheLoopers();
+	std::lock_guard lock(table.lock);
+	const auto found = table.cores.find(looper);
+	return found == table.cores.end() ? nullptr : found->second;
+}
+
+
+BLooper*
+LooperTable::FindByThread(thread_id thread)
+{
+	Table& table = TheLoopers();
+	std::lock_guard lock(table.lock);
+	for (BLooper* looper : table.loopers) {
+		if (table.cores[looper]->Thread() == thread)
+			return looper;
+	}
+	return nullptr;
+}
+
+
+int32
+LooperTable::CountLoopers()
+{
+	Table& table = TheLoopers();
+	std::lock_guard lock(table.lock);
+	return int32(table.loopers.size());
+}
+
+
+BLooper*
+LooperTable::LooperAt(int32 index)
+{
+	Table& table = TheLoopers();
+	std::lock_guard lock(table.lock);
+	return index >= 0 && index < int32(table.loopers.size()) ? table.loopers[index] : nullptr;
+}
+
+
+void
+LooperTable::AddWindow(BLooper* looper, BWindow* window)
+{
+	Table& table = TheLoopers();
+	std::lock_guard lock(table.lock);
+	const auto known = std::any_of(table.windows.begin(), table.windows.end(),
+		[&](const WindowEntry& entry) { return entry.looper == looper; });
+	if (!known)
+		table.windows.push_back({ looper, window });
+}
+
+
+int32
+LooperTable::CountWindows()
+{
+	Table& table = TheLoopers();
+	std::lock_guard lock(table.lock);
+	return int32(table.windows.size());
+}
+
+
+BWindow*
+LooperTable::WindowAt(int32 index)
+{
+	Table& table = TheLoopers();
+	std::lock_guard lock(table.lock);
+	return index >= 0 && index < int32(table.windows.size()) ? table.windows[index].window
+															 : nullptr;
+}
+
+
+std::shared_ptr<LooperCore>
+LooperTable::NextWindow(const std::vector<std::shared_ptr<LooperCore>>& known)
+{
+	Table& table = TheLoopers();
+	std::lock_guard lock(table.lock);
+	for (const WindowEntry& entry : table.windows) {
+		const std::shared_ptr<LooperCore>& core = table.cores[entry.looper];
+		if (std::find(known.begin(), known.end(), core) == known.end())
+			return core;
+	}
+	return nullptr;
+}
+
+
+std::vector<BLooper*>
+LooperTable::AllWindows()
+{
+	Table& table = TheLoopers();
+	std::lock_guard lock(table.lock);
+	std::vector<BLooper*> windows;
+	for (BLooper* looper : table.loopers) {
+		if (table.cores[looper]->IsWindow())
+			windows.push_back(looper);
+	}
+	return windows;
+}
+
+
+} // namespace BPrivate
