@@ -2,6 +2,8 @@
 #pragma once
 
 #include <memory>
+#include <string>
+#include <vector>
 
 #include <Font.h>
 #include <View.h>
@@ -207,88 +209,105 @@ protected:
 		BMessage* drag, BBitmap** _bitmap, BPoint* _point, BHandler** _handler);
 
 private:
-	friend class BPrivate::TextLayout;
-	struct Input;
+	struct Composition;
 	struct Tracking;
 
 	void _Init(BRect textRect, const BFont* font, const rgb_color* color);
-	void _InitFromArchive(BMessage* archive);
+	void _ReadArchive(BMessage* archive);
+	void _ReadDisallowed(BMessage* archive);
+	void _ReadRuns(BMessage* archive);
 
-	bool _CanEdit() const;
-	bool _Replace(int32 from, int32 to, const char* text, int32 length, const text_run_array* runs,
-		undo_state kind);
+	// Text and runs
+	int32 _Clamp(int32 offset) const;
+	int32 _InsertLimited(
+		int32 offset, const char* text, int32 length, const text_run_array* runs);
+	void _Edit(undo_state kind, int32 from, int32 to, const char* text, int32 length,
+		const text_run_array* runs);
 	void _TextChanged(int32 offset, int32 removed, int32 inserted);
-	void _UpdateLayout();
-	void _InvalidateLines(int32 from, int32 to, float oldHeight);
-	void _InvalidateText(int32 from, int32 to);
-	void _RecalculateAll();
-	void _AdjustSize();
-	void _UpdateScrollBars();
-	BRect _LayoutRect() const;
-	float _LineLeft(int32 line) const;
-	BPoint _PlaceOf(int32 offset, float* _height) const;
-
-	void _SetSelection(int32 anchor, int32 caret, bool scroll);
-	void _ShowCaret();
-	void _HideCaret();
-	BRect _CaretRect() const;
-	bool _HasActiveFocus() const;
-	void _ExtendSelection(int32 to);
-	void _MoveCaret(int32 to, bool extend);
-	void _MoveVertically(int32 lines, bool extend);
-	int32 _WordEdge(int32 from, bool forward) const;
-
-	void _HandleArrow(char key, uint32 modifiers);
-	void _HandleHomeEndPage(char key, uint32 modifiers);
-	void _HandleBackspace(bool word);
-	void _HandleDelete(bool word);
-	void _HandleText(const char* bytes, int32 numBytes);
-	bool _IsAllowed(uint32 character) const;
-	bool _FilterInsertion(const char*& text, int32& length, std::unique_ptr<char[]>& storage) const;
-
-	void _TrackPress(BPoint where);
-	void _BeginDrag(BPoint where);
-	void _HandleDrop(BMessage* message);
-	void _ShowDropCaret(BPoint where);
-	void _HideDropCaret();
-	void _SelectAround(int32 offset, int32 clicks, int32* _from, int32* _to);
-	void _HandleInputMethod(BMessage* message);
-	void _ConfirmInput();
-	void _UpdateCursor(BPoint where);
-	void _AddShortcuts();
-	void _RemoveShortcuts();
+	void _StyleChanged(int32 from, int32 to);
 	void _ApplyStep(bool undo);
+
+	// Layout
+	void _LayOutAgain();
+	void _TextHeightChanged();
+	void _FitToText();
+	void _UpdateScrollBars();
+	void _KeepInView();
+	float _WrapWidth() const;
+	float _LineLeft(int32 line) const;
+	BRect _ExtentOf(int32 offset) const;
+	void _InvalidateLines(int32 from, int32 to);
+	void _InvalidateRange(int32 from, int32 to);
+
+	// Selection and caret
+	int32 _Start() const { return fAnchor < fCaret ? fAnchor : fCaret; }
+	int32 _End() const { return fAnchor < fCaret ? fCaret : fAnchor; }
+	void _SetSelection(int32 anchor, int32 caret);
+	void _MoveCaret(int32 to, bool extend);
+	void _MoveByLines(int32 lines, bool extend);
+	int32 _WordEdge(int32 from, bool forward) const;
+	void _SetActive(bool active);
+	void _RestartBlinking();
+	BRect _CaretRect(int32 offset) const;
+	bool _ShowsCaret() const;
+	bool _ShowsSelection() const;
+
+	// Keys
+	uint32 _CurrentModifiers() const;
+	bool _HandleNavigation(char key, uint32 modifiers);
+	void _HandleErasing(bool forward, bool word);
+	void _HandleEnter();
+	void _HandleTyping(const char* bytes, int32 numBytes);
+	bool _ScrollByKey(char key);
+	bool _IsAllowed(uint32 character) const;
+	std::string _Allowed(const char* text, int32 length) const;
+
+	// Mouse and drags
+	void _SelectAround(int32 offset, int32 clicks, int32* _from, int32* _to);
+	void _TrackTo(BPoint where);
+	void _StopTracking();
+	void _BeginDrag();
+	void _ShowDropPlace(int32 offset);
+	void _HandleDrop(BMessage* message);
+	void _UpdateCursor(BPoint where);
+	void _HandleInputMethod(BMessage* message);
+	void _EndComposition(bool keepText);
+	void _AddToMessage(BMessage* data, int32 from, int32 to) const;
+	bool _InsertFrom(const BMessage* data, undo_state kind, int32 offset);
+
+	// Drawing
 	void _DrawLine(int32 line, BRect updateRect);
-	void _DrawSelection(BRect updateRect);
-	void _AddToClipboard(BMessage* data, int32 from, int32 to) const;
+	void _InvertRange(int32 from, int32 to, BRect updateRect);
+	bool _HandleProperty(BMessage* message);
 
 	std::unique_ptr<BPrivate::TextModel> fModel;
 	std::unique_ptr<BPrivate::TextLayout> fLayout;
-	std::unique_ptr<BPrivate::TextHistory> fHistory;
-	std::unique_ptr<Input> fInput; // what an input method composes; NULL at rest
-	std::unique_ptr<Tracking> fTracking; // the press that is being followed; NULL without one
+	std::unique_ptr<BPrivate::TextHistory> fHistory; // NULL until there is something to remember
+	std::unique_ptr<Composition> fComposition;       // of an input method; NULL at rest
+	std::unique_ptr<Tracking> fTracking;             // the press that is being followed
+	std::vector<uint32> fDisallowed;                 // in the order they were disallowed
 
-	BRect fTextRect; // its bottom follows the text
-	int32 fAnchor; // where the selection was begun
-	int32 fCaret; // where it ends now
-	float fCaretX; // the column that vertical moves keep; negative when unset
-	int32 fDropOffset;
+	BRect fTextRect;
+	BView* fContainer; // borrowed; grows with the text instead of this view
 	bigtime_t fCaretTime;
+	int32 fAnchor; // where the selection was begun
+	int32 fCaret;  // where it ends now
+	float fCaretX; // what moves up and down keep to; negative when unset
+	int32 fDropPlace; // -1 without a drag over the view
+	int32 fHighlightStart;
+	int32 fHighlightEnd;
+	int32 fMaxBytes;
 	float fTabWidth;
 	alignment fAlignment;
 	color_space fColorSpace;
-	int32 fMaxBytes;
-	std::unique_ptr<BList> fDisallowed; // characters, in the order they were disallowed
-	BView* fContainer; // borrowed; grows instead of this view
-	bool fCaretShown;
-	bool fActive; // focus in an active window
+	bool fCaretVisible; // the phase of its blinking
+	bool fActive;       // has the focus, in an active window
 	bool fStylable;
 	bool fSelectable;
 	bool fEditable;
 	bool fWrap;
 	bool fAutoindent;
 	bool fResizable;
-	bool fPassword;
-	bool fShortcutsAdded;
-	bool fRevived; // sizes stay as archived until a setter or the user changes something
+	bool fDoesUndo;
+	bool fHidesTyping;
 };
