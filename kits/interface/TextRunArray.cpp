@@ -111,8 +111,7 @@ unflatten_run(const uint8* at)
 	// Some writers put this one everywhere.
 	if (face != B_REGULAR_FACE)
 		run.font.SetFace(face);
-	run.color = { at[kColorField], at[kColorField + 1], at[kColorField + 2],
-		at[kColorField + 3] };
+	run.color = { at[kColorField], at[kColorField + 1], at[kColorField + 2], at[kColorField + 3] };
 	return run;
 }
 
@@ -150,8 +149,8 @@ BTextView::AllocRunArray(int32 entryCount, int32* _size)
 {
 	if (entryCount < 0)
 		return NULL;
-	const size_t size
-		= sizeof(text_run_array) + std::max<int32>(0, entryCount - 1) * sizeof(text_run);
+	const size_t size =
+		sizeof(text_run_array) + std::max<int32>(0, entryCount - 1) * sizeof(text_run);
 	text_run_array* array = static_cast<text_run_array*>(calloc(1, size));
 	if (array == NULL)
 		return NULL;

@@ -1,9 +1,11 @@
 #include "TextView.h"
 
 #include <algorithm>
-#include <cmath>
+#include <cstring>
 
+#include <AppDefs.h>
 #include <Clipboard.h>
+#include <Cursor.h>
 #include <File.h>
 #include <Message.h>
 #include <ScrollBar.h>
@@ -136,6 +138,7 @@ BTextView::_Init(BRect textRect, const BFont* font, const rgb_color* color)
 	fResizable = false;
 	fDoesUndo = true;
 	fHidesTyping = false;
+	fFaded = false;
 
 	fLayout->SetTabWidth(fTabWidth);
 	fLayout->SetWrapWidth(_WrapWidth());
@@ -214,13 +217,12 @@ BTextView::Archive(BMessage* archive, bool deep) const
 	writer.Bool("_nedit", !fEditable, false);
 	writer.Bool("_password", fHidesTyping, false);
 
-	const BMessage* source = writer.Source();
-	if (!writer.Keep("_dis_ch", source != NULL && disallowed_of(*source) == fDisallowed)
+	if (!writer.Keep("_dis_ch", disallowed_of(writer.Source()) == fDisallowed)
 		&& !fDisallowed.empty()) {
 		archive->AddData(
 			"_dis_ch", B_RAW_TYPE, fDisallowed.data(), fDisallowed.size() * sizeof(uint32));
 	}
-	if (!writer.Keep("_runs", source != NULL && _HasRunsOf(*source))) {
+	if (!writer.Keep("_runs", _HasRunsOf(writer.Source()))) {
 		text_run_array* runs = RunArray(0, TextLength());
 		int32 size;
 		void* data = FlattenRunArray(runs, &size);
@@ -235,12 +237,10 @@ BTextView::Archive(BMessage* archive, bool deep) const
 void
 BTextView::_ArchiveSelection(ArchiveWriter& writer, BMessage* archive) const
 {
-	if (const BMessage* source = writer.Source()) {
-		int32 start, end;
-		get_selection_of(*source, TextLength(), &start, &end);
-		if (writer.Keep("_sel", start == _Start() && end == _End()))
-			return;
-	}
+	int32 start, end;
+	get_selection_of(writer.Source(), TextLength(), &start, &end);
+	if (writer.Keep("_sel", start == _Start() && end == _End()))
+		return;
 	archive->AddInt32("_sel", _Start());
 	archive->AddInt32("_sel", _End());
 }
@@ -251,8 +251,8 @@ BTextView::_HasRunsOf(const BMessage& archive) const
 {
 	const TextRuns runs = _RunsOf(archive);
 	const TextRuns& own = fModel->Runs();
-	return std::equal(runs.begin(), runs.end(), own.begin(), own.end(),
-		[](const TextRun& a, const TextRun& b) {
+	return std::equal(
+		runs.begin(), runs.end(), own.begin(), own.end(), [](const TextRun& a, const TextRun& b) {
 			return a.offset == b.offset && a.style == b.style;
 		});
 }

@@ -14,9 +14,12 @@ class BFile;
 class BRegion;
 
 namespace BPrivate {
+class ArchiveWriter;
 class TextHistory;
+class TextInput;
 class TextLayout;
 class TextModel;
+struct TextRun;
 } // namespace BPrivate
 
 
@@ -209,18 +212,19 @@ protected:
 		BMessage* drag, BBitmap** _bitmap, BPoint* _point, BHandler** _handler);
 
 private:
+	friend class BPrivate::TextInput;
 	struct Composition;
 	struct Tracking;
 
 	void _Init(BRect textRect, const BFont* font, const rgb_color* color);
 	void _ReadArchive(BMessage* archive);
-	void _ReadDisallowed(BMessage* archive);
-	void _ReadRuns(BMessage* archive);
+	std::vector<BPrivate::TextRun> _RunsOf(const BMessage& archive) const;
+	bool _HasRunsOf(const BMessage& archive) const;
+	void _ArchiveSelection(BPrivate::ArchiveWriter& writer, BMessage* archive) const;
 
 	// Text and runs
 	int32 _Clamp(int32 offset) const;
-	int32 _InsertLimited(
-		int32 offset, const char* text, int32 length, const text_run_array* runs);
+	int32 _InsertLimited(int32 offset, const char* text, int32 length, const text_run_array* runs);
 	void _Edit(undo_state kind, int32 from, int32 to, const char* text, int32 length,
 		const text_run_array* runs);
 	void _TextChanged(int32 offset, int32 removed, int32 inserted);
@@ -231,6 +235,8 @@ private:
 	void _LayOutAgain();
 	void _TextHeightChanged();
 	void _FitToText();
+	float _ContentWidth() const;
+	float _ContentHeight() const;
 	void _UpdateScrollBars();
 	void _KeepInView();
 	float _WrapWidth() const;
@@ -265,33 +271,41 @@ private:
 	// Mouse and drags
 	void _SelectAround(int32 offset, int32 clicks, int32* _from, int32* _to);
 	void _TrackTo(BPoint where);
+	void _AutoScroll();
 	void _StopTracking();
 	void _BeginDrag();
 	void _ShowDropPlace(int32 offset);
 	void _HandleDrop(BMessage* message);
 	void _UpdateCursor(BPoint where);
 	void _HandleInputMethod(BMessage* message);
+	void _Compose(BMessage* message);
+	void _RemoveComposed();
 	void _EndComposition(bool keepText);
+	void _SendCompositionPlaces();
 	void _AddToMessage(BMessage* data, int32 from, int32 to) const;
 	bool _InsertFrom(const BMessage* data, undo_state kind, int32 offset);
 
 	// Drawing
 	void _DrawLine(int32 line, BRect updateRect);
 	void _InvertRange(int32 from, int32 to, BRect updateRect);
+	void _DrawComposition(BRect updateRect);
 	bool _HandleProperty(BMessage* message);
+	status_t _HandleSelectionProperty(BMessage* message, BMessage* reply);
+	status_t _HandleTextProperty(
+		BMessage* message, const BMessage& specifier, int32 form, BMessage* reply);
 
 	std::unique_ptr<BPrivate::TextModel> fModel;
 	std::unique_ptr<BPrivate::TextLayout> fLayout;
 	std::unique_ptr<BPrivate::TextHistory> fHistory; // NULL until there is something to remember
-	std::unique_ptr<Composition> fComposition;       // of an input method; NULL at rest
-	std::unique_ptr<Tracking> fTracking;             // the press that is being followed
-	std::vector<uint32> fDisallowed;                 // in the order they were disallowed
+	std::unique_ptr<Composition> fComposition; // of an input method; NULL at rest
+	std::unique_ptr<Tracking> fTracking; // the press that is being followed
+	std::vector<uint32> fDisallowed; // in the order they were disallowed
 
 	BRect fTextRect;
 	BView* fContainer; // borrowed; grows with the text instead of this view
 	bigtime_t fCaretTime;
 	int32 fAnchor; // where the selection was begun
-	int32 fCaret;  // where it ends now
+	int32 fCaret; // where it ends now
 	float fCaretX; // what moves up and down keep to; negative when unset
 	int32 fDropPlace; // -1 without a drag over the view
 	int32 fHighlightStart;
@@ -301,7 +315,7 @@ private:
 	alignment fAlignment;
 	color_space fColorSpace;
 	bool fCaretVisible; // the phase of its blinking
-	bool fActive;       // has the focus, in an active window
+	bool fActive; // has the focus, in an active window
 	bool fStylable;
 	bool fSelectable;
 	bool fEditable;
@@ -310,4 +324,5 @@ private:
 	bool fResizable;
 	bool fDoesUndo;
 	bool fHidesTyping;
+	bool fFaded; // as the text of a disabled control
 };

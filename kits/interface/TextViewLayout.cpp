@@ -2,6 +2,7 @@
 #include "TextView.h"
 
 #include <algorithm>
+#include <cctype>
 #include <cmath>
 
 #include <Region.h>
@@ -65,8 +66,7 @@ BTextView::PointAt(int32 offset, float* _height) const
 	const int32 line = fLayout->LineAtOffset(offset);
 	if (_height != NULL)
 		*_height = fLayout->Height(line);
-	return BPoint(_LineLeft(line) + fLayout->XAt(line, offset),
-		fTextRect.top + fLayout->Top(line));
+	return BPoint(_LineLeft(line) + fLayout->XAt(line, offset), fTextRect.top + fLayout->Top(line));
 }
 
 
@@ -319,8 +319,8 @@ BTextView::_TextChanged(int32 offset, int32 removed, int32 inserted)
 	} else {
 		BRect rect = Bounds();
 		rect.top = std::max(rect.top, fTextRect.top + fLayout->Top(difference.first));
-		rect.bottom
-			= std::min(rect.bottom, std::max(oldBottom, fTextRect.top + fLayout->TotalHeight()));
+		rect.bottom =
+			std::min(rect.bottom, std::max(oldBottom, fTextRect.top + fLayout->TotalHeight()));
 		Invalidate(rect);
 	}
 	fHighlightStart = fHighlightEnd = 0;
@@ -339,8 +339,8 @@ BTextView::_StyleChanged(int32 from, int32 to)
 	_TextHeightChanged();
 	BRect rect = Bounds();
 	rect.top = std::max(rect.top, fTextRect.top + fLayout->Top(fLayout->LineAtOffset(from)));
-	rect.bottom
-		= std::min(rect.bottom, std::max(oldBottom, fTextRect.top + fLayout->TotalHeight()));
+	rect.bottom =
+		std::min(rect.bottom, std::max(oldBottom, fTextRect.top + fLayout->TotalHeight()));
 	Invalidate(rect);
 	_FitToText();
 	_UpdateScrollBars();
@@ -519,11 +519,11 @@ BTextView::_DrawLine(int32 line, BRect updateRect)
 		if (x - overhang > updateRect.right || x + piece.width + overhang < updateRect.left)
 			continue;
 		SetFont(&piece.style->font);
-		SetHighColor(_IsShownFaded() ? faded : piece.style->color);
+		SetHighColor(fFaded ? faded : piece.style->color);
 		if (!fHidesTyping) {
 			const int32 length = piece.end - piece.start;
-			DrawString(fModel->Buffer().Contiguous(piece.start, length), length,
-				BPoint(x, baseline));
+			DrawString(
+				fModel->Buffer().Contiguous(piece.start, length), length, BPoint(x, baseline));
 			continue;
 		}
 		bullets.clear();

@@ -258,8 +258,8 @@ BTextView::AcceptsPaste(BClipboard* clipboard)
 		return false;
 	const BMessage* data = clipboard->Data();
 	type_code type;
-	const bool accepts = data != NULL && data->GetInfo(kTextType, &type) == B_OK
-		&& type == B_MIME_TYPE;
+	const bool accepts =
+		data != NULL && data->GetInfo(kTextType, &type) == B_OK && type == B_MIME_TYPE;
 	clipboard->Unlock();
 	return accepts;
 }
@@ -338,8 +338,8 @@ BTextView::SetFontAndColor(const BFont* font, uint32 mode, const rgb_color* colo
 
 
 void
-BTextView::SetFontAndColor(int32 startOffset, int32 endOffset, const BFont* font, uint32 mode,
-	const rgb_color* color)
+BTextView::SetFontAndColor(
+	int32 startOffset, int32 endOffset, const BFont* font, uint32 mode, const rgb_color* color)
 {
 	int32 from = _Clamp(startOffset);
 	int32 to = _Clamp(endOffset);
@@ -532,8 +532,8 @@ BTextView::InsertText(const char* text, int32 length, int32 offset, const text_r
 		fModel->Insert(offset, text, length, NULL);
 	}
 	if (fHistory != nullptr && fHistory->IsOpen()) {
-		fHistory->Note(true, offset, std::string(text, length),
-			fModel->CopyRuns(offset, offset + length));
+		fHistory->Note(
+			true, offset, std::string(text, length), fModel->CopyRuns(offset, offset + length));
 	}
 	if (fAnchor >= offset)
 		fAnchor += length;
@@ -571,8 +571,7 @@ BTextView::_Clamp(int32 offset) const
 
 // Inserts whole characters as far as there is room for them; returns how many bytes.
 int32
-BTextView::_InsertLimited(
-	int32 offset, const char* text, int32 length, const text_run_array* runs)
+BTextView::_InsertLimited(int32 offset, const char* text, int32 length, const text_run_array* runs)
 {
 	const int32 room = std::max<int32>(0, fMaxBytes - TextLength());
 	if (length > room) {

@@ -99,8 +99,8 @@ private:
 		fCharacter = fModel.CharacterAt(fOffset);
 		fOffset = std::min(fModel.NextCharacter(fOffset), fChunkEnd);
 		const int32 length = fOffset - fChunkStart;
-		const float width
-			= fWidths->StringWidth(fModel.Buffer().Contiguous(fChunkStart, length), length);
+		const float width =
+			fWidths->StringWidth(fModel.Buffer().Contiguous(fChunkStart, length), length);
 		const float step = std::max(0.0f, width - fBefore);
 		fBefore = std::max(fBefore, width);
 		return step;
@@ -182,8 +182,7 @@ TextLayout::Change(int32 offset, int32 removed, int32 inserted)
 			if (old < oldCount && LineStart(old) + delta == position)
 				break;
 			if (position >= length
-				&& (lines.back().offset == length
-					|| fModel.Buffer().ByteAt(length - 1) != '\n')) {
+				&& (lines.back().offset == length || fModel.Buffer().ByteAt(length - 1) != '\n')) {
 				old = oldCount;
 				break;
 			}
@@ -203,8 +202,7 @@ TextLayout::Change(int32 offset, int32 removed, int32 inserted)
 	const int32 shared = std::min(difference.oldCount, difference.newCount);
 	std::copy_n(lines.begin(), shared, fLines.begin() + first);
 	if (difference.newCount > shared) {
-		fLines.insert(
-			fLines.begin() + first + shared, lines.begin() + shared, lines.end());
+		fLines.insert(fLines.begin() + first + shared, lines.begin() + shared, lines.end());
 	} else if (difference.oldCount > shared) {
 		fLines.erase(fLines.begin() + first + shared, fLines.begin() + old);
 	}
@@ -348,8 +346,7 @@ TextLayout::GetPieces(int32 line, std::vector<Piece>& pieces) const
 			run = -1;
 		} else if (walker.RunIndex() != run) {
 			run = walker.RunIndex();
-			pieces.push_back(
-				{ offset, walker.Offset(), &fModel.Runs()[run].style, x, width });
+			pieces.push_back({ offset, walker.Offset(), &fModel.Runs()[run].style, x, width });
 		} else {
 			pieces.back().end = walker.Offset();
 			pieces.back().width += width;

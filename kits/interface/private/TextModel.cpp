@@ -234,8 +234,8 @@ TextBuffer::_Reserve(int32 length)
 	const int32 gap = length + kMinimalGap + fLength / 16;
 	std::vector<char> bytes(fLength + gap);
 	memcpy(bytes.data(), fBytes.data(), fGapStart);
-	memcpy(bytes.data() + fGapStart + gap, fBytes.data() + fGapStart + fGapSize,
-		fLength - fGapStart);
+	memcpy(
+		bytes.data() + fGapStart + gap, fBytes.data() + fGapStart + fGapSize, fLength - fGapStart);
 	fBytes.swap(bytes);
 	fGapSize = gap;
 }

@@ -1,0 +1,520 @@
+// BTextView: the selection, keys and input methods.
+#include "TextView.h"
+
+#include <algorithm>
+#include <cstring>
+
+#include <AppDefs.h>
+#include <Beep.h>
+#include <Message.h>
+#include <ScrollBar.h>
+#include <Window.h>
+
+#include "interface/private/TextHistory.h"
+#include "interface/private/TextLayout.h"
+#include "interface/private/TextViewPrivate.h"
+
+using namespace BPrivate;
+
+namespace {
+
+// What an input method says in "be:opcode".
+constexpr int32 kMethodStarted = 0;
+constexpr int32 kMethodStopped = 1;
+constexpr int32 kMethodChanged = 2;
+constexpr int32 kMethodLocationRequest = 3;
+
+} // namespace
+
+
+void
+BTextView::Select(int32 startOffset, int32 endOffset)
+{
+	const int32 start = _Clamp(startOffset);
+	const int32 end = _Clamp(endOffset);
+	if (start > end)
+		return;
+	_EndComposition(true);
+	_SetSelection(start, end);
+	fCaretX = -1;
+}
+
+
+void
+BTextView::SelectAll()
+{
+	Select(0, TextLength());
+}
+
+
+void
+BTextView::GetSelection(int32* _start, int32* _end) const
+{
+	if (_start != NULL)
+		*_start = _Start();
+	if (_end != NULL)
+		*_end = _End();
+}
+
+
+void
+BTextView::_SetSelection(int32 anchor, int32 caret)
+{
+	if (anchor == fAnchor && caret == fCaret)
+		return;
+	const int32 oldStart = _Start();
+	const int32 oldEnd = _End();
+	const BRect oldCaret = _CaretRect(fCaret);
+	fAnchor = anchor;
+	fCaret = caret;
+	if (fHistory != nullptr && !fHistory->IsOpen())
+		fHistory->BreakTyping();
+	if (fAnchor != fCaret || fAnchor != oldStart)
+		fModel->ForgetPendingStyle();
+	if (Window() == NULL || !fActive)
+		return;
+
+	// Only what changes sides is drawn again.
+	if (oldStart < oldEnd && _Start() < _End() && oldStart < _End() && _Start() < oldEnd) {
+		_InvalidateRange(std::min(oldStart, _Start()), std::max(oldStart, _Start()));
+		_InvalidateRange(std::min(oldEnd, _End()), std::max(oldEnd, _End()));
+	} else {
+		_InvalidateRange(oldStart, oldEnd);
+		_InvalidateRange(_Start(), _End());
+	}
+	Invalidate(oldCaret);
+	_RestartBlinking();
+}
+
+
+// #pragma mark - keys
+
+
+void
+BTextView::KeyDown(const char* bytes, int32 numBytes)
+{
+	if (numBytes <= 0)
+		return;
+	const char key = bytes[0];
+	const uint32 modifiers = _CurrentModifiers();
+
+	if (!fEditable && !fSelectable) {
+		if (!_ScrollByKey(key))
+			BView::KeyDown(bytes, numBytes);
+		return;
+	}
+	_EndComposition(true);
+	if (numBytes == 1 && _HandleNavigation(key, modifiers))
+		return;
+	if (!fEditable) {
+		BView::KeyDown(bytes, numBytes);
+		return;
+	}
+
+	const bool byWord = (modifiers & (B_COMMAND_KEY | B_CONTROL_KEY)) != 0;
+	switch (key) {
+		case B_BACKSPACE:
+			_HandleErasing(false, byWord);
+			break;
+
+		case B_DELETE:
+			_HandleErasing(true, byWord);
+			break;
+
+		case B_ENTER:
+			_HandleEnter();
+			break;
+
+		case B_ESCAPE:
+		case B_INSERT:
+		case B_FUNCTION_KEY:
+			BView::KeyDown(bytes, numBytes);
+			break;
+
+		default:
+			_HandleTyping(bytes, numBytes);
+			break;
+	}
+}
+
+
+// Those of the event in work, or those held now when the program calls a hook by itself.
+uint32
+BTextView::_CurrentModifiers() const
+{
+	const BMessage* message = Window() != NULL ? Window()->CurrentMessage() : NULL;
+	int32 held;
+	if (message != NULL && message->FindInt32("modifiers", &held) == B_OK)
+		return static_cast<uint32>(held);
+	return modifiers();
+}
+
+
+bool
+BTextView::_HandleNavigation(char key, uint32 modifiers)
+{
+	const bool extend = (modifiers & B_SHIFT_KEY) != 0;
+	const bool far = (modifiers & (B_COMMAND_KEY | B_CONTROL_KEY)) != 0;
+	switch (key) {
+		case B_LEFT_ARROW:
+		case B_RIGHT_ARROW: {
+			const bool forward = key == B_RIGHT_ARROW;
+			int32 to = fCaret;
+			if (!extend && !far && _Start() != _End())
+				to = forward ? _End() : _Start();
+			else if (far)
+				to = _WordEdge(fCaret, forward);
+			else
+				to = forward ? fLayout->NextPlace(fCaret) : fLayout->PreviousPlace(fCaret);
+			_MoveCaret(to, extend);
+			return true;
+		}
+
+		case B_UP_ARROW:
+		case B_DOWN_ARROW:
+			_MoveByLines(key == B_UP_ARROW ? -1 : 1, extend);
+			return true;
+
+		case B_HOME:
+			_MoveCaret(far ? 0 : fLayout->LineStart(LineAt(fCaret)), extend);
+			return true;
+
+		case B_END: {
+			const int32 line = LineAt(fCaret);
+			int32 end = fLayout->VisibleEnd(line);
+			// The end of a wrapped line is the start of the next.
+			if (end == fLayout->LineEnd(line) && line + 1 < CountLines())
+				end = fLayout->PreviousPlace(end);
+			_MoveCaret(far ? TextLength() : end, extend);
+			return true;
+		}
+
+		case B_PAGE_UP:
+		case B_PAGE_DOWN: {
+			const float height = std::max(1.0f, LineHeight(LineAt(fCaret)));
+			const int32 lines = std::max(1, static_cast<int>(Bounds().Height() / height) - 1);
+			_MoveByLines(key == B_PAGE_UP ? -lines : lines, extend);
+			return true;
+		}
+
+		default:
+			return false;
+	}
+}
+
+
+void
+BTextView::_MoveCaret(int32 to, bool extend)
+{
+	_SetSelection(extend ? fAnchor : to, to);
+	fCaretX = -1;
+	ScrollToOffset(to);
+	_RestartBlinking();
+}
+
+
+// Keeps the column, also over shorter lines in between.
+void
+BTextView::_MoveByLines(int32 lines, bool extend)
+{
+	const int32 line = LineAt(fCaret);
+	if (fCaretX < 0)
+		fCaretX = PointAt(fCaret).x;
+	const float x = fCaretX;
+	const int32 target = line + lines;
+	int32 to;
+	if (target < 0)
+		to = 0;
+	else if (target >= CountLines())
+		to = TextLength();
+	else
+		to = fLayout->OffsetAtX(target, x - _LineLeft(target));
+	_MoveCaret(to, extend);
+	fCaretX = x;
+}
+
+
+int32
+BTextView::_WordEdge(int32 from, bool forward) const
+{
+	const auto is_blank = [this](int32 offset) {
+		const char byte = fModel->Buffer().ByteAt(offset);
+		return byte == ' ' || byte == '\t' || byte == '\n';
+	};
+	int32 offset = from;
+	if (forward) {
+		while (offset < TextLength() && is_blank(offset))
+			offset++;
+	} else {
+		while (offset > 0 && is_blank(offset - 1))
+			offset--;
+		if (offset > 0)
+			offset = fModel->PreviousCharacter(offset);
+	}
+	if (offset >= TextLength() || (!forward && offset == 0 && is_blank(0)))
+		return offset;
+	int32 start, end;
+	const_cast<BTextView*>(this)->FindWord(offset, &start, &end);
+	return forward ? end : start;
+}
+
+
+void
+BTextView::_HandleErasing(bool forward, bool word)
+{
+	int32 from = _Start();
+	int32 to = _End();
+	if (from == to) {
+		if (forward)
+			to = word ? _WordEdge(to, true) : fLayout->NextPlace(to);
+		else
+			from = word ? _WordEdge(from, false) : fModel->PreviousCharacter(from);
+	}
+	if (from == to)
+		return;
+	const TextStyle style = fModel->StyleAt(from);
+	_Edit(B_UNDO_TYPING, from, to, NULL, 0, NULL);
+	// What is typed next looks like what was erased.
+	if (fStylable && from == _Start())
+		fModel->SetPendingStyle(from, style);
+	ScrollToOffset(fCaret);
+}
+
+
+void
+BTextView::_HandleEnter()
+{
+	std::string text = "\n";
+	if (fAutoindent) {
+		const int32 start = _Start();
+		int32 offset = start;
+		while (offset > 0 && ByteAt(offset - 1) != '\n')
+			offset--;
+		for (; offset < start && (ByteAt(offset) == ' ' || ByteAt(offset) == '\t'); offset++)
+			text += static_cast<char>(ByteAt(offset));
+	}
+	_HandleTyping(text.data(), static_cast<int32>(text.size()));
+}
+
+
+void
+BTextView::_HandleTyping(const char* bytes, int32 numBytes)
+{
+	const std::string text = _Allowed(bytes, numBytes);
+	const int32 room = fMaxBytes - (TextLength() - (_End() - _Start()));
+	if (text.empty() || static_cast<int32>(text.size()) > room) {
+		beep();
+		return;
+	}
+	const int32 from = _Start();
+	const int32 to = _End();
+	_SetSelection(to, to);
+	_Edit(B_UNDO_TYPING, from, to, text.data(), static_cast<int32>(text.size()), NULL);
+	ScrollToOffset(fCaret);
+}
+
+
+// A view that shows its text only.
+bool
+BTextView::_ScrollByKey(char key)
+{
+	BScrollBar* bar =
+		ScrollBar(key == B_LEFT_ARROW || key == B_RIGHT_ARROW ? B_HORIZONTAL : B_VERTICAL);
+	if (bar == NULL)
+		return false;
+	float minimum, maximum, small, large;
+	bar->GetRange(&minimum, &maximum);
+	bar->GetSteps(&small, &large);
+	switch (key) {
+		case B_LEFT_ARROW:
+		case B_UP_ARROW:
+			bar->SetValue(bar->Value() - small);
+			return true;
+
+		case B_RIGHT_ARROW:
+		case B_DOWN_ARROW:
+			bar->SetValue(bar->Value() + small);
+			return true;
+
+		case B_PAGE_UP:
+			bar->SetValue(bar->Value() - large);
+			return true;
+
+		case B_PAGE_DOWN:
+			bar->SetValue(bar->Value() + large);
+			return true;
+
+		case B_HOME:
+			bar->SetValue(minimum);
+			return true;
+
+		case B_END:
+			bar->SetValue(maximum);
+			return true;
+
+		default:
+			return false;
+	}
+}
+
+
+bool
+BTextView::_IsAllowed(uint32 character) const
+{
+	return std::find(fDisallowed.begin(), fDisallowed.end(), character) == fDisallowed.end();
+}
+
+
+// Without the characters that are not allowed; ends at a zero.
+std::string
+BTextView::_Allowed(const char* text, int32 length) const
+{
+	std::string result;
+	for (int32 offset = 0; offset < length && text[offset] != '\0';) {
+		const int32 count = character_length(text + offset, length - offset);
+		if (_IsAllowed(decode_character(text + offset, count)))
+			result.append(text + offset, count);
+		offset += count;
+	}
+	return result;
+}
+
+
+// #pragma mark - input methods
+
+
+// What is composed stands in the text while it is, and in the history once it is confirmed.
+void
+BTextView::_HandleInputMethod(BMessage* message)
+{
+	int32 code;
+	if (message->FindInt32("be:opcode", &code) != B_OK || !fEditable)
+		return;
+	switch (code) {
+		case kMethodStarted: {
+			_EndComposition(true);
+			fComposition = std::make_unique<Composition>();
+			message->FindMessenger("be:reply_to", &fComposition->method);
+			if (_Start() != _End())
+				_Edit(B_UNDO_TYPING, _Start(), _End(), NULL, 0, NULL);
+			fComposition->offset = _Start();
+			break;
+		}
+
+		case kMethodStopped:
+			_EndComposition(false);
+			break;
+
+		case kMethodChanged:
+			_Compose(message);
+			break;
+
+		case kMethodLocationRequest:
+			_SendCompositionPlaces();
+			break;
+	}
+}
+
+
+void
+BTextView::_Compose(BMessage* message)
+{
+	if (fComposition == nullptr)
+		return;
+	const char* string;
+	if (message->FindString("be:string", &string) != B_OK)
+		string = "";
+	const std::string text = _Allowed(string, static_cast<int32>(strlen(string)));
+	bool confirmed;
+	if (message->FindBool("be:confirmed", &confirmed) != B_OK)
+		confirmed = false;
+
+	_RemoveComposed();
+	const int32 offset = fComposition->offset;
+	if (confirmed) {
+		_Edit(B_UNDO_TYPING, offset, offset, text.data(), static_cast<int32>(text.size()), NULL);
+		fComposition->offset = _Start();
+	} else if (!text.empty()) {
+		fComposition->length =
+			_InsertLimited(offset, text.data(), static_cast<int32>(text.size()), NULL);
+		int32 from = fComposition->length;
+		int32 to = from;
+		if (message->FindInt32("be:selection", 0, &from) != B_OK
+			|| message->FindInt32("be:selection", 1, &to) != B_OK)
+			from = to = fComposition->length;
+		_SetSelection(_Clamp(offset + std::clamp<int32>(from, 0, fComposition->length)),
+			_Clamp(offset + std::clamp<int32>(to, 0, fComposition->length)));
+	}
+	ScrollToOffset(fCaret);
+}
+
+
+void
+BTextView::_RemoveComposed()
+{
+	const int32 from = std::min(fComposition->offset, TextLength());
+	const int32 to = std::min(from + fComposition->length, TextLength());
+	fComposition->length = 0;
+	if (from < to)
+		DeleteText(from, to);
+	_SetSelection(from, from);
+}
+
+
+// Somebody else wants to edit, or the method is done: what is not confirmed goes, or is taken as if
+// it had been typed.
+void
+BTextView::_EndComposition(bool keepText)
+{
+	if (fComposition == nullptr)
+		return;
+	const std::unique_ptr<Composition> composition = std::move(fComposition);
+	const int32 from = std::min(composition->offset, TextLength());
+	const int32 to = std::min(from + composition->length, TextLength());
+	if (from == to)
+		return;
+	const std::string text = fModel->Buffer().String(from, to - from);
+	DeleteText(from, to);
+	_SetSelection(from, from);
+	if (keepText)
+		_Edit(B_UNDO_TYPING, from, from, text.data(), static_cast<int32>(text.size()), NULL);
+}
+
+
+// Where the characters are on the screen, for the method's own windows.
+void
+BTextView::_SendCompositionPlaces()
+{
+	if (fComposition == nullptr || Window() == NULL)
+		return;
+	BMessage places(B_INPUT_METHOD_EVENT);
+	places.AddInt32("be:opcode", kMethodLocationRequest);
+	const int32 end = fComposition->offset + fComposition->length;
+	for (int32 at = fComposition->offset; at <= end; at = fModel->NextCharacter(at)) {
+		float height;
+		const BPoint point = PointAt(at, &height);
+		places.AddPoint("be:location_reply", ConvertToScreen(point));
+		places.AddFloat("be:height_reply", height);
+		if (at == end)
+			break;
+	}
+	fComposition->method.SendMessage(&places);
+}
+
+
+void
+BTextView::_DrawComposition(BRect)
+{
+	if (fComposition == nullptr || fComposition->length == 0)
+		return;
+	const int32 from = fComposition->offset;
+	const int32 to = from + fComposition->length;
+	for (int32 line = LineAt(from); line <= LineAt(to); line++) {
+		const int32 start = std::max(from, fLayout->LineStart(line));
+		const int32 end = std::min(to, fLayout->VisibleEnd(line));
+		const float y = fTextRect.top + fLayout->Top(line) + fLayout->Ascent(line) + 1;
+		const float left = _LineLeft(line);
+		StrokeLine(
+			BPoint(left + fLayout->XAt(line, start), y), BPoint(left + fLayout->XAt(line, end), y));
+	}
+}
