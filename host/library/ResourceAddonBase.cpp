@@ -15,8 +15,7 @@ BResourceAddonBase::BResourceAddonBase(const BResourceAddonArgs& args, BHandler*
 
 BResourceAddonBase::~BResourceAddonBase()
 {
-	if (fCollection != nullptr)
-		fCollection->_Unregister(this);
+	Disconnect();
 }
 
 
@@ -56,6 +55,15 @@ BResourceAddonBase::WriteUnlock(BResourceCollection* collection)
 {
 	if (collection != nullptr)
 		collection->UnlockForWriting();
+}
+
+
+void
+BResourceAddonBase::Disconnect()
+{
+	if (fCollection != nullptr)
+		fCollection->_Unregister(this);
+	fCollection = nullptr;
 }
 
 

@@ -34,6 +34,10 @@ public:
 	BResourceCollection* WriteLock(const char* operation);
 	void WriteUnlock(BResourceCollection* collection);
 
+	// Parts this object from the collection: from now on its locks give NULL. For the host, which
+	// takes an editor away from an item that it must not write any more.
+	void Disconnect();
+
 	BResourceHandle& PrimaryItem();
 	const BResourceHandle& PrimaryItem() const;
 	void SetPrimaryItem(const BResourceHandle& handle);

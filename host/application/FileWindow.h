@@ -1,0 +1,86 @@
+// FileWindow: lists the items of one resource file and opens them.
+#pragma once
+
+#include <functional>
+#include <memory>
+#include <string>
+#include <vector>
+
+#include <Messenger.h>
+#include <Window.h>
+
+#include "host/library/ResourceAddonBase.h"
+
+class BListView;
+class BMenu;
+class BMenuBar;
+class BMenuItem;
+class HandlerSet;
+class ItemRow;
+class ItemWindow;
+class ResourceDocument;
+
+
+// Owns the document and the windows of its items. Tells the application when it goes.
+class FileWindow : public BWindow {
+public:
+	FileWindow(BRect frame, std::unique_ptr<ResourceDocument> document);
+	~FileWindow() override;
+
+	void MessageReceived(BMessage* message) override;
+	void MenusBeginning() override;
+	bool QuitRequested() override;
+	void Quit() override;
+
+	// The path of the document's file, or "". Any thread, under this window's lock.
+	const char* Path() const;
+
+	// Opens the item in a window of its own, or brings that forward. False when there is none.
+	bool OpenItem(type_code type, int32 id);
+	bool OpenFirstArchive();
+
+private:
+	struct OpenWindow {
+		ItemWindow* window; // ours until it sends kItemClosed
+		BMessenger messenger;
+		BResEditor::BResourceHandle handle;
+	};
+
+	void _AddMenuBar();
+	void _AddList(float top);
+	void _AddNewMenu(BMenu* menu);
+	void _OpenHandle(const BResEditor::BResourceHandle& handle);
+	void _OpenSelection();
+	void _DeleteSelection();
+	void _Generate(BMessage* request);
+	void _ReadChanges();
+	void _TakeChange(const BResEditor::BResourceCollection* collection,
+		const BResEditor::BResourceHandle& handle, uint32 changes);
+	ItemRow* _RowFor(const BResEditor::BResourceHandle& handle) const;
+	void _UpdateTitle();
+
+	void _ApplyItemsThen(std::function<void()> next);
+	void _ItemAnswered();
+	void _ItemClosed(const BMessage* message);
+	void _Save();
+	void _SaveAs(const std::string& path);
+	void _AskForPath();
+	bool _MayReplaceFile();
+	void _AskAndClose();
+	void _CloseItems();
+	void _Tell(const std::string& text);
+
+	std::unique_ptr<ResourceDocument> fDocument;
+	BResEditor::BResourceAddonArgs fArgs;
+	BResEditor::BResourceAddonBase fAccess; // our use of the document
+	std::unique_ptr<HandlerSet> fHandlers;
+	BMenuBar* fMenuBar; // child
+	BListView* fList; // child of a scroll view; its rows are ours
+	BMenuItem* fUndoItem; // child of the menu bar
+	BMenuItem* fRedoItem;
+	std::vector<OpenWindow> fItemWindows;
+	std::function<void()> fAfterApply; // what waits for the item windows' answers
+	size_t fAnswersMissing;
+	bool fClosing; // the item windows are closing, and this one with the last of them
+	bool fSaveBeforeClosing;
+};

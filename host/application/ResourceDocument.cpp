@@ -1,0 +1,347 @@
+#include "host/application/ResourceDocument.h"
+
+#include <cstring>
+
+#include <sys/stat.h>
+
+#include <File.h>
+#include <Resources.h>
+
+using namespace BResEditor;
+
+
+class ResourceDocument::ReadAccess {
+public:
+	explicit ReadAccess(const ResourceDocument* document) : fDocument(document)
+	{
+		fDocument->LockForReading();
+	}
+	~ReadAccess() { fDocument->UnlockForReading(); }
+
+private:
+	const ResourceDocument* fDocument; // borrowed
+};
+
+
+class ResourceDocument::WriteAccess {
+public:
+	WriteAccess(ResourceDocument* document, const char* operation) : fDocument(document)
+	{
+		fDocument->LockForWriting(operation);
+	}
+	~WriteAccess() { fDocument->UnlockForWriting(); }
+
+private:
+	ResourceDocument* fDocument; // borrowed
+};
+
+
+ResourceDocument::ResourceDocument() : fReplaying(false)
+{
+}
+
+
+ResourceDocument::~ResourceDocument()
+{
+}
+
+
+status_t
+ResourceDocument::Load(const char* path)
+{
+	BFile file(path, B_READ_ONLY);
+	status_t status = file.InitCheck();
+	if (status != B_OK)
+		return status;
+	BResources resources;
+	status = resources.SetTo(&file);
+	if (status != B_OK)
+		return status;
+
+	const FileStamp stamp = _StampOf(path);
+	WriteAccess access(this, NULL);
+	fReplaying = true; // loading is no undo step
+	while (CountItems() > 0)
+		RemoveItem(HandleAt(CountItems() - 1));
+
+	type_code type;
+	int32 id;
+	const char* name;
+	size_t size;
+	for (int32 i = 0; resources.GetResourceInfo(i, &type, &id, &name, &size); i++) {
+		const void* data = resources.LoadResource(type, id, &size);
+		if (data == nullptr && size > 0) {
+			status = B_IO_ERROR;
+			continue;
+		}
+		AddItem(NULL, type, id, name, data, size);
+	}
+	fReplaying = false;
+
+	fUndoSteps.clear();
+	fRedoSteps.clear();
+	fPath = path;
+	fSaved = _PresentItems();
+	fStamp = stamp;
+	return status;
+}
+
+
+status_t
+ResourceDocument::Save()
+{
+	if (fPath.empty())
+		return B_NO_INIT;
+
+	ReadAccess access(this);
+	const SavedItems present = _PresentItems();
+	const status_t status = _WriteDifferences(fPath.c_str(), present);
+	if (status == B_OK) {
+		fSaved = present;
+		fStamp = _StampOf(fPath.c_str());
+	}
+	return status;
+}
+
+
+status_t
+ResourceDocument::SaveAs(const char* path)
+{
+	if (fPath == path)
+		return Save();
+
+	ReadAccess access(this);
+	BFile file(path, B_READ_WRITE | B_CREATE_FILE);
+	status_t status = file.InitCheck();
+	if (status != B_OK)
+		return status;
+
+	BResources resources;
+	status = resources.SetTo(&file, true);
+	for (int32 i = 0; status == B_OK && i < CountItems(); i++) {
+		const BResourceItem* item = Item(HandleAt(i));
+		status = resources.AddResource(
+			item->Type(), item->ID(), item->Data(), item->Size(), item->Name());
+	}
+	if (status == B_OK)
+		status = resources.Sync();
+	if (status != B_OK)
+		return status;
+
+	fPath = path;
+	fSaved = _PresentItems();
+	fStamp = _StampOf(path);
+	return B_OK;
+}
+
+
+const char*
+ResourceDocument::Path() const
+{
+	return fPath.c_str();
+}
+
+
+const char*
+ResourceDocument::Name() const
+{
+	if (fPath.empty())
+		return "Untitled";
+	const size_t slash = fPath.rfind('/');
+	return fPath.c_str() + (slash == std::string::npos ? 0 : slash + 1);
+}
+
+
+bool
+ResourceDocument::IsModified() const
+{
+	ReadAccess access(this);
+	if (static_cast<size_t>(CountItems()) != fSaved.size())
+		return true;
+
+	for (int32 i = 0; i < CountItems(); i++) {
+		const BResourceItem* item = Item(HandleAt(i));
+		auto saved = fSaved.find({ item->Type(), item->ID() });
+		if (saved == fSaved.end() || saved->second.name != item->Name()
+			|| saved->second.data.size() != item->Size()
+			|| (item->Size() > 0
+				&& memcmp(saved->second.data.data(), item->Data(), item->Size()) != 0))
+			return true;
+	}
+	return false;
+}
+
+
+bool
+ResourceDocument::IsChangedOnDisk() const
+{
+	return !fPath.empty() && _StampOf(fPath.c_str()) != fStamp;
+}
+
+
+const char*
+ResourceDocument::UndoName() const
+{
+	return fUndoSteps.empty() ? nullptr : fUndoSteps.back().name.String();
+}
+
+
+const char*
+ResourceDocument::RedoName() const
+{
+	return fRedoSteps.empty() ? nullptr : fRedoSteps.back().name.String();
+}
+
+
+bool
+ResourceDocument::Undo()
+{
+	return _Replay(fUndoSteps, fRedoSteps, true);
+}
+
+
+bool
+ResourceDocument::Redo()
+{
+	return _Replay(fRedoSteps, fUndoSteps, false);
+}
+
+
+// #pragma mark - undo steps
+
+
+void
+ResourceDocument::StepBegins(const char* operation)
+{
+	fOpenStep.name = operation != nullptr ? operation : "Edit";
+	fOpenStep.changes.clear();
+}
+
+
+// Keeps the state from before the step's first change of each item.
+void
+ResourceDocument::ItemChanges(const BResourceItem* item, uint32 change)
+{
+	if (fReplaying)
+		return;
+
+	for (const Change& known : fOpenStep.changes) {
+		if (known.handle == item->Handle())
+			return;
+	}
+
+	Change entry;
+	entry.handle = item->Handle();
+	entry.index = IndexOf(entry.handle);
+	if (change != B_ITEM_CREATED)
+		entry.before = std::make_shared<const BResourceItem>(*item);
+	fOpenStep.changes.push_back(std::move(entry));
+}
+
+
+void
+ResourceDocument::StepEnds()
+{
+	if (fReplaying || fOpenStep.changes.empty())
+		return;
+
+	for (Change& change : fOpenStep.changes) {
+		if (const BResourceItem* item = Item(change.handle))
+			change.after = std::make_shared<const BResourceItem>(*item);
+	}
+	fUndoSteps.push_back(std::move(fOpenStep));
+	fOpenStep = Step();
+	fRedoSteps.clear();
+}
+
+
+bool
+ResourceDocument::_Replay(std::vector<Step>& from, std::vector<Step>& to, bool undo)
+{
+	WriteAccess access(this, NULL);
+	if (from.empty())
+		return false;
+
+	fReplaying = true;
+	Step step = std::move(from.back());
+	from.pop_back();
+	if (undo) {
+		for (auto change = step.changes.rbegin(); change != step.changes.rend(); ++change)
+			_ReplayChange(*change, true);
+	} else {
+		for (const Change& change : step.changes)
+			_ReplayChange(change, false);
+	}
+	to.push_back(std::move(step));
+	fReplaying = false;
+	return true;
+}
+
+
+void
+ResourceDocument::_ReplayChange(const Change& change, bool undo)
+{
+	const BResourceItem* state = undo ? change.before.get() : change.after.get();
+	if (state != nullptr)
+		RestoreItem(*state, change.index);
+	else
+		RemoveItem(change.handle);
+}
+
+
+// #pragma mark - the file
+
+
+ResourceDocument::FileStamp
+ResourceDocument::_StampOf(const char* path)
+{
+	struct stat info;
+	if (stat(path, &info) != 0)
+		return FileStamp();
+	return { info.st_mtim.tv_sec, info.st_mtim.tv_nsec, info.st_size };
+}
+
+
+ResourceDocument::SavedItems
+ResourceDocument::_PresentItems() const
+{
+	SavedItems items;
+	for (int32 i = 0; i < CountItems(); i++) {
+		const BResourceItem* item = Item(HandleAt(i));
+		const uint8* bytes = static_cast<const uint8*>(item->Data());
+		items[{ item->Type(), item->ID() }] = { item->Name(),
+			std::vector<uint8>(bytes, bytes + item->Size()) };
+	}
+	return items;
+}
+
+
+// Only what differs is touched, so that everything else in the file stays as it is.
+status_t
+ResourceDocument::_WriteDifferences(const char* path, const SavedItems& present)
+{
+	BFile file(path, B_READ_WRITE);
+	status_t status = file.InitCheck();
+	if (status != B_OK)
+		return status;
+	BResources resources;
+	status = resources.SetTo(&file);
+	if (status != B_OK)
+		return status;
+
+	for (const auto& [key, saved] : fSaved) {
+		if (present.find(key) == present.end())
+			resources.RemoveResource(key.first, key.second);
+	}
+	for (const auto& [key, item] : present) {
+		auto saved = fSaved.find(key);
+		if (saved != fSaved.end() && saved->second.name == item.name
+			&& saved->second.data == item.data)
+			continue;
+		status = resources.AddResource(
+			key.first, key.second, item.data.data(), item.data.size(), item.name.String());
+		if (status != B_OK)
+			return status;
+	}
+	return resources.Sync();
+}
