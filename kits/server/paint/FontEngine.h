@@ -51,37 +51,38 @@ public:
 	const char* StyleAt(
 		const char* family, int32 index, uint16* _face = nullptr, uint32* _flags = nullptr) const;
 
-	// 0 when there is no such family or style; no style means the regular or else the first one.
-	uint32 FindCode(const char* family, const char* style) const;
-	uint32 FindCode(const char* family, uint16 face) const;
+	// B_NAME_NOT_FOUND when there is no such family or style. No style, NULL or empty, means the
+	// regular or else the first one; a face means the style closest to it.
+	status_t FindCode(const char* family, const char* style, uint32* _code) const;
+	status_t FindCode(const char* family, uint16 face, uint32* _code) const;
 	const char* FamilyOf(uint32 code) const;
 	const char* StyleOf(uint32 code) const;
 	uint16 FaceOf(uint32 code) const;
 	bool IsFixed(uint32 code) const;
-	uint32 PlainCode() const;
-	uint32 BoldCode() const;
-	uint32 FixedCode() const;
+	static constexpr uint32 kPlainCode = 0;
+	static constexpr uint32 kBoldCode = 1;
+	static constexpr uint32 kFixedCode = 2;
 
 	void GetHeight(const FontSpec& spec, font_height* _height) const;
 	BRect BoundingBox(uint32 code) const; // ems
-	unicode_block Blocks(uint32 code) const;
+	// Whether the face itself has the character; others stand in for what it lacks.
+	bool Covers(uint32 code, uint32 character) const;
 
 	// Widths are remembered per font and text; the memory for that is bounded.
 	float StringWidth(const FontSpec& spec, std::string_view text);
 	std::shared_ptr<const GlyphRun> Run(const FontSpec& spec, std::string_view text);
 
-	// Of one character, in ems; the box and the outline in pixels, y downwards.
+	// Of one character, in ems, upright; y grows downwards.
 	float Escapement(const FontSpec& spec, uint32 character);
-	bool HasGlyph(const FontSpec& spec, uint32 character);
-	BRect GlyphBox(const FontSpec& spec, uint32 character);
 	PathData Outline(const FontSpec& spec, uint32 character);
+	PathData Outline(const PlacedGlyph& glyph);
 
 	// deviceSize in device pixels per em; phase is the pen's place between two pixels in
-	// quarters, 0 to 3. NULL for a glyph without ink.
+	// quarters, 0 to 3. *_image is NULL for a glyph without ink. False means that the glyph is
+	// too large to be kept as an image: draw its outline.
 	static constexpr int32 kPhases = 4;
-	const GlyphImage* Image(
-		const PlacedGlyph& glyph, const FontSpec& spec, float deviceSize, int32 phase);
-	PathData Outline(const PlacedGlyph& glyph, const FontSpec& spec);
+	bool GetImage(const PlacedGlyph& glyph, float deviceSize, int32 phase, bool smooth,
+		const GlyphImage** _image);
 
 private:
 	FontEngine();
