@@ -50,7 +50,7 @@ FaceBits(FcPattern* pattern)
 		face |= B_ITALIC_FACE;
 	if (NumberOf(pattern, FC_WIDTH, FC_WIDTH_NORMAL) < FC_WIDTH_NORMAL)
 		face |= B_CONDENSED_FACE;
-	return face == 0 ? B_REGULAR_FACE : face;
+	return face == 0 ? (uint16)B_REGULAR_FACE : face;
 }
 
 
