@@ -109,7 +109,7 @@ ViewEditor::UpdateValue(const char* reason)
 	if (BResourceItem* item = collection->WriteItem(PrimaryItem())) {
 		std::vector<char> bytes(static_cast<size_t>(archive.FlattenedSize()));
 		if (archive.Flatten(bytes.data(), static_cast<ssize_t>(bytes.size())) == B_OK)
-			item->SetData(bytes.data(), bytes.size());
+			fWroteItem = item->SetData(bytes.data(), bytes.size()) == B_OK;
 	}
 	WriteUnlock(collection);
 }
@@ -136,10 +136,9 @@ ViewEditor::ExecDataChanged(
 	fLastArchive = archive;
 	SwapInheritedViews(&archive, 0);
 	BArchivable* object = instantiate_object(&archive);
-	if (BView* view = dynamic_cast<BView*>(object)) {
-		fWorkView->SetEditView(view);
-		FocusOnView(view);
-	} else
+	if (BView* view = dynamic_cast<BView*>(object))
+		_ReplaceTree(view);
+	else
 		delete object;
 }
 
@@ -293,6 +292,19 @@ ViewEditor::_LoadItem()
 		ExecDataChanged(collection, PrimaryItem(), kAllChanges);
 		ReadUnlock(collection);
 	}
+}
+
+
+// When the new tree is what this editor wrote itself, the user notices nothing.
+void
+ViewEditor::_ReplaceTree(BView* view)
+{
+	const WorkView::Place place = fWorkView->PresentPlace();
+	fWorkView->SetEditView(view);
+	if (fWroteItem)
+		fWorkView->ReturnTo(place);
+	fWroteItem = false;
+	FocusOnView(fWorkView->SelectedView());
 }
 
 

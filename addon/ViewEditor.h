@@ -46,6 +46,7 @@ private:
 	void _GrowWindowTo(BPoint corner);
 	void _LoadItem();
 	void _ReadChanges();
+	void _ReplaceTree(BView* view);
 	void _SelectionChanged(const BMessage* message);
 	void _SelectionMoved();
 	bool _ArchiveTree(BMessage* _archive);
@@ -56,4 +57,5 @@ private:
 	EditorInterface* fPanels[kMaxPanels]; // ours while not children; NULL after the last
 	int32 fPanelCount; // with the view panel and without the NULL, which makes it both
 	EditView* fViewPanel; // child of the column
+	bool fWroteItem; // what is read next is what was written last
 };

@@ -278,6 +278,36 @@ LiveViewAttached(const BView* root, BView* view)
 }
 
 
+std::vector<int32>
+PathTo(const BView* root, const BView* view)
+{
+	std::vector<int32> path;
+	for (; view != nullptr && view != root; view = view->Parent()) {
+		int32 index = 0;
+		for (BView* before = view->PreviousSibling(); before != nullptr;
+			 before = before->PreviousSibling())
+			index++;
+		path.push_back(index);
+	}
+	std::reverse(path.begin(), path.end());
+	return path;
+}
+
+
+BView*
+ViewAtPath(BView* root, const std::vector<int32>& path)
+{
+	BView* view = root;
+	for (int32 index : path) {
+		BView* child = view->ChildAt(index);
+		if (child == nullptr)
+			break;
+		view = child;
+	}
+	return view;
+}
+
+
 void
 SetTarget(BView* view, BMessenger target)
 {

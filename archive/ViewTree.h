@@ -1,6 +1,8 @@
 // Helpers that walk a tree of views: depth first, a view before its children, children in order.
 #pragma once
 
+#include <vector>
+
 #include <Message.h>
 #include <MessageFilter.h>
 #include <Messenger.h>
@@ -44,6 +46,11 @@ BView* ViewAttached(BView* root, BView* view);
 
 // The same for a view that is known to exist, in time that grows with its depth only.
 BView* LiveViewAttached(const BView* root, BView* view);
+
+// The indices of the children on the way from the root to a view in its tree, and the way back. A
+// path that the tree does not have ends where it leaves it.
+std::vector<int32> PathTo(const BView* root, const BView* view);
+BView* ViewAtPath(BView* root, const std::vector<int32>& path);
 
 // Aims every control and every menu item of a tree.
 void SetTarget(BView* view, BMessenger target);

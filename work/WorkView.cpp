@@ -192,6 +192,24 @@ WorkView::Container() const
 }
 
 
+WorkView::Place
+WorkView::PresentPlace() const
+{
+	return { PathTo(fEditView, SelectedView()), Target()->Bounds().LeftTop() };
+}
+
+
+void
+WorkView::ReturnTo(const Place& place)
+{
+	if (fEditView == nullptr)
+		return;
+
+	SetSelectedView(ViewAtPath(fEditView, place.selection));
+	Target()->ScrollTo(place.scrolled);
+}
+
+
 void
 WorkView::PostHiliteRedraw()
 {

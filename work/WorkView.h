@@ -1,6 +1,8 @@
 // WorkView: the design surface, where the edited views are shown, selected, moved and resized.
 #pragma once
 
+#include <vector>
+
 #include <ScrollView.h>
 
 #include "archive/ViewWatch.h"
@@ -35,6 +37,15 @@ public:
 	BView* SelectedView() const; // NULL for none, also when the view is gone
 
 	WorkBackgroundView* Container() const;
+
+	// What the user looks at, in a form that outlives the tree: for a tree that is replaced by one
+	// of the same make.
+	struct Place {
+		std::vector<int32> selection; // PathTo() the selected view
+		BPoint scrolled;
+	};
+	Place PresentPlace() const;
+	void ReturnTo(const Place& place);
 
 	// Has the highlight drawn after the updates that are pending.
 	void PostHiliteRedraw();

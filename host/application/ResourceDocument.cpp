@@ -5,6 +5,8 @@
 #include <sys/stat.h>
 
 #include <File.h>
+#include <Message.h>
+#include <MessageForm.h>
 #include <Resources.h>
 
 using namespace BResEditor;
@@ -252,6 +254,26 @@ ResourceDocument::StepEnds()
 	fUndoSteps.push_back(std::move(fOpenStep));
 	fOpenStep = Step();
 	fRedoSteps.clear();
+}
+
+
+void
+ResourceDocument::PrepareData(const BResourceItem* item, std::vector<uint8>& data) const
+{
+	message_form_info former, given;
+	if (get_message_form(item->Data(), item->Size(), &former) != B_OK
+		|| get_message_form(data.data(), data.size(), &given) != B_OK || former.form == given.form)
+		return;
+
+	BMessage message;
+	if (unflatten_message(&message, data.data(), data.size()) != B_OK)
+		return;
+	const ssize_t size = flattened_message_size(message, former.form);
+	if (size <= 0)
+		return;
+	std::vector<uint8> converted(static_cast<size_t>(size));
+	if (flatten_message(message, former.form, converted.data(), size) == B_OK)
+		data = std::move(converted);
 }
 
 

@@ -48,6 +48,11 @@ protected:
 	void ItemChanges(const BResEditor::BResourceItem* item, uint32 change) override;
 	void StepEnds() override;
 
+	// A message keeps the flattened form that the item has, so that a small edit stays a small
+	// change of the file.
+	void PrepareData(
+		const BResEditor::BResourceItem* item, std::vector<uint8>& data) const override;
+
 private:
 	struct Change {
 		std::shared_ptr<const BResEditor::BResourceItem> before; // NULL for a new item

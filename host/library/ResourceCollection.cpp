@@ -245,6 +245,12 @@ BResourceCollection::StepEnds()
 }
 
 
+void
+BResourceCollection::PrepareData(const BResourceItem* item, std::vector<uint8>& data) const
+{
+}
+
+
 bool
 BResourceCollection::LockForReading() const
 {

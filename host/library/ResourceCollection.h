@@ -2,6 +2,7 @@
 #pragma once
 
 #include <memory>
+#include <vector>
 
 #include <BeBuild.h>
 #include <SupportDefs.h>
@@ -75,6 +76,10 @@ protected:
 	virtual void StepBegins(const char* operation);
 	virtual void ItemChanges(const BResourceItem* item, uint32 change);
 	virtual void StepEnds();
+
+	// May rewrite data that an item is about to get, into bytes of the same meaning. The item still
+	// has its former data.
+	virtual void PrepareData(const BResourceItem* item, std::vector<uint8>& data) const;
 
 	// The access behind the locks of BResourceAddonBase.
 	bool LockForReading() const;

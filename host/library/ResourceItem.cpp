@@ -1,7 +1,5 @@
 #include "host/library/ResourceItem.h"
 
-#include <cstring>
-
 #include "host/library/ResourceCollection.h"
 
 namespace BResEditor {
@@ -92,13 +90,15 @@ BResourceItem::SetData(const void* data, size_t size)
 {
 	if (data == nullptr && size > 0)
 		return B_BAD_VALUE;
-	if (size == Size() && (size == 0 || memcmp(data, Data(), size) == 0))
-		return B_OK;
 
 	const uint8* bytes = static_cast<const uint8*>(data);
-	auto copy = std::make_shared<const std::vector<uint8>>(bytes, bytes + size);
+	std::vector<uint8> copy(bytes, bytes + size);
+	fCollection->PrepareData(this, copy);
+	if (copy == *fData)
+		return B_OK;
+
 	fCollection->_WillChange(this, B_ITEM_DATA_CHANGED);
-	fData = std::move(copy);
+	fData = std::make_shared<const std::vector<uint8>>(std::move(copy));
 	return B_OK;
 }
 
