@@ -87,10 +87,7 @@ DesktopThread::Start()
 void
 DesktopThread::Stop()
 {
-	if (fPlay != nullptr) {
-		fPlay->Stop();
-		fPlay.reset();
-	}
+	fPlay.reset();
 	if (!fThread.joinable())
 		return;
 

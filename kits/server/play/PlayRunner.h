@@ -1,36 +1,43 @@
 // PlayRunner: plays a script on a thread of its own.
 #pragma once
 
-#include <atomic>
 #include <condition_variable>
 #include <mutex>
 #include <string>
 #include <thread>
 
+#include <SupportDefs.h>
+
 namespace BPrivate {
 
 class DesktopThread;
+class Player;
 
 
-// Any thread may call.
+// Started and stopped by the thread that starts and stops the display. A command that fails ends
+// the process at once, with status 4.
 class PlayRunner {
 public:
 	PlayRunner(DesktopThread& desktop, const char* path);
 	~PlayRunner();
 
 	void Start();
-	// The program is about to end. A script that is not at its end has failed: the process ends
-	// with the status that says so.
+	// The program is about to end. If the script is not at its end it has failed.
 	void ProgramEnds();
-	void Stop();
 
 private:
 	void _Run();
+	void _Play();
+	void _PlayLine(Player& player, const std::string& line);
+	void _AwaitEnd(Player& player);
+	bool _IsEnding();
+	[[noreturn]] void _Fail(const std::string& expected, const std::string& found);
 
 	DesktopThread& fDesktop;
 	std::string fPath;
 	std::thread fThread;
-	std::atomic<int> fLine { 0 }; // of the command under way; 0 before the first, -1 at the end
+	int32 fLine = 0; // of the command under way; the player's thread, or under the lock
+
 	std::mutex fLock;
 	std::condition_variable fChanged;
 	bool fEnding = false;
