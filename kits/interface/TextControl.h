@@ -1,13 +1,12 @@
 // BTextControl: a labelled one-line text field.
 #pragma once
 
+#include <string>
+
 #include <Control.h>
 
 class BTextView;
-
-namespace BPrivate {
-class TextInput;
-}
+class _BTextInput_;
 
 
 // The text lives in a child of its own, a BTextView named "_input_". Invoked by Enter, and by
@@ -71,21 +70,24 @@ public:
 	virtual status_t Perform(perform_code code, void* data);
 
 private:
-	friend class BPrivate::TextInput;
+	friend class _BTextInput_;
 
-	void _Init(const char* text, uint32 flags);
-	void _CreateInput(BRect frame, uint32 flags, const char* text);
+	void _Init();
+	void _CreateInput(uint32 flags);
+	BRect _InputFrame() const;
 	void _LayOutInput();
-	void _UpdateInputColors();
-	void _SendModification();
+	void _RaiseHeight();
+	void _ShowEnabled();
 	void _CommitText();
-	float _FieldHeight() const;
+	void _SendModification();
+	float _LabelWidth() const;
+	float _MinimalHeight() const;
+	void _InputFocusChanged();
 
-	BPrivate::TextInput* fInput; // child
+	BTextView* fText; // child; NULL only if an archive has something else of its name
 	BMessage* fModificationMessage; // owned
+	std::string fCommittedText; // as of SetText(), the last invocation or the coming of the focus
 	alignment fLabelAlignment;
 	float fDivider;
-	float fOldWidth;
-	bool fSkipModification;
-	bool fRevived; // attaching leaves frame and colours as archived
+	bool fInputWasNavigable; // before it was disabled
 };

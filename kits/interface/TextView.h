@@ -12,11 +12,11 @@ class BBitmap;
 class BClipboard;
 class BFile;
 class BRegion;
+class _BTextInput_;
 
 namespace BPrivate {
 class ArchiveWriter;
 class TextHistory;
-class TextInput;
 class TextLayout;
 class TextModel;
 struct TextRun;
@@ -212,7 +212,7 @@ protected:
 		BMessage* drag, BBitmap** _bitmap, BPoint* _point, BHandler** _handler);
 
 private:
-	friend class BPrivate::TextInput;
+	friend class _BTextInput_;
 	struct Composition;
 	struct Tracking;
 
