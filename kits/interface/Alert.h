@@ -16,7 +16,7 @@ enum button_spacing { B_EVEN_SPACING = 0, B_OFFSET_SPACING };
 
 
 // The rightmost button is the default button. Go() deletes the alert.
-class BAlert : public BWindow {
+class _EXPORT BAlert : public BWindow {
 public:
 	BAlert(const char* title, const char* text, const char* button0, const char* button1 = NULL,
 		const char* button2 = NULL, button_width width = B_WIDTH_AS_USUAL,

@@ -8,7 +8,7 @@
 
 // A label view is a child of the box, always the first. Neither border nor label moves the other
 // children; InnerFrame() tells the room that is left for them.
-class BBox : public BView {
+class _EXPORT BBox : public BView {
 public:
 	BBox(BRect frame, const char* name = NULL, uint32 resizingMode = B_FOLLOW_LEFT | B_FOLLOW_TOP,
 		uint32 flags = B_WILL_DRAW | B_FRAME_EVENTS | B_NAVIGABLE_JUMP,

@@ -6,7 +6,7 @@
 
 // Its value is 1 while it is held down. It invokes when the mouse is released inside, or by Enter
 // or Space; the default button of a window answers Enter wherever the focus is.
-class BButton : public BControl {
+class _EXPORT BButton : public BControl {
 public:
 	BButton(BRect frame, const char* name, const char* label, BMessage* message,
 		uint32 resizingMode = B_FOLLOW_LEFT | B_FOLLOW_TOP,

@@ -6,7 +6,7 @@
 
 // The value changes when the mouse is released inside, or by Space or Enter, and the control
 // invokes. B_CONTROL_PARTIALLY_ON is shown too, and clicking it switches on.
-class BCheckBox : public BControl {
+class _EXPORT BCheckBox : public BControl {
 public:
 	BCheckBox(BRect frame, const char* name, const char* label, BMessage* message,
 		uint32 resizingMode = B_FOLLOW_LEFT | B_FOLLOW_TOP,

@@ -18,7 +18,7 @@ enum color_control_layout {
 // The value is the colour, red << 24 | green << 16 | blue << 8. The size follows from layout and
 // cell size. It invokes at every change by the user. The three text controls are its children
 // "_red", "_green" and "_blue".
-class BColorControl : public BControl {
+class _EXPORT BColorControl : public BControl {
 public:
 	BColorControl(BPoint leftTop, color_control_layout layout, float cellSize, const char* name,
 		BMessage* message = NULL, bool useOffscreen = false);

@@ -16,7 +16,7 @@ enum { B_CONTROL_OFF = 0, B_CONTROL_ON = 1, B_CONTROL_PARTIALLY_ON = 2 };
 // The base of everything that a user operates. Setters redraw what they change; like all of a
 // view they need the window's lock when attached. The message given to the constructor is
 // owned. When attached without a target, the window becomes the target.
-class BControl : public BView, public BInvoker {
+class _EXPORT BControl : public BView, public BInvoker {
 public:
 	BControl(BRect frame, const char* name, const char* label, BMessage* message,
 		uint32 resizingMode, uint32 flags);

@@ -9,7 +9,7 @@ enum picture_button_behavior { B_ONE_STATE_BUTTON = 0, B_TWO_STATE_BUTTON = 1 };
 // Pictures are not recorded or played on this platform. A button from an archive keeps the
 // archives of its pictures and gives them back unchanged; it draws as a bevelled button with its
 // label. Its value, its tracking and its invocation are those of the class.
-class BPictureButton : public BControl {
+class _EXPORT BPictureButton : public BControl {
 public:
 	BPictureButton(BRect frame, const char* name, BMessage* message,
 		uint32 behavior = B_ONE_STATE_BUTTON, uint32 resizingMode = B_FOLLOW_LEFT | B_FOLLOW_TOP,

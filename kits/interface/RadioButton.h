@@ -7,7 +7,7 @@
 // Switching one on by mouse, key or SetValue() switches off the other radio buttons of the same
 // parent (or of the window, at the top level), without invoking them. Choosing the one that is
 // on already does nothing.
-class BRadioButton : public BControl {
+class _EXPORT BRadioButton : public BControl {
 public:
 	BRadioButton(BRect frame, const char* name, const char* label, BMessage* message,
 		uint32 resizingMode = B_FOLLOW_LEFT | B_FOLLOW_TOP,

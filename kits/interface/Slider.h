@@ -17,7 +17,7 @@ enum thumb_style { B_BLOCK_THUMB = 0, B_TRIANGLE_THUMB = 1 };
 
 // The modification message is sent at every change by mouse or keys, the control's own message
 // when the mouse or the key is released. A vertical slider has its maximum at the top.
-class BSlider : public BControl {
+class _EXPORT BSlider : public BControl {
 public:
 	BSlider(BRect frame, const char* name, const char* label, BMessage* message, int32 minValue,
 		int32 maxValue, thumb_style thumbType = B_BLOCK_THUMB,

@@ -11,7 +11,7 @@ constexpr uint32 B_UPDATE_STATUS_BAR = 'SBUP';
 constexpr uint32 B_RESET_STATUS_BAR = 'SBRS';
 
 
-class BStatusBar : public BView {
+class _EXPORT BStatusBar : public BView {
 public:
 	BStatusBar(
 		BRect frame, const char* name, const char* label = NULL, const char* trailingLabel = NULL);

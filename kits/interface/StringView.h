@@ -8,7 +8,7 @@
 
 // Several lines are shown when the text has newlines. The text stands at the bottom of the view,
 // in the high colour, on the low colour.
-class BStringView : public BView {
+class _EXPORT BStringView : public BView {
 public:
 	BStringView(BRect frame, const char* name, const char* text,
 		uint32 resizingMode = B_FOLLOW_LEFT | B_FOLLOW_TOP, uint32 flags = B_WILL_DRAW);

@@ -13,7 +13,7 @@ class BTabView;
 
 
 // The tab of one page. It owns its contents view, also while that is shown in a tab view.
-class BTab : public BArchivable {
+class _EXPORT BTab : public BArchivable {
 public:
 	BTab(BView* contentsView = NULL);
 	BTab(BMessage* archive);
@@ -63,7 +63,7 @@ private:
 
 // Only the selected page is in the view tree, as the child of the container view; the others
 // have neither parent nor window. The tab view owns its tabs.
-class BTabView : public BView {
+class _EXPORT BTabView : public BView {
 public:
 	BTabView(BRect frame, const char* name, button_width width = B_WIDTH_AS_USUAL,
 		uint32 resizingMode = B_FOLLOW_ALL,
