@@ -59,17 +59,15 @@ private:
 	BBox(const BBox&) = delete;
 	BBox& operator=(const BBox&) = delete;
 
+	bool _HasLabel() const;
 	void _ClearLabel();
-	BRect _LabelFrame() const;
-	BRect _BorderFrame() const;
-	void _DrawBorder(BRect frame);
+	// The part of the top that the border leaves out; invalid without a label.
+	BRect _LabelGap() const;
+	float _BorderTop() const;
 	void _InvalidateStrips(BRect oldBounds, BRect newBounds);
-	// The label view, which may have been removed behind our back; else NULL.
-	BView* _FindLabelView() const;
 
 	std::string fLabel; // empty: none
-	BView* fLabelView; // child, compared before it is used
-	bool fLabelIsFirstChild; // archived with a label view that is still to be taken
+	BView* fLabelView; // child; it is the label as long as it is the first one
 	BRect fOldBounds;
 	border_style fBorder;
 };

@@ -5,7 +5,7 @@
 
 
 // Its value is 1 while it is held down. It invokes when the mouse is released inside, or by Enter
-// or Space; the default button of a window answers Enter wherever the focus is.
+// or Space, when it flashes; the default button of a window answers Enter wherever the focus is.
 class _EXPORT BButton : public BControl {
 public:
 	BButton(BRect frame, const char* name, const char* label, BMessage* message,
@@ -42,7 +42,6 @@ public:
 
 	virtual void GetPreferredSize(float* _width, float* _height);
 	virtual void ResizeToPreferred();
-	// Shows the pressed look for a moment, when it was not pressed by the mouse.
 	virtual status_t Invoke(BMessage* message = NULL);
 
 	virtual BHandler* ResolveSpecifier(
@@ -57,5 +56,4 @@ private:
 	void _Flash();
 
 	bool fIsDefault;
-	bool fRevived; // made from an archive: attaching adjusts nothing
 };

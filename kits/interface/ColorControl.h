@@ -89,5 +89,4 @@ private:
 	int32 fTrackedRamp; // -1: none
 	int32 fFocusedRamp; // which one the keys change
 	int32 fKeyRepeats;
-	bool fRevived; // made from an archive: attaching adjusts nothing
 };

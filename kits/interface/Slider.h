@@ -3,6 +3,10 @@
 
 #include <Control.h>
 
+namespace BPrivate {
+class ArchiveWriter;
+}
+
 enum hash_mark_location {
 	B_HASH_MARKS_NONE = 0,
 	B_HASH_MARKS_TOP = 1,
@@ -123,25 +127,23 @@ private:
 	BSlider(const BSlider&) = delete;
 	BSlider& operator=(const BSlider&) = delete;
 
-	void _InitObject(int32 minValue, int32 maxValue, orientation posture, thumb_style style);
 	void _ReadArchive(BMessage* archive);
-	void _TrackTo(BPoint where);
+	void _WriteArchive(BPrivate::ArchiveWriter& writer, BMessage* archive) const;
 	void _ChangeTo(int32 value);
-	void _Modified();
+	bool _HasLimitLabels() const;
 	float _LineHeight() const;
 	float _MinPosition() const;
 	float _MaxPosition() const;
 	void _GetMinimumSize(float* _width, float* _height) const;
-	void _DrawBlockThumb(BRect frame);
-	void _DrawTriangleThumb(BRect frame);
-	void _DrawBarPart(BRect frame, rgb_color color);
-	void _DrawMark(float position, BRect frame, bool atStart);
+	uint32 _LookState() const;
+	void _DrawTextLine(const char* text, float baseline, alignment align);
+	void _InvalidateValue(BRect oldThumb);
 
 	std::unique_ptr<BMessage> fModificationMessage;
 	std::string fMinLabel;
 	std::string fMaxLabel;
 	std::string fUpdateText; // what UpdateText() last said
-	bool fHasMinLabel;
+	bool fHasMinLabel; // false: MinLimitLabel() is NULL
 	bool fHasMaxLabel;
 	int32 fSnoozeAmount;
 	int32 fKeyIncrement;
@@ -155,7 +157,6 @@ private:
 	rgb_color fFillColor;
 	bool fUseFillColor;
 	float fBarThickness;
-	int32 fValueAtPress;
-	bool fKeyChanged; // a key changed the value and has not been released
-	bool fRevived; // made from an archive: attaching adjusts nothing
+	int32 fValueBefore; // when the mouse or the key was pressed
+	bool fKeyIsDown; // a key that changes the value
 };

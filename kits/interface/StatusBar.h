@@ -5,12 +5,10 @@
 
 #include <string>
 
-// The messages that do what Update() and Reset() do, for other threads. 'SBUP' carries float
-// "delta", string "text" and "trailing_text"; 'SBRS' carries string "label" and "trailing_label".
-constexpr uint32 B_UPDATE_STATUS_BAR = 'SBUP';
-constexpr uint32 B_RESET_STATUS_BAR = 'SBRS';
 
-
+// B_UPDATE_STATUS_BAR and B_RESET_STATUS_BAR do what Update() and Reset() do, from other threads:
+// the first carries float "delta", string "text" and "trailing_text", the second string "label"
+// and "trailing_label".
 class _EXPORT BStatusBar : public BView {
 public:
 	BStatusBar(
@@ -70,12 +68,13 @@ private:
 	BStatusBar(const BStatusBar&) = delete;
 	BStatusBar& operator=(const BStatusBar&) = delete;
 
-	bool _HasText() const;
 	BRect _BarFrame() const;
-	void _SetTextData(std::string& text, const char* newText);
-	void _Set(float value, float max);
-	void _AdjustHeight();
 	float _TextHeight() const;
+	float _FillRight(float value) const;
+	void _SetText(std::string& text, const char* newText);
+	void _SetValue(float value, float max);
+	void _DrawBar();
+	void _DrawTexts();
 
 	std::string fLabel;
 	std::string fTrailingLabel;
@@ -87,5 +86,4 @@ private:
 	rgb_color fBarColor;
 	bool fCustomBarHeight; // set by the program, so archived
 	bool fCustomBarColor;
-	bool fRevived; // made from an archive: attaching adjusts nothing
 };

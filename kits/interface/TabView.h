@@ -4,12 +4,15 @@
 #include <View.h>
 
 #include <memory>
-#include <string>
 #include <vector>
 
 enum tab_position { B_TAB_FIRST = 999, B_TAB_FRONT, B_TAB_ANY };
 
 class BTabView;
+
+namespace BPrivate {
+class ArchiveSource;
+}
 
 
 // The tab of one page. It owns its contents view, also while that is shown in a tab view.
@@ -51,10 +54,9 @@ private:
 	BTab(const BTab&) = delete;
 	BTab& operator=(const BTab&) = delete;
 
-	std::string fLabel;
 	BView* fView; // owned
 	BTabView* fOwner; // borrowed: the tab view that holds this tab
-	std::unique_ptr<BMessage> fArchive; // what it was made from, for the fields that we do not know
+	std::unique_ptr<BPrivate::ArchiveSource> fSource; // what it was made from; NULL if it was not
 	bool fEnabled;
 	bool fSelected;
 	bool fFocus;
@@ -74,7 +76,6 @@ public:
 
 	static BArchivable* Instantiate(BMessage* archive);
 	virtual status_t Archive(BMessage* archive, bool deep = true) const;
-	virtual status_t AllUnarchived(const BMessage* archive);
 	virtual status_t Perform(perform_code code, void* data);
 
 	virtual void WindowActivated(bool active);
@@ -145,5 +146,4 @@ private:
 	float fTabHeight;
 	int32 fSelection; // -1: none
 	int32 fFocus; // -1: no tab has the focus mark
-	bool fRevived; // made from an archive: attaching adjusts nothing
 };

@@ -99,6 +99,30 @@ DrawLeftTop(BView* view, BRect frame, rgb_color color)
 }
 
 
+// A ring whose top line leaves out the columns of the gap.
+void
+DrawBrokenRing(BView* view, BRect frame, rgb_color leftTop, rgb_color rightBottom, BRect gap)
+{
+	if (!gap.IsValid()) {
+		DrawRing(view, frame, leftTop, rightBottom);
+		return;
+	}
+	DrawLines(view, {
+		{ frame.LeftBottom(), frame.LeftTop(), leftTop },
+		{ frame.RightTop(), frame.RightBottom(), rightBottom },
+		{ frame.RightBottom(), frame.LeftBottom(), rightBottom },
+	});
+	if (gap.left > frame.left) {
+		DrawLines(view, { { frame.LeftTop(),
+			BPoint(std::min(gap.left - 1, frame.right), frame.top), leftTop } });
+	}
+	if (gap.right < frame.right) {
+		DrawLines(view, { { BPoint(std::max(gap.right + 1, frame.left), frame.top),
+			frame.RightTop(), leftTop } });
+	}
+}
+
+
 rgb_color
 Blend(rgb_color a, rgb_color b)
 {
@@ -275,24 +299,24 @@ DrawRing(BView* view, BRect frame, rgb_color leftTop, rgb_color rightBottom)
 
 
 void
-DrawGroove(BView* view, BRect frame, rgb_color base)
+DrawGroove(BView* view, BRect frame, rgb_color base, BRect gap)
 {
 	PlainPen pen(view);
 	frame.right--;
 	frame.bottom--;
 	const rgb_color light = tint_color(base, B_LIGHTEN_MAX_TINT);
 	const rgb_color dark = tint_color(base, B_DARKEN_3_TINT);
-	DrawRing(view, frame.OffsetByCopy(1, 1), light, light);
-	DrawRing(view, frame, dark, dark);
+	DrawBrokenRing(view, frame.OffsetByCopy(1, 1), light, light, gap);
+	DrawBrokenRing(view, frame, dark, dark, gap);
 }
 
 
 void
-DrawPlainFrame(BView* view, BRect frame, rgb_color base)
+DrawPlainFrame(BView* view, BRect frame, rgb_color base, BRect gap)
 {
 	PlainPen pen(view);
-	DrawRing(
-		view, frame, tint_color(base, B_LIGHTEN_MAX_TINT), tint_color(base, B_DARKEN_3_TINT));
+	DrawBrokenRing(view, frame, tint_color(base, B_LIGHTEN_MAX_TINT),
+		tint_color(base, B_DARKEN_3_TINT), gap);
 }
 
 
@@ -445,6 +469,180 @@ DrawFocusLine(BView* view, float left, float right, float baseline)
 	view->SetHighColor(NavigationColor());
 	view->StrokeLine(BPoint(left, baseline + 2), BPoint(right, baseline + 2));
 }
+
+
+void
+DrawProgressBar(BView* view, BRect frame, rgb_color base, rgb_color barColor, float filled)
+{
+	PlainPen pen(view);
+	DrawRing(
+		view, frame, tint_color(base, B_DARKEN_1_TINT), tint_color(base, B_LIGHTEN_2_TINT));
+	DrawRing(view, Inset(frame, 1), tint_color(base, B_DARKEN_4_TINT), base);
+
+	BRect inside = Inset(frame, 2);
+	if (!inside.IsValid())
+		return;
+	const float right = inside.right;
+	if (filled >= inside.left) {
+		inside.right = std::min(filled, right);
+		DrawRing(view, inside, tint_color(barColor, B_LIGHTEN_2_TINT),
+			tint_color(barColor, B_DARKEN_2_TINT));
+		Fill(view, Inset(inside, 1), barColor);
+		inside.left = inside.right + 1;
+		inside.right = right;
+	}
+	if (inside.IsValid())
+		Fill(view, inside, DocumentColor());
+}
+
+
+// #pragma mark - sliders and tabs
+
+
+void
+DrawSliderBar(BView* view, BRect frame, rgb_color base, rgb_color barColor, uint32 state)
+{
+	PlainPen pen(view);
+	const bool disabled = (state & kDisabled) != 0;
+	// An alpha of 0 is kept in archives, but a bar is always seen.
+	barColor.alpha = 255;
+	const rgb_color color = disabled ? Blend(barColor, base) : barColor;
+	DrawRing(
+		view, frame, tint_color(base, B_DARKEN_1_TINT), tint_color(base, B_LIGHTEN_MAX_TINT));
+	DrawRing(view, Inset(frame, 1), tint_color(color, B_DARKEN_2_TINT), color);
+	Fill(view, Inset(frame, 2), color);
+}
+
+
+void
+DrawSliderBlockThumb(
+	BView* view, BRect frame, orientation direction, rgb_color base, uint32 state)
+{
+	PlainPen pen(view);
+	const bool disabled = (state & kDisabled) != 0;
+	const bool focused = (state & kFocused) != 0 && !disabled;
+	const rgb_color edge = focused
+		? NavigationColor()
+		: tint_color(base, disabled ? B_DARKEN_2_TINT : B_DARKEN_4_TINT);
+	DrawRoundRing(view, frame, edge);
+	DrawRing(view, Inset(frame, 1), tint_color(base, B_LIGHTEN_MAX_TINT),
+		tint_color(base, disabled ? B_DARKEN_1_TINT : B_DARKEN_2_TINT));
+	Fill(view, Inset(frame, 2),
+		tint_color(base, (state & kPressed) != 0 ? B_NO_TINT : B_LIGHTEN_2_TINT));
+
+	// The notch that shows the exact place.
+	const rgb_color dark = tint_color(base, disabled ? B_DARKEN_1_TINT : B_DARKEN_3_TINT);
+	const rgb_color light = tint_color(base, B_LIGHTEN_MAX_TINT);
+	if (direction == B_HORIZONTAL) {
+		const float x = std::floor((frame.left + frame.right) / 2);
+		DrawLines(view, {
+			{ BPoint(x, frame.top + 3), BPoint(x, frame.bottom - 3), dark },
+			{ BPoint(x + 1, frame.top + 3), BPoint(x + 1, frame.bottom - 3), light },
+		});
+	} else {
+		const float y = std::floor((frame.top + frame.bottom) / 2);
+		DrawLines(view, {
+			{ BPoint(frame.left + 3, y), BPoint(frame.right - 3, y), dark },
+			{ BPoint(frame.left + 3, y + 1), BPoint(frame.right - 3, y + 1), light },
+		});
+	}
+}
+
+
+void
+DrawSliderTriangleThumb(
+	BView* view, BRect frame, orientation direction, rgb_color base, uint32 state)
+{
+	PlainPen pen(view);
+	const bool disabled = (state & kDisabled) != 0;
+	const bool focused = (state & kFocused) != 0 && !disabled;
+	const rgb_color edge = focused
+		? NavigationColor()
+		: tint_color(base, disabled ? B_DARKEN_2_TINT : B_DARKEN_4_TINT);
+	const rgb_color face
+		= tint_color(base, (state & kPressed) != 0 ? B_NO_TINT : B_LIGHTEN_2_TINT);
+	const float x = std::floor((frame.left + frame.right) / 2);
+	const float y = std::floor((frame.top + frame.bottom) / 2);
+
+	BPoint tip(x, frame.top);
+	BPoint left(frame.left, frame.bottom);
+	BPoint right(frame.right, frame.bottom);
+	if (direction == B_VERTICAL) {
+		tip = BPoint(frame.left, y);
+		left = BPoint(frame.right, frame.bottom);
+		right = BPoint(frame.right, frame.top);
+	}
+	view->SetHighColor(face);
+	view->FillTriangle(tip, left, right);
+	DrawLines(view, {
+		{ tip, left, edge },
+		{ left, right, edge },
+		{ right, tip, edge },
+	});
+}
+
+
+void
+DrawHashMark(BView* view, BPoint from, BPoint to, rgb_color base, uint32 state)
+{
+	const BPoint beside = from.x == to.x ? BPoint(1, 0) : BPoint(0, 1);
+	const bool disabled = (state & kDisabled) != 0;
+	DrawLines(view, {
+		{ from, to, tint_color(base, disabled ? B_DARKEN_1_TINT : B_DARKEN_3_TINT) },
+		{ from + beside, to + beside, tint_color(base, B_LIGHTEN_MAX_TINT) },
+	});
+}
+
+
+void
+DrawTab(BView* view, BRect frame, rgb_color base, uint32 state)
+{
+	PlainPen pen(view);
+	const bool front = (state & kOn) != 0;
+	const rgb_color face = front ? base : tint_color(base, (1 + B_DARKEN_1_TINT) / 2);
+	const rgb_color light = tint_color(base, B_LIGHTEN_MAX_TINT);
+	const rgb_color dark = tint_color(base, B_DARKEN_2_TINT);
+	const rgb_color darker = tint_color(base, B_DARKEN_4_TINT);
+	const float bottom = frame.bottom;
+
+	Fill(view, BRect(frame.left + 1, frame.top + 2, frame.right - 1, bottom), face);
+	Fill(view, BRect(frame.left + 3, frame.top + 1, frame.right - 3, frame.top + 1), face);
+	DrawLines(view, {
+		// A dark outline with cut corners, and the light that falls on it from the left top.
+		{ BPoint(frame.left, bottom), BPoint(frame.left, frame.top + 3), darker },
+		{ BPoint(frame.left, frame.top + 3), BPoint(frame.left + 3, frame.top), darker },
+		{ BPoint(frame.left + 3, frame.top), BPoint(frame.right - 3, frame.top), darker },
+		{ BPoint(frame.right - 3, frame.top), BPoint(frame.right, frame.top + 3), darker },
+		{ BPoint(frame.right, frame.top + 3), BPoint(frame.right, bottom), darker },
+		{ BPoint(frame.left + 1, bottom), BPoint(frame.left + 1, frame.top + 3), light },
+		{ BPoint(frame.left + 1, frame.top + 3), BPoint(frame.left + 3, frame.top + 1), light },
+		{ BPoint(frame.left + 3, frame.top + 1), BPoint(frame.right - 3, frame.top + 1), light },
+		{ BPoint(frame.right - 1, frame.top + 3), BPoint(frame.right - 1, bottom), dark },
+	});
+}
+
+
+void
+DrawTabBody(BView* view, BRect frame, BRect selectedTab, rgb_color base)
+{
+	PlainPen pen(view);
+	const rgb_color light = tint_color(base, B_LIGHTEN_MAX_TINT);
+	const rgb_color dark = tint_color(base, B_DARKEN_2_TINT);
+	const rgb_color darker = tint_color(base, B_DARKEN_4_TINT);
+	BRect gap;
+	if (selectedTab.IsValid()) {
+		gap = selectedTab;
+		gap.InsetBy(1, 0);
+	}
+	DrawBrokenRing(view, frame, darker, darker, gap);
+	BRect innerGap = gap;
+	if (gap.IsValid())
+		innerGap.right--;
+	DrawBrokenRing(view, Inset(frame, 1), light, dark, innerGap);
+}
+
+
+// #pragma mark - arrows
 
 
 void

@@ -53,10 +53,11 @@ bool IsTransparent(rgb_color color);
 // where they meet the left and top ones.
 void DrawRing(BView* view, BRect frame, rgb_color leftTop, rgb_color rightBottom);
 
-// Dark line outside left and top, light line inside: the frame of a group.
-void DrawGroove(BView* view, BRect frame, rgb_color base);
+// Dark line outside left and top, light line inside: the frame of a group. The top line is broken
+// where the gap is; an invalid gap breaks nothing.
+void DrawGroove(BView* view, BRect frame, rgb_color base, BRect gap = BRect());
 // A single raised frame line.
-void DrawPlainFrame(BView* view, BRect frame, rgb_color base);
+void DrawPlainFrame(BView* view, BRect frame, rgb_color base, BRect gap = BRect());
 // A line pair, horizontal or vertical along the longer side of the rectangle.
 void DrawSeparator(BView* view, BRect frame, rgb_color base);
 // One button-like raised surface with its fill; pressed it is sunken.
@@ -73,6 +74,26 @@ void DrawFocusLine(BView* view, float left, float right, float baseline);
 
 // The two-pixel frame round a text field, a list or another document; `frame` is its outside.
 void DrawFieldFrame(BView* view, BRect frame, rgb_color base, uint32 state = kNormal);
+
+// A sunken bar with its border of two pixels, filled up to the column `filled`, that included; a
+// column left of the bar's inside fills nothing.
+void DrawProgressBar(
+	BView* view, BRect frame, rgb_color base, rgb_color barColor, float filled);
+
+// The channel of a slider, one part of it, in the given colour.
+void DrawSliderBar(BView* view, BRect frame, rgb_color base, rgb_color barColor, uint32 state);
+void DrawSliderBlockThumb(
+	BView* view, BRect frame, orientation direction, rgb_color base, uint32 state);
+// Points up or left.
+void DrawSliderTriangleThumb(
+	BView* view, BRect frame, orientation direction, rgb_color base, uint32 state);
+// One mark of a scale: a dark and a light line side by side.
+void DrawHashMark(BView* view, BPoint from, BPoint to, rgb_color base, uint32 state);
+
+// The tab of a page: a raised tongue that is open at the bottom when it is in front.
+void DrawTab(BView* view, BRect frame, rgb_color base, uint32 state);
+// The raised body of a tab view, open below the selected tab.
+void DrawTabBody(BView* view, BRect frame, BRect selectedTab, rgb_color base);
 
 // A filled triangle centred in the rectangle.
 void DrawArrow(BView* view, BRect frame, Direction direction, rgb_color color);

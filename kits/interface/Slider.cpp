@@ -1,0 +1,741 @@
+#include <Slider.h>
+
+#include <algorithm>
+#include <cmath>
+
+#include <AppDefs.h>
+#include <Message.h>
+#include <Window.h>
+
+#include "interface/private/ControlArchive.h"
+#include "interface/private/Label.h"
+#include "interface/private/Look.h"
+#include "interface/private/ViewArchive.h"
+
+namespace Look = BPrivate::Look;
+
+using BPrivate::is_revived;
+using BPrivate::LabelMetrics;
+
+namespace {
+
+constexpr int32 kDefaultSnooze = 20000;
+constexpr int32 kMinimumSnooze = 10000;
+constexpr int32 kMaximumSnooze = 1000000;
+constexpr float kDefaultThickness = 6;
+
+rgb_color
+DefaultBarColor()
+{
+	return tint_color(Look::PanelColor(), B_DARKEN_4_TINT);
+}
+
+} // namespace
+
+
+BSlider::BSlider(BRect frame, const char* name, const char* label, BMessage* message,
+	int32 minValue, int32 maxValue, thumb_style thumbType, uint32 resizingMode, uint32 flags) :
+	BSlider(frame, name, label, message, minValue, maxValue, B_HORIZONTAL, thumbType,
+		resizingMode, flags)
+{
+}
+
+
+BSlider::BSlider(BRect frame, const char* name, const char* label, BMessage* message,
+	int32 minValue, int32 maxValue, orientation posture, thumb_style thumbType,
+	uint32 resizingMode, uint32 flags) :
+	BControl(frame, name, label, message, resizingMode, flags),
+	fHasMinLabel(false),
+	fHasMaxLabel(false),
+	fSnoozeAmount(kDefaultSnooze),
+	fKeyIncrement(1),
+	fHashMarkCount(0),
+	fHashMarks(B_HASH_MARKS_NONE),
+	fStyle(thumbType),
+	fOrientation(posture),
+	fMinValue(minValue),
+	fMaxValue(maxValue),
+	fBarColor(DefaultBarColor()),
+	fFillColor(Look::StatusBarColor()),
+	fUseFillColor(false),
+	fBarThickness(kDefaultThickness),
+	fValueBefore(0),
+	fKeyIsDown(false)
+{
+	if (minValue <= maxValue)
+		SetValueNoUpdate(std::clamp<int32>(0, minValue, maxValue));
+}
+
+
+BSlider::BSlider(BMessage* archive) :
+	BControl(archive),
+	fHasMinLabel(false),
+	fHasMaxLabel(false),
+	fSnoozeAmount(kDefaultSnooze),
+	fKeyIncrement(1),
+	fHashMarkCount(11),
+	fHashMarks(B_HASH_MARKS_NONE),
+	fStyle(B_BLOCK_THUMB),
+	fOrientation(B_HORIZONTAL),
+	fMinValue(0),
+	fMaxValue(100),
+	fBarColor(DefaultBarColor()),
+	fFillColor(Look::StatusBarColor()),
+	fUseFillColor(false),
+	fBarThickness(kDefaultThickness),
+	fValueBefore(0),
+	fKeyIsDown(false)
+{
+	_ReadArchive(archive);
+}
+
+
+BSlider::~BSlider()
+{
+}
+
+
+// #pragma mark - archive
+
+
+BArchivable*
+BSlider::Instantiate(BMessage* archive)
+{
+	return validate_instantiation(archive, "BSlider") ? new BSlider(archive) : NULL;
+}
+
+
+namespace {
+
+// R5 writes the thumb's style as an int32, later systems as an int16.
+thumb_style
+ReadStyle(const BMessage* archive)
+{
+	int16 shortStyle;
+	if (archive->FindInt16("_sstyle", &shortStyle) == B_OK)
+		return static_cast<thumb_style>(shortStyle);
+	int32 style;
+	if (archive->FindInt32("_sstyle", &style) == B_OK)
+		return static_cast<thumb_style>(style);
+	return B_BLOCK_THUMB;
+}
+
+} // namespace
+
+
+void
+BSlider::_ReadArchive(BMessage* archive)
+{
+	fModificationMessage = BPrivate::read_message(archive, "_mod_msg");
+
+	int32 number;
+	if (archive->FindInt32("_sdelay", &number) == B_OK)
+		fSnoozeAmount = number;
+	if (archive->FindInt32("_bcolor", &number) == B_OK)
+		fBarColor = BPrivate::color_from_bytes(number);
+	if (archive->FindInt32("_fcolor", &number) == B_OK) {
+		fFillColor = BPrivate::color_from_bytes(number);
+		fUseFillColor = true;
+	}
+
+	const char* label;
+	if (archive->FindString("_minlbl", &label) == B_OK) {
+		fMinLabel = label;
+		fHasMinLabel = true;
+	}
+	if (archive->FindString("_maxlbl", &label) == B_OK) {
+		fMaxLabel = label;
+		fHasMaxLabel = true;
+	}
+
+	if (archive->FindInt32("_min", &number) == B_OK)
+		fMinValue = number;
+	if (archive->FindInt32("_max", &number) == B_OK)
+		fMaxValue = number;
+	if (archive->FindInt32("_incrementvalue", &number) == B_OK)
+		fKeyIncrement = number;
+	if (archive->FindInt32("_hashcount", &number) == B_OK)
+		fHashMarkCount = number;
+	int16 location;
+	if (archive->FindInt16("_hashloc", &location) == B_OK)
+		fHashMarks = static_cast<hash_mark_location>(location);
+	fStyle = ReadStyle(archive);
+	if (archive->FindInt32("_orient", &number) == B_OK)
+		fOrientation = static_cast<orientation>(number);
+	float thickness;
+	if (archive->FindFloat("_bthickness", &thickness) == B_OK)
+		fBarThickness = thickness;
+}
+
+
+status_t
+BSlider::Archive(BMessage* archive, bool deep) const
+{
+	const status_t status = BControl::Archive(archive, deep);
+	if (status != B_OK)
+		return status;
+	BPrivate::ArchiveWriter writer(archive);
+	_WriteArchive(writer, archive);
+	return writer.Status();
+}
+
+
+void
+BSlider::_WriteArchive(BPrivate::ArchiveWriter& writer, BMessage* archive) const
+{
+	BPrivate::write_message(writer, archive, "_mod_msg", fModificationMessage.get());
+	writer.Int32("_sdelay", fSnoozeAmount, kDefaultSnooze);
+	writer.Int32("_bcolor", BPrivate::color_to_bytes(fBarColor),
+		BPrivate::color_to_bytes(DefaultBarColor()));
+
+	// The presence of the field says whether the colour is used.
+	const int32 fill = BPrivate::color_to_bytes(fFillColor);
+	if (const BMessage* source = writer.Source()) {
+		int32 read;
+		const bool used = source->FindInt32("_fcolor", &read) == B_OK;
+		if (!writer.Keep("_fcolor", used == fUseFillColor && (!used || read == fill))
+			&& fUseFillColor) {
+			archive->AddInt32("_fcolor", fill);
+		}
+	} else if (fUseFillColor)
+		archive->AddInt32("_fcolor", fill);
+
+	writer.String("_minlbl", MinLimitLabel(), NULL);
+	writer.String("_maxlbl", MaxLimitLabel(), NULL);
+	writer.Int32("_min", fMinValue, 0);
+	writer.Int32("_max", fMaxValue, 100);
+	writer.Int32("_incrementvalue", fKeyIncrement, 1);
+	writer.Int32("_hashcount", fHashMarkCount, 11);
+	writer.Int16("_hashloc", static_cast<int16>(fHashMarks), B_HASH_MARKS_NONE);
+	const BMessage* source = writer.Source();
+	if (!writer.Keep("_sstyle", source != NULL && ReadStyle(source) == fStyle))
+		archive->AddInt16("_sstyle", static_cast<int16>(fStyle));
+	writer.Int32("_orient", fOrientation, B_HORIZONTAL);
+	writer.Float("_bthickness", fBarThickness, kDefaultThickness);
+}
+
+
+// #pragma mark - hooks
+
+
+void
+BSlider::AttachedToWindow()
+{
+	if (!is_revived(this))
+		ResizeToPreferred();
+	BControl::AttachedToWindow();
+
+	const char* text = UpdateText();
+	fUpdateText = text != NULL ? text : "";
+}
+
+
+void
+BSlider::DetachedFromWindow()
+{
+	fKeyIsDown = false;
+	BControl::DetachedFromWindow();
+}
+
+
+void
+BSlider::AllAttached()
+{
+	BControl::AllAttached();
+}
+
+
+void
+BSlider::AllDetached()
+{
+	BControl::AllDetached();
+}
+
+
+void
+BSlider::WindowActivated(bool active)
+{
+	BControl::WindowActivated(active);
+}
+
+
+void
+BSlider::MessageReceived(BMessage* message)
+{
+	BControl::MessageReceived(message);
+}
+
+
+void
+BSlider::FrameMoved(BPoint newPosition)
+{
+	BControl::FrameMoved(newPosition);
+}
+
+
+void
+BSlider::FrameResized(float width, float height)
+{
+	Invalidate();
+	BControl::FrameResized(width, height);
+}
+
+
+void
+BSlider::Pulse()
+{
+	BControl::Pulse();
+}
+
+
+// #pragma mark - mouse and keys
+
+
+void
+BSlider::MouseDown(BPoint where)
+{
+	if (!IsEnabled())
+		return;
+
+	fValueBefore = Value();
+	SetTracking(true);
+	SetMouseEventMask(B_POINTER_EVENTS, B_LOCK_WINDOW_FOCUS | B_NO_POINTER_HISTORY);
+	Invalidate(ThumbFrame());
+	_ChangeTo(ValueForPoint(where));
+}
+
+
+void
+BSlider::MouseMoved(BPoint where, uint32 transit, const BMessage* dragMessage)
+{
+	if (IsTracking())
+		_ChangeTo(ValueForPoint(where));
+}
+
+
+void
+BSlider::MouseUp(BPoint where)
+{
+	if (!IsTracking())
+		return;
+
+	SetTracking(false);
+	Invalidate(ThumbFrame());
+	if (Value() != fValueBefore)
+		Invoke();
+}
+
+
+void
+BSlider::KeyDown(const char* bytes, int32 numBytes)
+{
+	if (!IsEnabled() || numBytes != 1) {
+		BControl::KeyDown(bytes, numBytes);
+		return;
+	}
+
+	int64 value = Value();
+	switch (bytes[0]) {
+		case B_LEFT_ARROW:
+		case B_DOWN_ARROW:
+			value -= fKeyIncrement;
+			break;
+		case B_RIGHT_ARROW:
+		case B_UP_ARROW:
+			value += fKeyIncrement;
+			break;
+		case B_HOME:
+			value = fMinValue;
+			break;
+		case B_END:
+			value = fMaxValue;
+			break;
+		default:
+			// Not BControl's: Space and Enter have no other value to switch to.
+			BView::KeyDown(bytes, numBytes);
+			return;
+	}
+
+	if (!fKeyIsDown) {
+		fKeyIsDown = true;
+		fValueBefore = Value();
+	}
+	if (fMinValue <= fMaxValue)
+		_ChangeTo(static_cast<int32>(std::clamp<int64>(value, fMinValue, fMaxValue)));
+}
+
+
+void
+BSlider::KeyUp(const char* bytes, int32 numBytes)
+{
+	BControl::KeyUp(bytes, numBytes);
+	if (!fKeyIsDown)
+		return;
+	fKeyIsDown = false;
+	if (Value() != fValueBefore)
+		Invoke();
+}
+
+
+// A change by the user, with its modification message.
+void
+BSlider::_ChangeTo(int32 value)
+{
+	if (value == Value())
+		return;
+	SetValue(value);
+	if (fModificationMessage != NULL)
+		InvokeNotify(fModificationMessage.get(), B_CONTROL_MODIFIED);
+}
+
+
+// #pragma mark - value
+
+
+void
+BSlider::SetValue(int32 value)
+{
+	if (fMinValue <= fMaxValue)
+		value = std::clamp(value, fMinValue, fMaxValue);
+	if (value == Value())
+		return;
+
+	const BRect oldThumb = ThumbFrame();
+	SetValueNoUpdate(value);
+	_InvalidateValue(oldThumb);
+	UpdateTextChanged();
+}
+
+
+void
+BSlider::_InvalidateValue(BRect oldThumb)
+{
+	BRect changed = oldThumb | ThumbFrame();
+	// What the thumb covers is drawn with it: the bar's fill, the marks, the focus.
+	changed.InsetBy(-2, -2);
+	Invalidate(changed);
+}
+
+
+int32
+BSlider::ValueForPoint(BPoint where) const
+{
+	const double min = _MinPosition();
+	const double max = _MaxPosition();
+	if (min == max || fMinValue > fMaxValue)
+		return fMinValue;
+	const double place = fOrientation == B_HORIZONTAL ? where.x : where.y;
+	const double range = static_cast<double>(fMaxValue) - fMinValue;
+	const double value = std::round((place - min) * range / (max - min)) + fMinValue;
+	return static_cast<int32>(
+		std::clamp(value, static_cast<double>(fMinValue), static_cast<double>(fMaxValue)));
+}
+
+
+void
+BSlider::SetPosition(float position)
+{
+	const double part = std::clamp(position, 0.0f, 1.0f);
+	const double range = static_cast<double>(fMaxValue) - fMinValue;
+	SetValue(static_cast<int32>(std::round(part * range) + fMinValue));
+}
+
+
+float
+BSlider::Position() const
+{
+	const double range = static_cast<double>(fMaxValue) - fMinValue;
+	if (!(range > 0))
+		return 0;
+	const double part = (static_cast<double>(Value()) - fMinValue) / range;
+	return static_cast<float>(std::clamp(part, 0.0, 1.0));
+}
+
+
+void
+BSlider::SetLimits(int32 minValue, int32 maxValue)
+{
+	if (minValue > maxValue || (minValue == fMinValue && maxValue == fMaxValue))
+		return;
+	fMinValue = minValue;
+	fMaxValue = maxValue;
+	SetValue(Value());
+	Invalidate();
+}
+
+
+void
+BSlider::GetLimits(int32* _minValue, int32* _maxValue) const
+{
+	if (_minValue != NULL)
+		*_minValue = fMinValue;
+	if (_maxValue != NULL)
+		*_maxValue = fMaxValue;
+}
+
+
+status_t
+BSlider::Invoke(BMessage* message)
+{
+	return BControl::Invoke(message);
+}
+
+
+// #pragma mark - properties
+
+
+void
+BSlider::SetLabel(const char* label)
+{
+	BControl::SetLabel(label);
+}
+
+
+void
+BSlider::SetLimitLabels(const char* minLabel, const char* maxLabel)
+{
+	fHasMinLabel = minLabel != NULL;
+	fHasMaxLabel = maxLabel != NULL;
+	fMinLabel = fHasMinLabel ? minLabel : "";
+	fMaxLabel = fHasMaxLabel ? maxLabel : "";
+	ResizeToPreferred();
+	Invalidate();
+}
+
+
+const char*
+BSlider::MinLimitLabel() const
+{
+	return fHasMinLabel ? fMinLabel.c_str() : NULL;
+}
+
+
+const char*
+BSlider::MaxLimitLabel() const
+{
+	return fHasMaxLabel ? fMaxLabel.c_str() : NULL;
+}
+
+
+void
+BSlider::SetEnabled(bool enabled)
+{
+	BControl::SetEnabled(enabled);
+}
+
+
+void
+BSlider::SetFlags(uint32 flags)
+{
+	BControl::SetFlags(flags);
+}
+
+
+void
+BSlider::SetResizingMode(uint32 mode)
+{
+	BControl::SetResizingMode(mode);
+}
+
+
+void
+BSlider::SetModificationMessage(BMessage* message)
+{
+	if (message != fModificationMessage.get())
+		fModificationMessage.reset(message);
+}
+
+
+BMessage*
+BSlider::ModificationMessage() const
+{
+	return fModificationMessage.get();
+}
+
+
+void
+BSlider::SetSnoozeAmount(int32 microSeconds)
+{
+	fSnoozeAmount = std::clamp(microSeconds, kMinimumSnooze, kMaximumSnooze);
+}
+
+
+int32
+BSlider::SnoozeAmount() const
+{
+	return fSnoozeAmount;
+}
+
+
+void
+BSlider::SetKeyIncrementValue(int32 incrementValue)
+{
+	fKeyIncrement = incrementValue;
+}
+
+
+int32
+BSlider::KeyIncrementValue() const
+{
+	return fKeyIncrement;
+}
+
+
+void
+BSlider::SetHashMarkCount(int32 hashMarkCount)
+{
+	if (hashMarkCount == fHashMarkCount)
+		return;
+	fHashMarkCount = hashMarkCount;
+	Invalidate();
+}
+
+
+int32
+BSlider::HashMarkCount() const
+{
+	return fHashMarkCount;
+}
+
+
+void
+BSlider::SetHashMarks(hash_mark_location where)
+{
+	if (where == fHashMarks)
+		return;
+	fHashMarks = where;
+	Invalidate();
+}
+
+
+hash_mark_location
+BSlider::HashMarks() const
+{
+	return fHashMarks;
+}
+
+
+void
+BSlider::SetStyle(thumb_style style)
+{
+	if (style == fStyle)
+		return;
+	fStyle = style;
+	Invalidate();
+}
+
+
+thumb_style
+BSlider::Style() const
+{
+	return fStyle;
+}
+
+
+void
+BSlider::SetBarColor(rgb_color color)
+{
+	fBarColor = color;
+	Invalidate(BarFrame());
+}
+
+
+rgb_color
+BSlider::BarColor() const
+{
+	return fBarColor;
+}
+
+
+void
+BSlider::UseFillColor(bool use, const rgb_color* color)
+{
+	fUseFillColor = use;
+	if (use && color != NULL)
+		fFillColor = *color;
+	Invalidate(BarFrame());
+}
+
+
+bool
+BSlider::FillColor(rgb_color* _color) const
+{
+	if (_color != NULL && fUseFillColor)
+		*_color = fFillColor;
+	return fUseFillColor;
+}
+
+
+BView*
+BSlider::OffscreenView() const
+{
+	return const_cast<BSlider*>(this);
+}
+
+
+orientation
+BSlider::Orientation() const
+{
+	return fOrientation;
+}
+
+
+void
+BSlider::SetOrientation(orientation posture)
+{
+	if (posture == fOrientation)
+		return;
+	fOrientation = posture;
+	Invalidate();
+}
+
+
+float
+BSlider::BarThickness() const
+{
+	return fBarThickness;
+}
+
+
+void
+BSlider::SetBarThickness(float thickness)
+{
+	thickness = std::max(1.0f, std::round(thickness));
+	if (thickness == fBarThickness)
+		return;
+	fBarThickness = thickness;
+	Invalidate();
+}
+
+
+void
+BSlider::SetFont(const BFont* font, uint32 properties)
+{
+	BControl::SetFont(font, properties);
+	Invalidate();
+}
+
+
+// #pragma mark - scripting
+
+
+BHandler*
+BSlider::ResolveSpecifier(
+	BMessage* message, int32 index, BMessage* specifier, int32 what, const char* property)
+{
+	return BControl::ResolveSpecifier(message, index, specifier, what, property);
+}
+
+
+status_t
+BSlider::GetSupportedSuites(BMessage* message)
+{
+	return BControl::GetSupportedSuites(message);
+}
+
+
+status_t
+BSlider::Perform(perform_code code, void* data)
+{
+	return BControl::Perform(code, data);
+}
