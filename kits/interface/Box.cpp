@@ -88,13 +88,12 @@ BBox::Archive(BMessage* archive, bool deep) const
 
 	BPrivate::ArchiveWriter writer(archive);
 	BPrivate::write_text(writer, archive, "_label", fLabel);
-	const BMessage* source = writer.Source();
 	const bool hasLabelView = LabelView() != NULL;
-	if (!writer.Keep("_lblview", source != NULL && source->HasBool("_lblview") == hasLabelView)
+	if (!writer.Keep("_lblview", writer.Source().HasBool("_lblview") == hasLabelView)
 		&& hasLabelView) {
 		archive->AddBool("_lblview", true);
 	}
-	if (!writer.Keep("_style", source != NULL && ReadBorder(source) == fBorder)
+	if (!writer.Keep("_style", ReadBorder(&writer.Source()) == fBorder)
 		&& fBorder != B_FANCY_BORDER) {
 		archive->AddInt32("_style", fBorder);
 	}

@@ -68,18 +68,19 @@ private:
 	BColorControl(const BColorControl&) = delete;
 	BColorControl& operator=(const BColorControl&) = delete;
 
-	void _CreateField(int32 component);
 	void _FindFields();
+	BTextControl* _CreateField(int32 component);
 	void _PlaceFields();
 	void _WriteFields();
-	void _TextChanged();
-	void _ApplyDrop(BMessage* message);
+	void _TakeFields();
+	bool _TakeDroppedColor(BMessage* message);
+	int32 _Rows() const;
 	BRect _PaletteFrame() const;
 	BRect _RampFrame(int32 ramp) const;
 	int32 _RampAt(BPoint where) const;
 	void _TrackTo(BPoint where);
-	void _SetComponent(int32 ramp, int32 value);
-	int32 _Component(int32 ramp) const;
+	int32 _RampValue(int32 ramp) const;
+	void _ChangeRamp(int32 ramp, int32 value);
 	void _DrawRamp(int32 ramp);
 
 	BTextControl* fFields[3]; // children: red, green, blue
@@ -87,6 +88,5 @@ private:
 	float fCellSize;
 	bool fUseOffscreen;
 	int32 fTrackedRamp; // -1: none
-	int32 fFocusedRamp; // which one the keys change
-	int32 fKeyRepeats;
+	int32 fFocusedRamp; // the one that the keys change
 };

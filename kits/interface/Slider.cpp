@@ -190,15 +190,12 @@ BSlider::_WriteArchive(BPrivate::ArchiveWriter& writer, BMessage* archive) const
 
 	// The presence of the field says whether the colour is used.
 	const int32 fill = BPrivate::color_to_bytes(fFillColor);
-	if (const BMessage* source = writer.Source()) {
-		int32 read;
-		const bool used = source->FindInt32("_fcolor", &read) == B_OK;
-		if (!writer.Keep("_fcolor", used == fUseFillColor && (!used || read == fill))
-			&& fUseFillColor) {
-			archive->AddInt32("_fcolor", fill);
-		}
-	} else if (fUseFillColor)
+	int32 read;
+	const bool used = writer.Source().FindInt32("_fcolor", &read) == B_OK;
+	if (!writer.Keep("_fcolor", used == fUseFillColor && (!used || read == fill))
+		&& fUseFillColor) {
 		archive->AddInt32("_fcolor", fill);
+	}
 
 	writer.String("_minlbl", MinLimitLabel(), NULL);
 	writer.String("_maxlbl", MaxLimitLabel(), NULL);
@@ -207,8 +204,7 @@ BSlider::_WriteArchive(BPrivate::ArchiveWriter& writer, BMessage* archive) const
 	writer.Int32("_incrementvalue", fKeyIncrement, 1);
 	writer.Int32("_hashcount", fHashMarkCount, 11);
 	writer.Int16("_hashloc", static_cast<int16>(fHashMarks), B_HASH_MARKS_NONE);
-	const BMessage* source = writer.Source();
-	if (!writer.Keep("_sstyle", source != NULL && ReadStyle(source) == fStyle))
+	if (!writer.Keep("_sstyle", ReadStyle(&writer.Source()) == fStyle))
 		archive->AddInt16("_sstyle", static_cast<int16>(fStyle));
 	writer.Int32("_orient", fOrientation, B_HORIZONTAL);
 	writer.Float("_bthickness", fBarThickness, kDefaultThickness);

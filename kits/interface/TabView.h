@@ -135,6 +135,8 @@ private:
 
 	void _InitContainer();
 	void _ReadTabs(BMessage* archive);
+	BView* _TakeOldPage();
+	status_t _EmptyContainer(BMessage* archive) const;
 	void _Show(int32 index);
 	int32 _TabAt(BPoint where) const;
 	float _LabelWidth(int32 index) const;

@@ -18,8 +18,7 @@ read_text(const BMessage* archive, const char* name)
 void
 write_text(ArchiveWriter& writer, BMessage* archive, const char* name, const std::string& text)
 {
-	const BMessage* source = writer.Source();
-	if (writer.Keep(name, source != nullptr && read_text(source, name) == text))
+	if (writer.Keep(name, read_text(&writer.Source(), name) == text))
 		return;
 	if (!text.empty())
 		archive->AddString(name, text.c_str());
@@ -65,14 +64,12 @@ void
 write_message(
 	ArchiveWriter& writer, BMessage* archive, const char* name, const BMessage* message)
 {
-	if (const BMessage* source = writer.Source()) {
-		const std::unique_ptr<BMessage> read = read_message(source, name);
-		const bool unchanged = read == nullptr || message == nullptr
-			? read.get() == message
-			: read->what == message->what && read->HasSameData(*message, false, true);
-		if (writer.Keep(name, unchanged))
-			return;
-	}
+	const std::unique_ptr<BMessage> read = read_message(&writer.Source(), name);
+	const bool unchanged = read == nullptr || message == nullptr
+		? read.get() == message
+		: read->what == message->what && read->HasSameData(*message, false, true);
+	if (writer.Keep(name, unchanged))
+		return;
 	if (message != nullptr)
 		archive->AddMessage(name, message);
 }

@@ -595,6 +595,22 @@ DrawHashMark(BView* view, BPoint from, BPoint to, rgb_color base, uint32 state)
 
 
 void
+DrawColorMarker(BView* view, BRect ramp, float x, uint32 state)
+{
+	PlainPen pen(view);
+	BRect ring(x - 2, ramp.top + 1, x + 2, ramp.bottom - 1);
+	if (ring.left < ramp.left)
+		ring.OffsetTo(ramp.left, ring.top);
+	if (ring.right > ramp.right)
+		ring.OffsetTo(ramp.right - ring.Width(), ring.top);
+	const bool disabled = (state & kDisabled) != 0;
+	const rgb_color outside = disabled ? TextColor(state) : rgb_color { 0, 0, 0, 255 };
+	DrawRing(view, ring, outside, outside);
+	DrawRing(view, Inset(ring, 1), DocumentColor(), DocumentColor());
+}
+
+
+void
 DrawTab(BView* view, BRect frame, rgb_color base, uint32 state)
 {
 	PlainPen pen(view);

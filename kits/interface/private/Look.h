@@ -90,6 +90,9 @@ void DrawSliderTriangleThumb(
 // One mark of a scale: a dark and a light line side by side.
 void DrawHashMark(BView* view, BPoint from, BPoint to, rgb_color base, uint32 state);
 
+// Where a ramp of colours stands: a ring across the ramp at the column x, to be seen on any colour.
+void DrawColorMarker(BView* view, BRect ramp, float x, uint32 state);
+
 // The tab of a page: a raised tongue that is open at the bottom when it is in front.
 void DrawTab(BView* view, BRect frame, rgb_color base, uint32 state);
 // The raised body of a tab view, open below the selected tab.

@@ -9,8 +9,10 @@ namespace BPrivate {
 // Whether the message carries the mark of a managed archive's root.
 bool is_managed_archive(const BMessage& archive);
 
-// Turns a managed archive into the nested form in place: each token of "_views" becomes the message
-// that it names. A note stays with the message and with each child (no field: it is not flattened,
+// Turns a managed archive into the nested form in place: each token of "_views", and of a tab view's
+// "_l_items" and "_view_list", becomes the message that it names. A page that both "_view_list" and
+// the tab view's container name is left in "_view_list" only, as the nested form has it, and goes
+// into both again on the way back (the container of the selected page, "_sel"). A note stays with the message and with each child (no field: it is not flattened,
 // and goes along with copies) of where it came from, and with the root of all objects that are no
 // children of a view. A token out of range, or one that would put a view into itself or into two
 // places, is left out. Does nothing to an archive that is not managed. instantiate_object() does

@@ -1,0 +1,685 @@
+#include <ColorControl.h>
+
+#include <algorithm>
+#include <cmath>
+#include <cstdlib>
+#include <cstring>
+#include <string>
+
+#include <Message.h>
+#include <TextControl.h>
+#include <TextView.h>
+#include <Window.h>
+
+#include "interface/private/Label.h"
+#include "interface/private/Look.h"
+#include "interface/private/ViewArchive.h"
+
+namespace Look = BPrivate::Look;
+
+using BPrivate::label_width;
+
+namespace {
+
+constexpr uint32 kFieldInvoked = 'ccol';
+constexpr float kMinimumCellSize = 6;
+constexpr float kBevel = 2; // round the palette
+constexpr float kFieldGap = 6; // between the palette and the fields, a label and its text
+constexpr float kFieldHeight = 18; // three of them are as high as a palette of the smallest cells
+constexpr int32 kRampCount = 4; // grey, red, green, blue
+constexpr int32 kGreyRamp = 0;
+constexpr int32 kRepeatsBeforeFast = 4;
+constexpr int32 kFastStep = 5;
+
+constexpr const char* kFieldNames[] = { "_red", "_green", "_blue" };
+constexpr const char* kFieldLabels[] = { "Red:", "Green:", "Blue:" };
+
+// What an archive may say; anything else would leave no palette.
+color_control_layout
+CheckedLayout(int32 layout)
+{
+	switch (layout) {
+		case B_CELLS_8x32:
+		case B_CELLS_16x16:
+		case B_CELLS_32x8:
+		case B_CELLS_64x4:
+			return static_cast<color_control_layout>(layout);
+		default:
+			return B_CELLS_4x64;
+	}
+}
+
+
+color_control_layout
+ReadLayout(const BMessage* archive)
+{
+	int32 layout = 0;
+	return archive->FindInt32("_layout", &layout) == B_OK ? CheckedLayout(layout) : B_CELLS_4x64;
+}
+
+
+float
+ReadCellSize(const BMessage* archive)
+{
+	float size = 0;
+	if (archive->FindFloat("_csize", &size) != B_OK || !(size >= kMinimumCellSize))
+		return kMinimumCellSize;
+	return size;
+}
+
+
+int32
+ValueOf(rgb_color color)
+{
+	return static_cast<int32>(static_cast<uint32>(color.red) << 24
+		| static_cast<uint32>(color.green) << 16 | static_cast<uint32>(color.blue) << 8);
+}
+
+
+int32
+ComponentOf(int32 value, int32 component)
+{
+	return static_cast<uint32>(value) >> (24 - 8 * component) & 0xff;
+}
+
+
+int32
+WithComponent(int32 value, int32 component, int32 amount)
+{
+	const int shift = 24 - 8 * component;
+	const uint32 word = static_cast<uint32>(value);
+	return static_cast<int32>((word & ~(0xffu << shift)) | static_cast<uint32>(amount) << shift);
+}
+
+} // namespace
+
+
+BColorControl::BColorControl(BPoint leftTop, color_control_layout layout, float cellSize,
+	const char* name, BMessage* message, bool useOffscreen) :
+	BControl(BRect(leftTop, leftTop), name, NULL, message, B_FOLLOW_LEFT | B_FOLLOW_TOP,
+		B_WILL_DRAW | B_NAVIGABLE),
+	fFields {},
+	fLayout(CheckedLayout(layout)),
+	fCellSize(std::max(cellSize, kMinimumCellSize)),
+	fUseOffscreen(useOffscreen),
+	fTrackedRamp(-1),
+	fFocusedRamp(kGreyRamp)
+{
+	_FindFields();
+	ResizeToPreferred();
+}
+
+
+BColorControl::BColorControl(BMessage* archive) :
+	BControl(archive),
+	fFields {},
+	fLayout(ReadLayout(archive)),
+	fCellSize(ReadCellSize(archive)),
+	fUseOffscreen(false),
+	fTrackedRamp(-1),
+	fFocusedRamp(kGreyRamp)
+{
+	bool useOffscreen;
+	if (archive->FindBool("_use_off", &useOffscreen) == B_OK)
+		fUseOffscreen = useOffscreen;
+	_FindFields();
+}
+
+
+BColorControl::~BColorControl()
+{
+}
+
+
+BArchivable*
+BColorControl::Instantiate(BMessage* archive)
+{
+	return validate_instantiation(archive, "BColorControl") ? new BColorControl(archive) : NULL;
+}
+
+
+status_t
+BColorControl::Archive(BMessage* archive, bool deep) const
+{
+	const status_t status = BControl::Archive(archive, deep);
+	if (status != B_OK)
+		return status;
+
+	BPrivate::ArchiveWriter writer(archive);
+	if (!writer.Keep("_layout", ReadLayout(&writer.Source()) == fLayout))
+		archive->AddInt32("_layout", fLayout);
+	if (!writer.Keep("_csize", ReadCellSize(&writer.Source()) == fCellSize))
+		archive->AddFloat("_csize", fCellSize);
+	writer.Bool("_use_off", fUseOffscreen, false);
+	return writer.Status();
+}
+
+
+// #pragma mark - text fields
+
+
+// Takes the fields of an archive and makes those that it does not have.
+void
+BColorControl::_FindFields()
+{
+	for (BView* child = ChildAt(0); child != NULL; child = child->NextSibling()) {
+		BTextControl* field = dynamic_cast<BTextControl*>(child);
+		for (int32 i = 0; field != NULL && field->Name() != NULL && i < 3; i++) {
+			if (fFields[i] == NULL && strcmp(field->Name(), kFieldNames[i]) == 0)
+				fFields[i] = field;
+		}
+	}
+
+	bool created = false;
+	for (int32 i = 0; i < 3; i++) {
+		if (fFields[i] != NULL)
+			continue;
+		fFields[i] = _CreateField(i);
+		AddChild(fFields[i]);
+		created = true;
+	}
+	if (created) {
+		_PlaceFields();
+		_WriteFields();
+	}
+}
+
+
+BTextControl*
+BColorControl::_CreateField(int32 component)
+{
+	float labelWidth = 0;
+	for (const char* label : kFieldLabels)
+		labelWidth = std::max(labelWidth, label_width(this, label));
+	const float divider = labelWidth + kFieldGap;
+	const BRect frame(0, 0, divider + label_width(this, "999999"), kFieldHeight);
+
+	BTextControl* field = new BTextControl(frame, kFieldNames[component], kFieldLabels[component],
+		"0", new BMessage(kFieldInvoked));
+	field->SetDivider(divider);
+	field->SetAlignment(B_ALIGN_LEFT, B_ALIGN_RIGHT);
+	field->SetEnabled(IsEnabled());
+	for (uint32 character = 0; character < 256; character++) {
+		if (character < '0' || character > '9')
+			field->TextView()->DisallowChar(character);
+	}
+	field->TextView()->SetMaxBytes(3);
+	return field;
+}
+
+
+// In a column at the right of the palette; beside the colour ramps where those are higher.
+void
+BColorControl::_PlaceFields()
+{
+	BRect palette = _PaletteFrame();
+	palette.InsetBy(-kBevel, -kBevel);
+	const float left = palette.right + kFieldGap;
+	const float ramp = _RampFrame(1).Height() + 1;
+
+	float top = 0;
+	float step = std::max(kFieldHeight + 1, std::ceil(palette.Height() / 3));
+	if (ramp > kFieldHeight + 1) {
+		step = ramp;
+		top = std::floor(_RampFrame(1).top + (ramp - kFieldHeight) / 2);
+	}
+	for (BTextControl* field : fFields) {
+		field->MoveTo(left, top);
+		field->ResizeTo(field->Bounds().Width(), kFieldHeight);
+		top += step;
+	}
+}
+
+
+void
+BColorControl::_WriteFields()
+{
+	for (int32 i = 0; i < 3; i++) {
+		const int32 amount = ComponentOf(Value(), i);
+		if (atoi(fFields[i]->Text()) != amount || fFields[i]->Text()[0] == '\0')
+			fFields[i]->SetText(std::to_string(amount).c_str());
+	}
+}
+
+
+// What the user typed becomes the colour, with one invocation.
+void
+BColorControl::_TakeFields()
+{
+	int32 value = 0;
+	for (int32 i = 0; i < 3; i++)
+		value = WithComponent(value, i, std::clamp(atoi(fFields[i]->Text()), 0, 255));
+	SetValue(value);
+	// A number above 255 leaves the colour at 255 but must not stay to be seen.
+	_WriteFields();
+	Invoke();
+}
+
+
+// #pragma mark - value
+
+
+void
+BColorControl::SetValue(int32 colorValue)
+{
+	// The lowest byte means nothing.
+	colorValue &= ~0xff;
+	if (colorValue == Value())
+		return;
+	SetValueNoUpdate(colorValue);
+	_WriteFields();
+	Invalidate(_PaletteFrame());
+}
+
+
+void
+BColorControl::SetValue(rgb_color color)
+{
+	SetValue(ValueOf(color));
+}
+
+
+rgb_color
+BColorControl::ValueAsColor()
+{
+	const int32 value = Value();
+	return { static_cast<uint8>(ComponentOf(value, 0)), static_cast<uint8>(ComponentOf(value, 1)),
+		static_cast<uint8>(ComponentOf(value, 2)), 255 };
+}
+
+
+void
+BColorControl::SetEnabled(bool enabled)
+{
+	BControl::SetEnabled(enabled);
+	for (BTextControl* field : fFields)
+		field->SetEnabled(enabled);
+}
+
+
+// What the ramp's marker shows; -1 for the grey ramp when the colour is no grey.
+int32
+BColorControl::_RampValue(int32 ramp) const
+{
+	if (ramp != kGreyRamp)
+		return ComponentOf(Value(), ramp - 1);
+	const int32 red = ComponentOf(Value(), 0);
+	const bool isGrey = red == ComponentOf(Value(), 1) && red == ComponentOf(Value(), 2);
+	return isGrey ? red : -1;
+}
+
+
+// A change by the user; the grey ramp sets all three components.
+void
+BColorControl::_ChangeRamp(int32 ramp, int32 amount)
+{
+	amount = std::clamp<int32>(amount, 0, 255);
+	int32 value = Value();
+	for (int32 i = 0; i < 3; i++) {
+		if (ramp == kGreyRamp || ramp == i + 1)
+			value = WithComponent(value, i, amount);
+	}
+	SetValue(value);
+	Invoke();
+}
+
+
+// #pragma mark - geometry
+
+
+int32
+BColorControl::_Rows() const
+{
+	return 256 / fLayout;
+}
+
+
+// Inside the bevel.
+BRect
+BColorControl::_PaletteFrame() const
+{
+	return BRect(kBevel, kBevel, kBevel + fLayout * fCellSize, kBevel + _Rows() * fCellSize - 1);
+}
+
+
+BRect
+BColorControl::_RampFrame(int32 ramp) const
+{
+	const BRect palette = _PaletteFrame();
+	const float height = (palette.Height() + 1) / kRampCount;
+	return BRect(palette.left, std::floor(palette.top + ramp * height), palette.right,
+		std::floor(palette.top + (ramp + 1) * height) - 1);
+}
+
+
+int32
+BColorControl::_RampAt(BPoint where) const
+{
+	for (int32 ramp = 0; ramp < kRampCount; ramp++) {
+		if (_RampFrame(ramp).Contains(where))
+			return ramp;
+	}
+	return -1;
+}
+
+
+void
+BColorControl::SetCellSize(float size)
+{
+	fCellSize = std::max(size, kMinimumCellSize);
+	_PlaceFields();
+	ResizeToPreferred();
+	Invalidate();
+}
+
+
+float
+BColorControl::CellSize() const
+{
+	return fCellSize;
+}
+
+
+void
+BColorControl::SetLayout(color_control_layout layout)
+{
+	fLayout = CheckedLayout(layout);
+	_PlaceFields();
+	ResizeToPreferred();
+	Invalidate();
+}
+
+
+color_control_layout
+BColorControl::Layout() const
+{
+	return fLayout;
+}
+
+
+void
+BColorControl::GetPreferredSize(float* _width, float* _height)
+{
+	const BRect palette = _PaletteFrame();
+	if (_width != NULL)
+		*_width = palette.right + kBevel + kFieldGap + fFields[0]->Bounds().Width();
+	if (_height != NULL)
+		*_height = std::max(palette.bottom + kBevel, fFields[2]->Frame().bottom);
+}
+
+
+void
+BColorControl::ResizeToPreferred()
+{
+	BControl::ResizeToPreferred();
+}
+
+
+// #pragma mark - drawing
+
+
+void
+BColorControl::Draw(BRect updateRect)
+{
+	const rgb_color base = Look::BaseColor(this);
+	BRect frame = _PaletteFrame();
+	frame.InsetBy(-kBevel, -kBevel);
+	Look::DrawFieldFrame(this, frame, base, IsEnabled() ? Look::kNormal : Look::kDisabled);
+	for (int32 ramp = 0; ramp < kRampCount; ramp++) {
+		if (_RampFrame(ramp).Intersects(updateRect))
+			_DrawRamp(ramp);
+	}
+
+	if (IsFocus() && IsEnabled() && Window()->IsActive()) {
+		const rgb_color color = Look::NavigationColor();
+		Look::DrawRing(this, _RampFrame(fFocusedRamp), color, color);
+	}
+}
+
+
+void
+BColorControl::_DrawRamp(int32 ramp)
+{
+	const BRect frame = _RampFrame(ramp);
+	const rgb_color base = Look::BaseColor(this);
+	const int32 columns = static_cast<int32>(frame.Width()) + 1;
+
+	BeginLineArray(columns);
+	for (int32 column = 0; column < columns; column++) {
+		const uint8 amount = static_cast<uint8>(column * 255 / std::max<int32>(columns - 1, 1));
+		rgb_color color = { 0, 0, 0, 255 };
+		if (ramp == kGreyRamp || ramp == 1)
+			color.red = amount;
+		if (ramp == kGreyRamp || ramp == 2)
+			color.green = amount;
+		if (ramp == kGreyRamp || ramp == 3)
+			color.blue = amount;
+		if (!IsEnabled())
+			color = mix_color(color, base, 128);
+		AddLine(BPoint(frame.left + column, frame.top), BPoint(frame.left + column, frame.bottom),
+			color);
+	}
+	EndLineArray();
+
+	const int32 amount = _RampValue(ramp);
+	if (amount < 0)
+		return;
+	const float x = std::floor(frame.left + amount * frame.Width() / 255 + 0.5f);
+	Look::DrawColorMarker(this, frame, x, IsEnabled() ? Look::kNormal : Look::kDisabled);
+}
+
+
+// #pragma mark - mouse and keys
+
+
+void
+BColorControl::MouseDown(BPoint where)
+{
+	const int32 ramp = _RampAt(where);
+	if (!IsEnabled() || ramp < 0) {
+		BControl::MouseDown(where);
+		return;
+	}
+
+	fTrackedRamp = ramp;
+	if (fFocusedRamp != ramp) {
+		fFocusedRamp = ramp;
+		Invalidate(_PaletteFrame());
+	}
+	SetTracking(true);
+	SetMouseEventMask(B_POINTER_EVENTS, B_LOCK_WINDOW_FOCUS | B_NO_POINTER_HISTORY);
+	_TrackTo(where);
+}
+
+
+void
+BColorControl::MouseMoved(BPoint where, uint32 transit, const BMessage* dragMessage)
+{
+	if (IsTracking())
+		_TrackTo(where);
+}
+
+
+void
+BColorControl::MouseUp(BPoint where)
+{
+	SetTracking(false);
+	fTrackedRamp = -1;
+}
+
+
+void
+BColorControl::_TrackTo(BPoint where)
+{
+	const BRect frame = _RampFrame(fTrackedRamp);
+	const float part = std::clamp((where.x - frame.left) / frame.Width(), 0.0f, 1.0f);
+	_ChangeRamp(fTrackedRamp, static_cast<int32>(part * 255));
+}
+
+
+void
+BColorControl::KeyDown(const char* bytes, int32 numBytes)
+{
+	if (!IsEnabled() || numBytes != 1) {
+		BControl::KeyDown(bytes, numBytes);
+		return;
+	}
+
+	int32 repeats = 0;
+	if (const BMessage* message = Window()->CurrentMessage()) {
+		if (message->FindInt32("be:key_repeat", &repeats) != B_OK)
+			repeats = 0;
+	}
+	const int32 step = repeats > kRepeatsBeforeFast ? kFastStep : 1;
+	// From a colour that is no grey, the grey ramp starts at its red.
+	int32 amount = _RampValue(fFocusedRamp);
+	if (amount < 0)
+		amount = ComponentOf(Value(), 0);
+
+	switch (bytes[0]) {
+		case B_UP_ARROW:
+		case B_DOWN_ARROW: {
+			const int32 direction = bytes[0] == B_UP_ARROW ? -1 : 1;
+			fFocusedRamp = std::clamp<int32>(fFocusedRamp + direction, 0, kRampCount - 1);
+			Invalidate(_PaletteFrame());
+			break;
+		}
+
+		case B_LEFT_ARROW:
+			_ChangeRamp(fFocusedRamp, amount - step);
+			break;
+		case B_RIGHT_ARROW:
+			_ChangeRamp(fFocusedRamp, amount + step);
+			break;
+		default:
+			// Not BControl's: Space and Enter have no other value to switch to.
+			BView::KeyDown(bytes, numBytes);
+			break;
+	}
+}
+
+
+// #pragma mark - hooks
+
+
+void
+BColorControl::MessageReceived(BMessage* message)
+{
+	if (message->what == kFieldInvoked)
+		_TakeFields();
+	else if (!message->WasDropped() || !_TakeDroppedColor(message))
+		BControl::MessageReceived(message);
+}
+
+
+// Any field of a dropped message that holds a colour will do.
+bool
+BColorControl::_TakeDroppedColor(BMessage* message)
+{
+	char* name;
+	type_code type;
+	int32 count;
+	const void* data;
+	ssize_t size;
+	if (!IsEnabled() || message->GetInfo(B_RGB_COLOR_TYPE, 0, &name, &type, &count) != B_OK
+		|| message->FindData(name, B_RGB_COLOR_TYPE, &data, &size) != B_OK
+		|| size != static_cast<ssize_t>(sizeof(rgb_color))) {
+		return false;
+	}
+	SetValue(*static_cast<const rgb_color*>(data));
+	Invoke(message);
+	return true;
+}
+
+
+void
+BColorControl::AttachedToWindow()
+{
+	BControl::AttachedToWindow();
+	for (BTextControl* field : fFields)
+		field->SetTarget(this);
+}
+
+
+void
+BColorControl::DetachedFromWindow()
+{
+	fTrackedRamp = -1;
+	BControl::DetachedFromWindow();
+}
+
+
+void
+BColorControl::AllAttached()
+{
+	// The fields have taken the height that a text control has by itself.
+	if (!BPrivate::is_revived(this)) {
+		_PlaceFields();
+		ResizeToPreferred();
+	}
+	BControl::AllAttached();
+}
+
+
+void
+BColorControl::AllDetached()
+{
+	BControl::AllDetached();
+}
+
+
+void
+BColorControl::FrameMoved(BPoint newPosition)
+{
+	BControl::FrameMoved(newPosition);
+}
+
+
+void
+BColorControl::FrameResized(float newWidth, float newHeight)
+{
+	BControl::FrameResized(newWidth, newHeight);
+}
+
+
+void
+BColorControl::WindowActivated(bool active)
+{
+	BControl::WindowActivated(active);
+}
+
+
+void
+BColorControl::MakeFocus(bool focused)
+{
+	BControl::MakeFocus(focused);
+}
+
+
+status_t
+BColorControl::Invoke(BMessage* message)
+{
+	return BControl::Invoke(message);
+}
+
+
+BHandler*
+BColorControl::ResolveSpecifier(
+	BMessage* message, int32 index, BMessage* specifier, int32 what, const char* property)
+{
+	return BControl::ResolveSpecifier(message, index, specifier, what, property);
+}
+
+
+status_t
+BColorControl::GetSupportedSuites(BMessage* message)
+{
+	return BControl::GetSupportedSuites(message);
+}
+
+
+status_t
+BColorControl::Perform(perform_code code, void* data)
+{
+	return BControl::Perform(code, data);
+}
