@@ -63,20 +63,21 @@ private:
 	BAlert(const BAlert&) = delete;
 	BAlert& operator=(const BAlert&) = delete;
 
-	void _Init(const char* text, const char* const labels[3], button_width width,
-		button_spacing spacing, alert_type type);
-	void _AddButtons(BView* master, const char* const labels[3]);
-	void _PlaceButtons(BView* master);
-	void _PlaceText(BView* master);
+	struct Wait;
+
+	void _Init(const char* text, const char* const labels[]);
+	void _LayOut();
+	float _SizeButtons();
+	void _FindViews();
+	bool _HandleShortcut(BMessage* message);
 	void _Answer(int32 which);
 
-	struct Wait;
-	std::shared_ptr<Wait> fWait; // shared with a Go() that waits in another thread
-	std::unique_ptr<BInvoker> fInvoker;
+	std::shared_ptr<Wait> fWait; // shared with the Go() that waits in another thread
+	std::unique_ptr<BInvoker> fInvoker; // of a Go() that does not wait
 	BTextView* fTextView; // child
-	BButton* fButtons[3]; // children, NULL when there are fewer
+	BButton* fButtons[3]; // children, NULL where there are fewer
 	char fKeys[3]; // 0: none
 	alert_type fType;
-	button_width fWidth;
+	button_width fButtonWidth;
 	button_spacing fSpacing;
 };

@@ -43,23 +43,17 @@ ReadBorder(const BMessage* archive)
 } // namespace
 
 
-BBox::BBox(
-	BRect frame, const char* name, uint32 resizingMode, uint32 flags, border_style border) :
-	BView(frame, name, resizingMode, flags | B_WILL_DRAW | B_FRAME_EVENTS),
-	fLabelView(NULL),
-	fOldBounds(Bounds()),
-	fBorder(border)
+BBox::BBox(BRect frame, const char* name, uint32 resizingMode, uint32 flags, border_style border) :
+	BView(frame, name, resizingMode, flags | B_WILL_DRAW | B_FRAME_EVENTS), fLabelView(NULL),
+	fOldBounds(Bounds()), fBorder(border)
 {
 	SetFont(be_bold_font);
 }
 
 
 BBox::BBox(BMessage* archive) :
-	BView(archive),
-	fLabel(BPrivate::read_text(archive, "_label")),
-	fLabelView(NULL),
-	fOldBounds(Bounds()),
-	fBorder(ReadBorder(archive))
+	BView(archive), fLabel(BPrivate::read_text(archive, "_label")), fLabelView(NULL),
+	fOldBounds(Bounds()), fBorder(ReadBorder(archive))
 {
 	bool labelIsView;
 	if (archive->FindBool("_lblview", &labelIsView) == B_OK)

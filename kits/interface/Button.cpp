@@ -85,8 +85,8 @@ BButton::Draw(BRect updateRect)
 
 	const float width = StringWidth(Label());
 	const float left = std::floor(bounds.left + (bounds.Width() - width) / 2 + 0.5f);
-	const float baseline
-		= BPrivate::centered_baseline(LabelMetrics(this), bounds.top, bounds.bottom);
+	const float baseline =
+		BPrivate::centered_baseline(LabelMetrics(this), bounds.top, bounds.bottom);
 
 	const rgb_color color = HighColor();
 	const rgb_color low = LowColor();
@@ -315,8 +315,8 @@ BButton::GetPreferredSize(float* _width, float* _height)
 {
 	const float growth = fIsDefault ? kDefaultGrowth : 0;
 	if (_width != NULL) {
-		*_width
-			= std::max(kMinimumWidth, kLabelPadding + BPrivate::label_width(this, Label())) + growth;
+		*_width =
+			std::max(kMinimumWidth, kLabelPadding + BPrivate::label_width(this, Label())) + growth;
 	}
 	if (_height != NULL)
 		*_height = LabelMetrics(this).lineHeight + kVerticalPadding + growth;

@@ -98,12 +98,8 @@ BColorControl::BColorControl(BPoint leftTop, color_control_layout layout, float 
 	const char* name, BMessage* message, bool useOffscreen) :
 	BControl(BRect(leftTop, leftTop), name, NULL, message, B_FOLLOW_LEFT | B_FOLLOW_TOP,
 		B_WILL_DRAW | B_NAVIGABLE),
-	fFields {},
-	fLayout(CheckedLayout(layout)),
-	fCellSize(std::max(cellSize, kMinimumCellSize)),
-	fUseOffscreen(useOffscreen),
-	fTrackedRamp(-1),
-	fFocusedRamp(kGreyRamp)
+	fFields {}, fLayout(CheckedLayout(layout)), fCellSize(std::max(cellSize, kMinimumCellSize)),
+	fUseOffscreen(useOffscreen), fTrackedRamp(-1), fFocusedRamp(kGreyRamp)
 {
 	_FindFields();
 	ResizeToPreferred();
@@ -111,13 +107,8 @@ BColorControl::BColorControl(BPoint leftTop, color_control_layout layout, float 
 
 
 BColorControl::BColorControl(BMessage* archive) :
-	BControl(archive),
-	fFields {},
-	fLayout(ReadLayout(archive)),
-	fCellSize(ReadCellSize(archive)),
-	fUseOffscreen(false),
-	fTrackedRamp(-1),
-	fFocusedRamp(kGreyRamp)
+	BControl(archive), fFields {}, fLayout(ReadLayout(archive)), fCellSize(ReadCellSize(archive)),
+	fUseOffscreen(false), fTrackedRamp(-1), fFocusedRamp(kGreyRamp)
 {
 	bool useOffscreen;
 	if (archive->FindBool("_use_off", &useOffscreen) == B_OK)
@@ -194,8 +185,8 @@ BColorControl::_CreateField(int32 component)
 	const float divider = labelWidth + kFieldGap;
 	const BRect frame(0, 0, divider + label_width(this, "999999"), kFieldHeight);
 
-	BTextControl* field = new BTextControl(frame, kFieldNames[component], kFieldLabels[component],
-		"0", new BMessage(kFieldInvoked));
+	BTextControl* field = new BTextControl(
+		frame, kFieldNames[component], kFieldLabels[component], "0", new BMessage(kFieldInvoked));
 	field->SetDivider(divider);
 	field->SetAlignment(B_ALIGN_LEFT, B_ALIGN_RIGHT);
 	field->SetEnabled(IsEnabled());

@@ -32,24 +32,16 @@ enum { kEnabledProperty = 0, kLabelProperty, kValueProperty };
 BControl::BControl(BRect frame, const char* name, const char* label, BMessage* message,
 	uint32 resizingMode, uint32 flags) :
 	BView(frame, name, resizingMode, flags),
-	BInvoker(message, NULL),
-	fLabel(label != NULL ? label : ""),
-	fValue(B_CONTROL_OFF),
-	fEnabled(true),
-	fFocusChanging(false),
-	fTracking(false),
+	BInvoker(message, NULL), fLabel(label != NULL ? label : ""), fValue(B_CONTROL_OFF),
+	fEnabled(true), fFocusChanging(false), fTracking(false),
 	fWantsNavigation((flags & B_NAVIGABLE) != 0)
 {
 }
 
 
 BControl::BControl(BMessage* archive) :
-	BView(archive),
-	fLabel(BPrivate::read_text(archive, "_label")),
-	fValue(B_CONTROL_OFF),
-	fEnabled(true),
-	fFocusChanging(false),
-	fTracking(false),
+	BView(archive), fLabel(BPrivate::read_text(archive, "_label")), fValue(B_CONTROL_OFF),
+	fEnabled(true), fFocusChanging(false), fTracking(false),
 	fWantsNavigation((Flags() & B_NAVIGABLE) != 0)
 {
 	BMessage message;
@@ -171,8 +163,8 @@ BControl::_HandleProperty(BMessage* message)
 	const char* property;
 	if (message->GetCurrentSpecifier(&index, &specifier, &form, &property) != B_OK)
 		return false;
-	const int32 match
-		= BPropertyInfo(sProperties).FindMatch(message, index, &specifier, form, property);
+	const int32 match =
+		BPropertyInfo(sProperties).FindMatch(message, index, &specifier, form, property);
 	if (match < 0)
 		return false;
 

@@ -15,16 +15,13 @@ namespace Look = BPrivate::Look;
 BPictureButton::BPictureButton(BRect frame, const char* name, BMessage* message, uint32 behavior,
 	uint32 resizingMode, uint32 flags) :
 	BControl(frame, name, NULL, message, resizingMode, flags),
-	fBehavior(behavior),
-	fPressed(false)
+	fBehavior(behavior), fPressed(false)
 {
 }
 
 
 BPictureButton::BPictureButton(BMessage* archive) :
-	BControl(archive),
-	fBehavior(B_ONE_STATE_BUTTON),
-	fPressed(false)
+	BControl(archive), fBehavior(B_ONE_STATE_BUTTON), fPressed(false)
 {
 	// The pictures' own fields are never looked up, and so come out as they came in.
 	int32 behavior;
@@ -64,12 +61,11 @@ BPictureButton::Draw(BRect updateRect)
 	const BRect bounds = Bounds();
 	const bool down = fPressed || Value() != B_CONTROL_OFF;
 	Look::DrawRaised(this, bounds, Look::BaseColor(this),
-		(IsEnabled() ? Look::kNormal : Look::kDisabled)
-			| (down ? Look::kPressed : Look::kNormal));
+		(IsEnabled() ? Look::kNormal : Look::kDisabled) | (down ? Look::kPressed : Look::kNormal));
 	if (Label() != NULL) {
 		const float left = std::floor((bounds.Width() + 1 - StringWidth(Label())) / 2);
-		const float baseline = BPrivate::centered_baseline(
-			BPrivate::LabelMetrics(this), bounds.top, bounds.bottom);
+		const float baseline =
+			BPrivate::centered_baseline(BPrivate::LabelMetrics(this), bounds.top, bounds.bottom);
 		BPrivate::draw_label(this, Label(), BPoint(left, baseline), IsEnabled());
 	}
 	if (IsFocus() && IsEnabled() && Window()->IsActive()) {

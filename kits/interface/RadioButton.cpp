@@ -101,8 +101,8 @@ BRadioButton::Draw(BRect updateRect)
 		LabelMetrics(this), kBoxPlace.y, kBoxPlace.y + Look::kCheckBoxSize - 1);
 	BPrivate::draw_label(this, Label(), BPoint(kLabelLeft, baseline), IsEnabled());
 	if (IsFocus() && IsEnabled() && Window()->IsActive()) {
-		Look::DrawFocusLine(this, kLabelLeft,
-			kLabelLeft + BPrivate::label_width(this, Label()) - 1, baseline);
+		Look::DrawFocusLine(
+			this, kLabelLeft, kLabelLeft + BPrivate::label_width(this, Label()) - 1, baseline);
 	}
 }
 

@@ -35,32 +35,21 @@ DefaultBarColor()
 
 BSlider::BSlider(BRect frame, const char* name, const char* label, BMessage* message,
 	int32 minValue, int32 maxValue, thumb_style thumbType, uint32 resizingMode, uint32 flags) :
-	BSlider(frame, name, label, message, minValue, maxValue, B_HORIZONTAL, thumbType,
-		resizingMode, flags)
+	BSlider(frame, name, label, message, minValue, maxValue, B_HORIZONTAL, thumbType, resizingMode,
+		flags)
 {
 }
 
 
 BSlider::BSlider(BRect frame, const char* name, const char* label, BMessage* message,
-	int32 minValue, int32 maxValue, orientation posture, thumb_style thumbType,
-	uint32 resizingMode, uint32 flags) :
+	int32 minValue, int32 maxValue, orientation posture, thumb_style thumbType, uint32 resizingMode,
+	uint32 flags) :
 	BControl(frame, name, label, message, resizingMode, flags),
-	fHasMinLabel(false),
-	fHasMaxLabel(false),
-	fSnoozeAmount(kDefaultSnooze),
-	fKeyIncrement(1),
-	fHashMarkCount(0),
-	fHashMarks(B_HASH_MARKS_NONE),
-	fStyle(thumbType),
-	fOrientation(posture),
-	fMinValue(minValue),
-	fMaxValue(maxValue),
-	fBarColor(DefaultBarColor()),
-	fFillColor(Look::StatusBarColor()),
-	fUseFillColor(false),
-	fBarThickness(kDefaultThickness),
-	fValueBefore(0),
-	fKeyIsDown(false)
+	fHasMinLabel(false), fHasMaxLabel(false), fSnoozeAmount(kDefaultSnooze), fKeyIncrement(1),
+	fHashMarkCount(0), fHashMarks(B_HASH_MARKS_NONE), fStyle(thumbType), fOrientation(posture),
+	fMinValue(minValue), fMaxValue(maxValue), fBarColor(DefaultBarColor()),
+	fFillColor(Look::StatusBarColor()), fUseFillColor(false), fBarThickness(kDefaultThickness),
+	fValueBefore(0), fKeyIsDown(false)
 {
 	if (minValue <= maxValue)
 		SetValueNoUpdate(std::clamp<int32>(0, minValue, maxValue));
@@ -68,23 +57,11 @@ BSlider::BSlider(BRect frame, const char* name, const char* label, BMessage* mes
 
 
 BSlider::BSlider(BMessage* archive) :
-	BControl(archive),
-	fHasMinLabel(false),
-	fHasMaxLabel(false),
-	fSnoozeAmount(kDefaultSnooze),
-	fKeyIncrement(1),
-	fHashMarkCount(11),
-	fHashMarks(B_HASH_MARKS_NONE),
-	fStyle(B_BLOCK_THUMB),
-	fOrientation(B_HORIZONTAL),
-	fMinValue(0),
-	fMaxValue(100),
-	fBarColor(DefaultBarColor()),
-	fFillColor(Look::StatusBarColor()),
-	fUseFillColor(false),
-	fBarThickness(kDefaultThickness),
-	fValueBefore(0),
-	fKeyIsDown(false)
+	BControl(archive), fHasMinLabel(false), fHasMaxLabel(false), fSnoozeAmount(kDefaultSnooze),
+	fKeyIncrement(1), fHashMarkCount(11), fHashMarks(B_HASH_MARKS_NONE), fStyle(B_BLOCK_THUMB),
+	fOrientation(B_HORIZONTAL), fMinValue(0), fMaxValue(100), fBarColor(DefaultBarColor()),
+	fFillColor(Look::StatusBarColor()), fUseFillColor(false), fBarThickness(kDefaultThickness),
+	fValueBefore(0), fKeyIsDown(false)
 {
 	_ReadArchive(archive);
 }

@@ -115,16 +115,16 @@ BSlider::ThumbFrame() const
 	if (fStyle == B_TRIANGLE_THUMB) {
 		if (horizontal) {
 			const float top = bar.bottom - 1;
-			return BRect(place - kTriangleHalf, top, place + kTriangleHalf,
-				top + kTriangleHeight - 1);
+			return BRect(
+				place - kTriangleHalf, top, place + kTriangleHalf, top + kTriangleHeight - 1);
 		}
 		const float left = bar.right - 1;
 		return BRect(
 			left, place - kTriangleHalf, left + kTriangleHeight - 1, place + kTriangleHalf);
 	}
 	if (horizontal) {
-		return BRect(
-			place - kBlockHalf, bar.top - kBlockReach, place + kBlockHalf, bar.bottom + kBlockReach);
+		return BRect(place - kBlockHalf, bar.top - kBlockReach, place + kBlockHalf,
+			bar.bottom + kBlockReach);
 	}
 	return BRect(
 		bar.left - kBlockReach, place - kBlockHalf, bar.right + kBlockReach, place + kBlockHalf);
@@ -150,8 +150,8 @@ BSlider::_GetMinimumSize(float* _width, float* _height) const
 		*_height = across + (hasTop ? line : 0) + (_HasLimitLabels() ? line : 0);
 		return;
 	}
-	const int lines = (Label() != NULL) + (UpdateText() != NULL) + !fMinLabel.empty()
-		+ !fMaxLabel.empty();
+	const int lines =
+		(Label() != NULL) + (UpdateText() != NULL) + !fMinLabel.empty() + !fMaxLabel.empty();
 	*_width = std::max({ across, label, status, min, max });
 	*_height = kMinimumLength + lines * line;
 }

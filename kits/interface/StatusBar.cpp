@@ -31,29 +31,19 @@ constexpr float kTextGap = 4; // between a text and its label
 BStatusBar::BStatusBar(
 	BRect frame, const char* name, const char* label, const char* trailingLabel) :
 	BView(frame, name, B_FOLLOW_LEFT | B_FOLLOW_TOP, B_WILL_DRAW | B_FRAME_EVENTS),
-	fLabel(label != NULL ? label : ""),
-	fTrailingLabel(trailingLabel != NULL ? trailingLabel : ""),
-	fMax(kDefaultMax),
-	fCurrent(0),
-	fBarHeight(kDefaultBarHeight),
-	fBarColor(Look::StatusBarColor()),
-	fCustomBarHeight(false),
-	fCustomBarColor(false)
+	fLabel(label != NULL ? label : ""), fTrailingLabel(trailingLabel != NULL ? trailingLabel : ""),
+	fMax(kDefaultMax), fCurrent(0), fBarHeight(kDefaultBarHeight),
+	fBarColor(Look::StatusBarColor()), fCustomBarHeight(false), fCustomBarColor(false)
 {
 }
 
 
 BStatusBar::BStatusBar(BMessage* archive) :
-	BView(archive),
-	fLabel(BPrivate::read_text(archive, "_label")),
+	BView(archive), fLabel(BPrivate::read_text(archive, "_label")),
 	fTrailingLabel(BPrivate::read_text(archive, "_tlabel")),
 	fText(BPrivate::read_text(archive, "_text")),
-	fTrailingText(BPrivate::read_text(archive, "_ttext")),
-	fMax(kDefaultMax),
-	fCurrent(0),
-	fBarHeight(kDefaultBarHeight),
-	fBarColor(Look::StatusBarColor()),
-	fCustomBarHeight(false),
+	fTrailingText(BPrivate::read_text(archive, "_ttext")), fMax(kDefaultMax), fCurrent(0),
+	fBarHeight(kDefaultBarHeight), fBarColor(Look::StatusBarColor()), fCustomBarHeight(false),
 	fCustomBarColor(false)
 {
 	float number;

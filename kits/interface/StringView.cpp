@@ -48,19 +48,14 @@ CountLines(std::string_view text)
 BStringView::BStringView(
 	BRect frame, const char* name, const char* text, uint32 resizingMode, uint32 flags) :
 	BView(frame, name, resizingMode, flags | B_FULL_UPDATE_ON_RESIZE),
-	fText(text != NULL ? text : ""),
-	fHasText(text != NULL),
-	fAlign(B_ALIGN_LEFT),
+	fText(text != NULL ? text : ""), fHasText(text != NULL), fAlign(B_ALIGN_LEFT),
 	fTruncation(B_NO_TRUNCATION)
 {
 }
 
 
 BStringView::BStringView(BMessage* archive) :
-	BView(archive),
-	fHasText(false),
-	fAlign(B_ALIGN_LEFT),
-	fTruncation(B_NO_TRUNCATION)
+	BView(archive), fHasText(false), fAlign(B_ALIGN_LEFT), fTruncation(B_NO_TRUNCATION)
 {
 	const char* text;
 	if (archive->FindString("_text", &text) == B_OK) {
@@ -190,8 +185,8 @@ BStringView::Draw(BRect updateRect)
 		return;
 
 	const LabelMetrics metrics(this);
-	float baseline = Bounds().bottom - metrics.descent
-		- (CountLines(fText) - 1) * metrics.lineHeight;
+	float baseline =
+		Bounds().bottom - metrics.descent - (CountLines(fText) - 1) * metrics.lineHeight;
 	ForEachLine(fText, [&](const std::string& line) {
 		_DrawLine(line.c_str(), baseline);
 		baseline += metrics.lineHeight;

@@ -23,22 +23,14 @@ constexpr float kLabelMargin = 6; // that a label keeps from the tab's edges whe
 
 
 BTab::BTab(BView* contentsView) :
-	fView(contentsView),
-	fOwner(NULL),
-	fEnabled(true),
-	fSelected(false),
-	fFocus(false)
+	fView(contentsView), fOwner(NULL), fEnabled(true), fSelected(false), fFocus(false)
 {
 }
 
 
 BTab::BTab(BMessage* archive) :
-	BArchivable(archive),
-	fView(NULL),
-	fOwner(NULL),
-	fSource(std::make_unique<BPrivate::ArchiveSource>(archive)),
-	fEnabled(true),
-	fSelected(false),
+	BArchivable(archive), fView(NULL), fOwner(NULL),
+	fSource(std::make_unique<BPrivate::ArchiveSource>(archive)), fEnabled(true), fSelected(false),
 	fFocus(false)
 {
 	// Some writers put false there, also for a disabled tab: the field's presence tells.
@@ -230,8 +222,7 @@ PlaceLabel(BView* owner, const char* label, BRect frame)
 	owner->TruncateString(&result.text, B_TRUNCATE_END, room);
 	result.width = BPrivate::label_width(owner, result.text.String());
 	result.left = std::floor((frame.left + frame.right + 1 - result.width) / 2);
-	result.baseline
-		= BPrivate::centered_baseline(LabelMetrics(owner), frame.top + 1, frame.bottom);
+	result.baseline = BPrivate::centered_baseline(LabelMetrics(owner), frame.top + 1, frame.bottom);
 	return result;
 }
 
@@ -244,8 +235,7 @@ BTab::DrawLabel(BView* owner, BRect frame)
 	if (Label()[0] == '\0')
 		return;
 	const PlacedLabel label = PlaceLabel(owner, Label(), frame);
-	BPrivate::draw_label(
-		owner, label.text.String(), BPoint(label.left, label.baseline), fEnabled);
+	BPrivate::draw_label(owner, label.text.String(), BPoint(label.left, label.baseline), fEnabled);
 }
 
 

@@ -33,23 +33,16 @@ constexpr const char* kContainerName = "view container";
 BTabView::BTabView(
 	BRect frame, const char* name, button_width width, uint32 resizingMode, uint32 flags) :
 	BView(frame, name, resizingMode, flags),
-	fContainer(NULL),
-	fWidthSetting(width),
-	fTabHeight(LabelMetrics(this).lineHeight + kHeightPadding),
-	fSelection(-1),
-	fFocus(-1)
+	fContainer(NULL), fWidthSetting(width),
+	fTabHeight(LabelMetrics(this).lineHeight + kHeightPadding), fSelection(-1), fFocus(-1)
 {
 	_InitContainer();
 }
 
 
 BTabView::BTabView(BMessage* archive) :
-	BView(archive),
-	fContainer(NULL),
-	fWidthSetting(B_WIDTH_AS_USUAL),
-	fTabHeight(LabelMetrics(this).lineHeight + kHeightPadding),
-	fSelection(-1),
-	fFocus(-1)
+	BView(archive), fContainer(NULL), fWidthSetting(B_WIDTH_AS_USUAL),
+	fTabHeight(LabelMetrics(this).lineHeight + kHeightPadding), fSelection(-1), fFocus(-1)
 {
 	int16 width;
 	if (archive->FindInt16("_but_width", &width) == B_OK)
@@ -206,8 +199,7 @@ status_t
 BTabView::_EmptyContainer(BMessage* archive) const
 {
 	BMessage container;
-	if (fContainer->CountChildren() == 0
-		|| archive->FindMessage("_views", 0, &container) != B_OK) {
+	if (fContainer->CountChildren() == 0 || archive->FindMessage("_views", 0, &container) != B_OK) {
 		return B_OK;
 	}
 	container.RemoveName("_views");
@@ -623,8 +615,8 @@ void
 BTabView::_InvalidateTabs()
 {
 	const BRect bounds = Bounds();
-	Invalidate(BRect(
-		bounds.left, bounds.top, bounds.right, bounds.top + fTabHeight + kContainerInset));
+	Invalidate(
+		BRect(bounds.left, bounds.top, bounds.right, bounds.top + fTabHeight + kContainerInset));
 }
 
 

@@ -61,8 +61,7 @@ read_message(const BMessage* archive, const char* name)
 
 
 void
-write_message(
-	ArchiveWriter& writer, BMessage* archive, const char* name, const BMessage* message)
+write_message(ArchiveWriter& writer, BMessage* archive, const char* name, const BMessage* message)
 {
 	const std::unique_ptr<BMessage> read = read_message(&writer.Source(), name);
 	const bool unchanged = read == nullptr || message == nullptr

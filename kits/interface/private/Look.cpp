@@ -20,12 +20,8 @@ struct Line {
 class PlainPen {
 public:
 	explicit PlainPen(BView* view) :
-		fView(view),
-		fHigh(view->HighColor()),
-		fLow(view->LowColor()),
-		fPen(view->PenLocation()),
-		fPenSize(view->PenSize()),
-		fMode(view->DrawingMode())
+		fView(view), fHigh(view->HighColor()), fLow(view->LowColor()), fPen(view->PenLocation()),
+		fPenSize(view->PenSize()), fMode(view->DrawingMode())
 	{
 		if (fPenSize != 1.0f)
 			fView->SetPenSize(1.0f);
@@ -80,22 +76,24 @@ Fill(BView* view, BRect frame, rgb_color color)
 void
 DrawRoundRing(BView* view, BRect frame, rgb_color color)
 {
-	DrawLines(view, {
-		{ BPoint(frame.left + 1, frame.top), BPoint(frame.right - 1, frame.top), color },
-		{ BPoint(frame.right, frame.top + 1), BPoint(frame.right, frame.bottom - 1), color },
-		{ BPoint(frame.left + 1, frame.bottom), BPoint(frame.right - 1, frame.bottom), color },
-		{ BPoint(frame.left, frame.top + 1), BPoint(frame.left, frame.bottom - 1), color },
-	});
+	DrawLines(view,
+		{
+			{ BPoint(frame.left + 1, frame.top), BPoint(frame.right - 1, frame.top), color },
+			{ BPoint(frame.right, frame.top + 1), BPoint(frame.right, frame.bottom - 1), color },
+			{ BPoint(frame.left + 1, frame.bottom), BPoint(frame.right - 1, frame.bottom), color },
+			{ BPoint(frame.left, frame.top + 1), BPoint(frame.left, frame.bottom - 1), color },
+		});
 }
 
 
 void
 DrawLeftTop(BView* view, BRect frame, rgb_color color)
 {
-	DrawLines(view, {
-		{ frame.LeftBottom(), frame.LeftTop(), color },
-		{ frame.LeftTop(), frame.RightTop(), color },
-	});
+	DrawLines(view,
+		{
+			{ frame.LeftBottom(), frame.LeftTop(), color },
+			{ frame.LeftTop(), frame.RightTop(), color },
+		});
 }
 
 
@@ -107,18 +105,21 @@ DrawBrokenRing(BView* view, BRect frame, rgb_color leftTop, rgb_color rightBotto
 		DrawRing(view, frame, leftTop, rightBottom);
 		return;
 	}
-	DrawLines(view, {
-		{ frame.LeftBottom(), frame.LeftTop(), leftTop },
-		{ frame.RightTop(), frame.RightBottom(), rightBottom },
-		{ frame.RightBottom(), frame.LeftBottom(), rightBottom },
-	});
+	DrawLines(view,
+		{
+			{ frame.LeftBottom(), frame.LeftTop(), leftTop },
+			{ frame.RightTop(), frame.RightBottom(), rightBottom },
+			{ frame.RightBottom(), frame.LeftBottom(), rightBottom },
+		});
 	if (gap.left > frame.left) {
-		DrawLines(view, { { frame.LeftTop(),
-			BPoint(std::min(gap.left - 1, frame.right), frame.top), leftTop } });
+		DrawLines(view,
+			{ { frame.LeftTop(), BPoint(std::min(gap.left - 1, frame.right), frame.top),
+				leftTop } });
 	}
 	if (gap.right < frame.right) {
-		DrawLines(view, { { BPoint(std::max(gap.right + 1, frame.left), frame.top),
-			frame.RightTop(), leftTop } });
+		DrawLines(view,
+			{ { BPoint(std::max(gap.right + 1, frame.left), frame.top), frame.RightTop(),
+				leftTop } });
 	}
 }
 
@@ -289,12 +290,13 @@ DrawRing(BView* view, BRect frame, rgb_color leftTop, rgb_color rightBottom)
 {
 	if (!frame.IsValid())
 		return;
-	DrawLines(view, {
-		{ frame.LeftBottom(), frame.LeftTop(), leftTop },
-		{ frame.LeftTop(), frame.RightTop(), leftTop },
-		{ frame.RightTop(), frame.RightBottom(), rightBottom },
-		{ frame.RightBottom(), frame.LeftBottom(), rightBottom },
-	});
+	DrawLines(view,
+		{
+			{ frame.LeftBottom(), frame.LeftTop(), leftTop },
+			{ frame.LeftTop(), frame.RightTop(), leftTop },
+			{ frame.RightTop(), frame.RightBottom(), rightBottom },
+			{ frame.RightBottom(), frame.LeftBottom(), rightBottom },
+		});
 }
 
 
@@ -315,8 +317,8 @@ void
 DrawPlainFrame(BView* view, BRect frame, rgb_color base, BRect gap)
 {
 	PlainPen pen(view);
-	DrawBrokenRing(view, frame, tint_color(base, B_LIGHTEN_MAX_TINT),
-		tint_color(base, B_DARKEN_3_TINT), gap);
+	DrawBrokenRing(
+		view, frame, tint_color(base, B_LIGHTEN_MAX_TINT), tint_color(base, B_DARKEN_3_TINT), gap);
 }
 
 
@@ -328,16 +330,18 @@ DrawSeparator(BView* view, BRect frame, rgb_color base)
 	const rgb_color light = tint_color(base, B_LIGHTEN_2_TINT);
 	if (frame.Width() >= frame.Height()) {
 		const float y = std::floor((frame.top + frame.bottom) / 2);
-		DrawLines(view, {
-			{ BPoint(frame.left, y), BPoint(frame.right, y), dark },
-			{ BPoint(frame.left, y + 1), BPoint(frame.right, y + 1), light },
-		});
+		DrawLines(view,
+			{
+				{ BPoint(frame.left, y), BPoint(frame.right, y), dark },
+				{ BPoint(frame.left, y + 1), BPoint(frame.right, y + 1), light },
+			});
 	} else {
 		const float x = std::floor((frame.left + frame.right) / 2);
-		DrawLines(view, {
-			{ BPoint(x, frame.top), BPoint(x, frame.bottom), dark },
-			{ BPoint(x + 1, frame.top), BPoint(x + 1, frame.bottom), light },
-		});
+		DrawLines(view,
+			{
+				{ BPoint(x, frame.top), BPoint(x, frame.bottom), dark },
+				{ BPoint(x + 1, frame.top), BPoint(x + 1, frame.bottom), light },
+			});
 	}
 }
 
@@ -420,12 +424,13 @@ DrawCheckBox(BView* view, BPoint leftTop, rgb_color base, uint32 state)
 
 	// Each stroke of the cross is two pixels wide.
 	const BPoint right(1, 0);
-	DrawLines(view, {
-		{ m.LeftTop(), m.RightBottom() - right, mark },
-		{ m.LeftTop() + right, m.RightBottom(), mark },
-		{ m.RightTop(), m.LeftBottom() + right, mark },
-		{ m.RightTop() - right, m.LeftBottom(), mark },
-	});
+	DrawLines(view,
+		{
+			{ m.LeftTop(), m.RightBottom() - right, mark },
+			{ m.LeftTop() + right, m.RightBottom(), mark },
+			{ m.RightTop(), m.LeftBottom() + right, mark },
+			{ m.RightTop() - right, m.LeftBottom(), mark },
+		});
 }
 
 
@@ -475,8 +480,7 @@ void
 DrawProgressBar(BView* view, BRect frame, rgb_color base, rgb_color barColor, float filled)
 {
 	PlainPen pen(view);
-	DrawRing(
-		view, frame, tint_color(base, B_DARKEN_1_TINT), tint_color(base, B_LIGHTEN_2_TINT));
+	DrawRing(view, frame, tint_color(base, B_DARKEN_1_TINT), tint_color(base, B_LIGHTEN_2_TINT));
 	DrawRing(view, Inset(frame, 1), tint_color(base, B_DARKEN_4_TINT), base);
 
 	BRect inside = Inset(frame, 2);
@@ -507,23 +511,20 @@ DrawSliderBar(BView* view, BRect frame, rgb_color base, rgb_color barColor, uint
 	// An alpha of 0 is kept in archives, but a bar is always seen.
 	barColor.alpha = 255;
 	const rgb_color color = disabled ? Blend(barColor, base) : barColor;
-	DrawRing(
-		view, frame, tint_color(base, B_DARKEN_1_TINT), tint_color(base, B_LIGHTEN_MAX_TINT));
+	DrawRing(view, frame, tint_color(base, B_DARKEN_1_TINT), tint_color(base, B_LIGHTEN_MAX_TINT));
 	DrawRing(view, Inset(frame, 1), tint_color(color, B_DARKEN_2_TINT), color);
 	Fill(view, Inset(frame, 2), color);
 }
 
 
 void
-DrawSliderBlockThumb(
-	BView* view, BRect frame, orientation direction, rgb_color base, uint32 state)
+DrawSliderBlockThumb(BView* view, BRect frame, orientation direction, rgb_color base, uint32 state)
 {
 	PlainPen pen(view);
 	const bool disabled = (state & kDisabled) != 0;
 	const bool focused = (state & kFocused) != 0 && !disabled;
-	const rgb_color edge = focused
-		? NavigationColor()
-		: tint_color(base, disabled ? B_DARKEN_2_TINT : B_DARKEN_4_TINT);
+	const rgb_color edge = focused ? NavigationColor()
+								   : tint_color(base, disabled ? B_DARKEN_2_TINT : B_DARKEN_4_TINT);
 	DrawRoundRing(view, frame, edge);
 	DrawRing(view, Inset(frame, 1), tint_color(base, B_LIGHTEN_MAX_TINT),
 		tint_color(base, disabled ? B_DARKEN_1_TINT : B_DARKEN_2_TINT));
@@ -535,16 +536,18 @@ DrawSliderBlockThumb(
 	const rgb_color light = tint_color(base, B_LIGHTEN_MAX_TINT);
 	if (direction == B_HORIZONTAL) {
 		const float x = std::floor((frame.left + frame.right) / 2);
-		DrawLines(view, {
-			{ BPoint(x, frame.top + 3), BPoint(x, frame.bottom - 3), dark },
-			{ BPoint(x + 1, frame.top + 3), BPoint(x + 1, frame.bottom - 3), light },
-		});
+		DrawLines(view,
+			{
+				{ BPoint(x, frame.top + 3), BPoint(x, frame.bottom - 3), dark },
+				{ BPoint(x + 1, frame.top + 3), BPoint(x + 1, frame.bottom - 3), light },
+			});
 	} else {
 		const float y = std::floor((frame.top + frame.bottom) / 2);
-		DrawLines(view, {
-			{ BPoint(frame.left + 3, y), BPoint(frame.right - 3, y), dark },
-			{ BPoint(frame.left + 3, y + 1), BPoint(frame.right - 3, y + 1), light },
-		});
+		DrawLines(view,
+			{
+				{ BPoint(frame.left + 3, y), BPoint(frame.right - 3, y), dark },
+				{ BPoint(frame.left + 3, y + 1), BPoint(frame.right - 3, y + 1), light },
+			});
 	}
 }
 
@@ -556,11 +559,9 @@ DrawSliderTriangleThumb(
 	PlainPen pen(view);
 	const bool disabled = (state & kDisabled) != 0;
 	const bool focused = (state & kFocused) != 0 && !disabled;
-	const rgb_color edge = focused
-		? NavigationColor()
-		: tint_color(base, disabled ? B_DARKEN_2_TINT : B_DARKEN_4_TINT);
-	const rgb_color face
-		= tint_color(base, (state & kPressed) != 0 ? B_NO_TINT : B_LIGHTEN_2_TINT);
+	const rgb_color edge = focused ? NavigationColor()
+								   : tint_color(base, disabled ? B_DARKEN_2_TINT : B_DARKEN_4_TINT);
+	const rgb_color face = tint_color(base, (state & kPressed) != 0 ? B_NO_TINT : B_LIGHTEN_2_TINT);
 	const float x = std::floor((frame.left + frame.right) / 2);
 	const float y = std::floor((frame.top + frame.bottom) / 2);
 
@@ -574,11 +575,12 @@ DrawSliderTriangleThumb(
 	}
 	view->SetHighColor(face);
 	view->FillTriangle(tip, left, right);
-	DrawLines(view, {
-		{ tip, left, edge },
-		{ left, right, edge },
-		{ right, tip, edge },
-	});
+	DrawLines(view,
+		{
+			{ tip, left, edge },
+			{ left, right, edge },
+			{ right, tip, edge },
+		});
 }
 
 
@@ -587,10 +589,11 @@ DrawHashMark(BView* view, BPoint from, BPoint to, rgb_color base, uint32 state)
 {
 	const BPoint beside = from.x == to.x ? BPoint(1, 0) : BPoint(0, 1);
 	const bool disabled = (state & kDisabled) != 0;
-	DrawLines(view, {
-		{ from, to, tint_color(base, disabled ? B_DARKEN_1_TINT : B_DARKEN_3_TINT) },
-		{ from + beside, to + beside, tint_color(base, B_LIGHTEN_MAX_TINT) },
-	});
+	DrawLines(view,
+		{
+			{ from, to, tint_color(base, disabled ? B_DARKEN_1_TINT : B_DARKEN_3_TINT) },
+			{ from + beside, to + beside, tint_color(base, B_LIGHTEN_MAX_TINT) },
+		});
 }
 
 
@@ -623,18 +626,20 @@ DrawTab(BView* view, BRect frame, rgb_color base, uint32 state)
 
 	Fill(view, BRect(frame.left + 1, frame.top + 2, frame.right - 1, bottom), face);
 	Fill(view, BRect(frame.left + 3, frame.top + 1, frame.right - 3, frame.top + 1), face);
-	DrawLines(view, {
-		// A dark outline with cut corners, and the light that falls on it from the left top.
-		{ BPoint(frame.left, bottom), BPoint(frame.left, frame.top + 3), darker },
-		{ BPoint(frame.left, frame.top + 3), BPoint(frame.left + 3, frame.top), darker },
-		{ BPoint(frame.left + 3, frame.top), BPoint(frame.right - 3, frame.top), darker },
-		{ BPoint(frame.right - 3, frame.top), BPoint(frame.right, frame.top + 3), darker },
-		{ BPoint(frame.right, frame.top + 3), BPoint(frame.right, bottom), darker },
-		{ BPoint(frame.left + 1, bottom), BPoint(frame.left + 1, frame.top + 3), light },
-		{ BPoint(frame.left + 1, frame.top + 3), BPoint(frame.left + 3, frame.top + 1), light },
-		{ BPoint(frame.left + 3, frame.top + 1), BPoint(frame.right - 3, frame.top + 1), light },
-		{ BPoint(frame.right - 1, frame.top + 3), BPoint(frame.right - 1, bottom), dark },
-	});
+	DrawLines(view,
+		{
+			// A dark outline with cut corners, and the light that falls on it from the left top.
+			{ BPoint(frame.left, bottom), BPoint(frame.left, frame.top + 3), darker },
+			{ BPoint(frame.left, frame.top + 3), BPoint(frame.left + 3, frame.top), darker },
+			{ BPoint(frame.left + 3, frame.top), BPoint(frame.right - 3, frame.top), darker },
+			{ BPoint(frame.right - 3, frame.top), BPoint(frame.right, frame.top + 3), darker },
+			{ BPoint(frame.right, frame.top + 3), BPoint(frame.right, bottom), darker },
+			{ BPoint(frame.left + 1, bottom), BPoint(frame.left + 1, frame.top + 3), light },
+			{ BPoint(frame.left + 1, frame.top + 3), BPoint(frame.left + 3, frame.top + 1), light },
+			{ BPoint(frame.left + 3, frame.top + 1), BPoint(frame.right - 3, frame.top + 1),
+				light },
+			{ BPoint(frame.right - 1, frame.top + 3), BPoint(frame.right - 1, bottom), dark },
+		});
 }
 
 
@@ -678,16 +683,16 @@ DrawArrow(BView* view, BRect frame, Direction direction, rgb_color color)
 		const float reach = step;
 		switch (direction) {
 			case Direction::kUp:
-				view->StrokeLine(BPoint(x - reach, y - before + step),
-					BPoint(x + reach, y - before + step));
+				view->StrokeLine(
+					BPoint(x - reach, y - before + step), BPoint(x + reach, y - before + step));
 				break;
 			case Direction::kDown:
 				view->StrokeLine(
 					BPoint(x - reach, y + after - step), BPoint(x + reach, y + after - step));
 				break;
 			case Direction::kLeft:
-				view->StrokeLine(BPoint(x - before + step, y - reach),
-					BPoint(x - before + step, y + reach));
+				view->StrokeLine(
+					BPoint(x - before + step, y - reach), BPoint(x - before + step, y + reach));
 				break;
 			case Direction::kRight:
 				view->StrokeLine(
@@ -713,8 +718,8 @@ void
 DrawScrollBarFrame(BView* view, BRect frame, rgb_color base, uint32 state)
 {
 	PlainPen pen(view);
-	const rgb_color edge
-		= (state & kFocused) != 0 ? NavigationColor() : tint_color(base, B_DARKEN_2_TINT);
+	const rgb_color edge =
+		(state & kFocused) != 0 ? NavigationColor() : tint_color(base, B_DARKEN_2_TINT);
 	DrawRing(view, frame, edge, edge);
 }
 
@@ -747,13 +752,13 @@ DrawScrollBarArea(BView* view, BRect frame, orientation direction, rgb_color bas
 		Fill(view, frame, tint_color(base, B_LIGHTEN_1_TINT));
 		return;
 	}
-	Fill(view, frame,
-		tint_color(base, (state & kPressed) != 0 ? B_DARKEN_2_TINT : B_DARKEN_1_TINT));
+	Fill(
+		view, frame, tint_color(base, (state & kPressed) != 0 ? B_DARKEN_2_TINT : B_DARKEN_1_TINT));
 	// The shadow that the frame throws on the sunken ground.
 	const rgb_color shadow = tint_color(base, B_DARKEN_2_TINT);
-	DrawLines(view, { direction == B_VERTICAL
-			? Line { frame.LeftTop(), frame.LeftBottom(), shadow }
-			: Line { frame.LeftTop(), frame.RightTop(), shadow } });
+	DrawLines(view,
+		{ direction == B_VERTICAL ? Line { frame.LeftTop(), frame.LeftBottom(), shadow }
+								  : Line { frame.LeftTop(), frame.RightTop(), shadow } });
 }
 
 
@@ -764,17 +769,18 @@ DrawScrollBarThumb(BView* view, BRect frame, orientation direction, rgb_color ba
 	const rgb_color edge = tint_color(base, B_DARKEN_2_TINT);
 	const rgb_color light = tint_color(base, B_LIGHTEN_MAX_TINT);
 	const rgb_color dark = tint_color(base, B_DARKEN_1_TINT);
-	const rgb_color face
-		= tint_color(base, (state & kPressed) != 0 ? B_NO_TINT : B_LIGHTEN_2_TINT);
+	const rgb_color face = tint_color(base, (state & kPressed) != 0 ? B_NO_TINT : B_LIGHTEN_2_TINT);
 
 	// Only the lines across the bar belong to the thumb; the bar's frame has the other two.
 	if (direction == B_VERTICAL) {
-		DrawLines(view, { { frame.LeftTop(), frame.RightTop(), edge },
-			{ frame.LeftBottom(), frame.RightBottom(), edge } });
+		DrawLines(view,
+			{ { frame.LeftTop(), frame.RightTop(), edge },
+				{ frame.LeftBottom(), frame.RightBottom(), edge } });
 		frame.InsetBy(0, 1);
 	} else {
-		DrawLines(view, { { frame.LeftTop(), frame.LeftBottom(), edge },
-			{ frame.RightTop(), frame.RightBottom(), edge } });
+		DrawLines(view,
+			{ { frame.LeftTop(), frame.LeftBottom(), edge },
+				{ frame.RightTop(), frame.RightBottom(), edge } });
 		frame.InsetBy(1, 0);
 	}
 	DrawRing(view, frame, light, dark);
@@ -789,17 +795,21 @@ DrawScrollBarThumb(BView* view, BRect frame, orientation direction, rgb_color ba
 	for (int grip = -1; grip <= 1; grip++) {
 		const float offset = grip * 3.0f;
 		if (direction == B_VERTICAL) {
-			DrawLines(view, {
-				{ BPoint(frame.left + 3, y + offset), BPoint(frame.right - 3, y + offset), edge },
-				{ BPoint(frame.left + 3, y + offset + 1), BPoint(frame.right - 3, y + offset + 1),
-					light },
-			});
+			DrawLines(view,
+				{
+					{ BPoint(frame.left + 3, y + offset), BPoint(frame.right - 3, y + offset),
+						edge },
+					{ BPoint(frame.left + 3, y + offset + 1),
+						BPoint(frame.right - 3, y + offset + 1), light },
+				});
 		} else {
-			DrawLines(view, {
-				{ BPoint(x + offset, frame.top + 3), BPoint(x + offset, frame.bottom - 3), edge },
-				{ BPoint(x + offset + 1, frame.top + 3), BPoint(x + offset + 1, frame.bottom - 3),
-					light },
-			});
+			DrawLines(view,
+				{
+					{ BPoint(x + offset, frame.top + 3), BPoint(x + offset, frame.bottom - 3),
+						edge },
+					{ BPoint(x + offset + 1, frame.top + 3),
+						BPoint(x + offset + 1, frame.bottom - 3), light },
+				});
 		}
 	}
 }
@@ -823,10 +833,9 @@ void
 DrawMenuBarFrame(BView* view, BRect frame, rgb_color base)
 {
 	PlainPen pen(view);
-	DrawRing(
-		view, frame, tint_color(base, B_LIGHTEN_MAX_TINT), tint_color(base, B_DARKEN_1_TINT));
-	DrawLines(view,
-		{ { frame.LeftBottom(), frame.RightBottom(), tint_color(base, B_DARKEN_2_TINT) } });
+	DrawRing(view, frame, tint_color(base, B_LIGHTEN_MAX_TINT), tint_color(base, B_DARKEN_1_TINT));
+	DrawLines(
+		view, { { frame.LeftBottom(), frame.RightBottom(), tint_color(base, B_DARKEN_2_TINT) } });
 }
 
 
@@ -846,12 +855,13 @@ DrawMenuCheckMark(BView* view, BRect frame, uint32 state)
 	const rgb_color color = TextColor(state);
 	const float x = std::floor((frame.left + frame.right) / 2) - 1;
 	const float y = std::floor((frame.top + frame.bottom) / 2) + 3;
-	DrawLines(view, {
-		{ BPoint(x - 2, y - 2), BPoint(x, y), color },
-		{ BPoint(x - 2, y - 3), BPoint(x, y - 1), color },
-		{ BPoint(x, y), BPoint(x + 5, y - 5), color },
-		{ BPoint(x, y - 1), BPoint(x + 5, y - 6), color },
-	});
+	DrawLines(view,
+		{
+			{ BPoint(x - 2, y - 2), BPoint(x, y), color },
+			{ BPoint(x - 2, y - 3), BPoint(x, y - 1), color },
+			{ BPoint(x, y), BPoint(x + 5, y - 5), color },
+			{ BPoint(x, y - 1), BPoint(x + 5, y - 6), color },
+		});
 }
 
 

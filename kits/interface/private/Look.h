@@ -77,8 +77,7 @@ void DrawFieldFrame(BView* view, BRect frame, rgb_color base, uint32 state = kNo
 
 // A sunken bar with its border of two pixels, filled up to the column `filled`, that included; a
 // column left of the bar's inside fills nothing.
-void DrawProgressBar(
-	BView* view, BRect frame, rgb_color base, rgb_color barColor, float filled);
+void DrawProgressBar(BView* view, BRect frame, rgb_color base, rgb_color barColor, float filled);
 
 // The channel of a slider, one part of it, in the given colour.
 void DrawSliderBar(BView* view, BRect frame, rgb_color base, rgb_color barColor, uint32 state);
