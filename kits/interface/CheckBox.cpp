@@ -15,7 +15,7 @@ using BPrivate::LabelMetrics;
 
 namespace {
 
-constexpr BPoint kBoxPlace(1, 3);
+const BPoint kBoxPlace(1, 3);
 constexpr float kLabelLeft = 20;
 constexpr float kHorizontalPadding = 22;
 constexpr float kVerticalPadding = 6;

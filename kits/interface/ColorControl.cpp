@@ -329,7 +329,8 @@ BColorControl::_Rows() const
 BRect
 BColorControl::_PaletteFrame() const
 {
-	return BRect(kBevel, kBevel, kBevel + fLayout * fCellSize, kBevel + _Rows() * fCellSize - 1);
+	return BRect(kBevel, kBevel, kBevel + static_cast<int32>(fLayout) * fCellSize,
+		kBevel + _Rows() * fCellSize - 1);
 }
 
 

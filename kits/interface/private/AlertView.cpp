@@ -13,7 +13,7 @@ namespace BPrivate {
 namespace {
 
 constexpr float kStripeWidth = 30;
-constexpr BPoint kIconPlace(18, 6);
+const BPoint kIconPlace(18, 6);
 constexpr float kIconSize = 32; // pixels
 
 constexpr rgb_color kBlack = { 0, 0, 0, 255 };

@@ -1,5 +1,6 @@
 #include "interface/private/ControlArchive.h"
 
+#include <DataIO.h>
 #include <Message.h>
 
 #include "interface/private/ViewArchive.h"
@@ -52,11 +53,10 @@ read_message(const BMessage* archive, const char* name)
 
 	const void* bytes;
 	ssize_t size;
-	if (archive->FindData(name, B_RAW_TYPE, &bytes, &size) == B_OK
-		&& message->Unflatten(static_cast<const char*>(bytes), size) == B_OK) {
-		return message;
-	}
-	return nullptr;
+	if (archive->FindData(name, B_RAW_TYPE, &bytes, &size) != B_OK)
+		return nullptr;
+	BMemoryIO stream(bytes, static_cast<size_t>(size));
+	return message->Unflatten(&stream) == B_OK ? std::move(message) : nullptr;
 }
 
 

@@ -206,14 +206,14 @@ TextColor(uint32 state)
 rgb_color
 NavigationColor()
 {
-	return keyboard_navigation_color();
+	return ui_color(B_KEYBOARD_NAVIGATION_COLOR);
 }
 
 
 rgb_color
 MarkColor()
 {
-	return keyboard_navigation_color();
+	return ui_color(B_KEYBOARD_NAVIGATION_COLOR);
 }
 
 
