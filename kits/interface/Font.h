@@ -188,6 +188,9 @@ public:
 	void PrintToStream() const;
 
 private:
+	void _GetBoxes(const char charArray[], int32 numChars, font_metric_mode mode,
+		escapement_delta* delta, bool asString, BRect boxes[]) const;
+
 	uint32 fFamilyAndStyle; // the font engine's code; 0 is its plain font
 	float fSize;
 	float fShear;

@@ -63,5 +63,7 @@ private:
 	friend class BShapeIterator;
 	friend class BPrivate::ShapeAccess;
 
+	void _Start();
+
 	std::unique_ptr<BPrivate::PathData> fPath;
 };

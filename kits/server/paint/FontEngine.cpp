@@ -398,6 +398,14 @@ FontEngine::BoundingBox(uint32 code) const
 }
 
 
+void
+FontEngine::GetRanges(uint32 code, uint64 ranges[2]) const
+{
+	std::lock_guard locker(fTables->lock);
+	fTables->list.FaceAt(code).GetRanges(ranges);
+}
+
+
 bool
 FontEngine::Covers(uint32 code, uint32 character) const
 {

@@ -65,6 +65,8 @@ public:
 
 	void GetHeight(const FontSpec& spec, font_height* _height) const;
 	BRect BoundingBox(uint32 code) const; // ems
+	// The bits of the OpenType table of covered Unicode ranges, lowest first.
+	void GetRanges(uint32 code, uint64 ranges[2]) const;
 	// Whether the face itself has the character; others stand in for what it lacks.
 	bool Covers(uint32 code, uint32 character) const;
 

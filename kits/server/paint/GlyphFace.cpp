@@ -5,6 +5,7 @@
 #include FT_FREETYPE_H
 #include FT_ADVANCES_H
 #include FT_OUTLINE_H
+#include FT_TRUETYPE_TABLES_H
 #include <algorithm>
 #include <string.h>
 
@@ -135,6 +136,20 @@ GlyphFace::BoundingBox() const
 	const float unit = 1.0f / face->units_per_EM;
 	return BRect(face->bbox.xMin * unit, -face->bbox.yMax * unit, face->bbox.xMax * unit,
 		-face->bbox.yMin * unit);
+}
+
+
+void
+GlyphFace::GetRanges(uint64 ranges[2]) const
+{
+	ranges[0] = ranges[1] = 0;
+	FT_Face face = _Open();
+	if (face == nullptr)
+		return;
+	if (auto* table = static_cast<TT_OS2*>(FT_Get_Sfnt_Table(face, FT_SFNT_OS2))) {
+		ranges[0] = (uint64)(uint32)table->ulUnicodeRange2 << 32 | (uint32)table->ulUnicodeRange1;
+		ranges[1] = (uint64)(uint32)table->ulUnicodeRange4 << 32 | (uint32)table->ulUnicodeRange3;
+	}
 }
 
 

@@ -46,6 +46,7 @@ public:
 
 	font_height Height() const; // for a size of 1
 	BRect BoundingBox() const;
+	void GetRanges(uint64 ranges[2]) const;
 	// 0 when the face has none.
 	uint32 GlyphOf(uint32 character) const;
 	float Advance(uint32 glyph) const;

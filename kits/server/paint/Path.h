@@ -3,7 +3,7 @@
 
 #include <vector>
 
-#include <Point.h>
+#include <Rect.h>
 
 namespace BPrivate {
 
@@ -14,6 +14,18 @@ struct PathData {
 	std::vector<Verb> verbs;
 	std::vector<BPoint> points; // one for a move or line, three for a curve, none for a close
 };
+
+// The smallest rectangle round all points, control points included; not valid without any.
+inline BRect
+BoundsOf(const PathData& path)
+{
+	BRect bounds;
+	for (BPoint point : path.points) {
+		const BRect single(point, point);
+		bounds = bounds.IsValid() ? bounds | single : single;
+	}
+	return bounds;
+}
 
 
 } // namespace BPrivate
