@@ -92,7 +92,11 @@ private:
 	void _Init(BRect bounds, color_space space, uint32 flags, int32 bytesPerRow);
 	void _InitFrom(const BBitmap& source, uint32 flags);
 	void _MakeWindow();
+	void _LoadSurface();
 	void _StoreSurface();
+	status_t _Import(const uint8* data, int32 length, int32 bytesPerRow, color_space space,
+		int32 fromX, int32 fromY, int32 toX, int32 toY, int32 width, int32 height);
+	static uint8 _WhiteIndex();
 	void _Clear();
 
 	uint8* fBits; // ours, by malloc()
