@@ -5,9 +5,8 @@
 #include <cstdio>
 #include <cstdlib>
 
-#include "backend/FolderDrop.h"
+#include "backend/ScreenPainter.h"
 #include "backend/headless/HeadlessWindow.h"
-#include "backend/headless/ScreenPainter.h"
 
 namespace BPrivate {
 
@@ -127,8 +126,7 @@ HeadlessBackend::RemoveWindow(HeadlessWindow* window)
 	std::erase(fWindows, window);
 	if (fPressed == window)
 		fPressed = nullptr;
-	if (fDragOver == window)
-		fDragOver = nullptr;
+	fDrag.WindowGone(window);
 	if (fActive == window)
 		SetActive(_NextActive());
 }
@@ -235,12 +233,7 @@ HeadlessBackend::Inject(const BackendEvent& event)
 			break;
 
 		case Type::FolderDropped:
-			if (fDragSession == 0)
-				break;
-			entered.type = Type::DragFinished;
-			entered.flag = drop_on_folder(fDrag, event.text);
-			fDragSession = 0;
-			fSink->HandleEvent(entered);
+			fDrag.DropOnFolder(entered, *fSink);
 			break;
 
 		case Type::WindowChanged:
@@ -271,12 +264,12 @@ HeadlessBackend::_InjectPointer(BackendEvent event)
 	using Type = BackendEvent::Type;
 
 	fPointer = event.where;
-	if (fDragSession != 0) {
-		_DesktopDrag(event);
+	auto* under = static_cast<HeadlessWindow*>(WindowAt(event.where));
+	if (fDrag.IsActive()) {
+		fDrag.Follow(event, under, *fSink);
 		return;
 	}
 
-	auto* under = static_cast<HeadlessWindow*>(WindowAt(event.where));
 	event.window = fPressed != nullptr ? fPressed : under;
 	if (event.type == Type::ButtonPressed && fPressed == nullptr)
 		fPressed = under;
@@ -300,50 +293,9 @@ HeadlessBackend::SetDragPicture(const ScreenPicture* picture, BPoint offset)
 bool
 HeadlessBackend::StartDesktopDrag(const DataOffer& offer, int32 session, uint32 buttons)
 {
-	fDrag = offer;
-	fDragSession = session;
-	fDragOver = nullptr;
+	fDrag.Start(offer, session);
 	fPressed = nullptr;
 	return true;
-}
-
-
-// A drag in the desktop's hands comes home as a drag of another program would come.
-void
-HeadlessBackend::_DesktopDrag(const BackendEvent& event)
-{
-	using Type = BackendEvent::Type;
-
-	auto* under = event.type == Type::PointerLeft
-		? nullptr
-		: static_cast<HeadlessWindow*>(WindowAt(event.where));
-	BackendEvent told = event;
-	told.session = fDragSession;
-	const auto tell = [&](Type type, HeadlessWindow* window) {
-		told.type = type;
-		told.window = window;
-		fSink->HandleEvent(told);
-	};
-
-	if (under != fDragOver) {
-		if (fDragOver != nullptr)
-			tell(Type::DragLeft, fDragOver);
-		fDragOver = under;
-		if (under != nullptr)
-			tell(Type::DragEntered, under);
-	}
-	if (event.buttons != 0 || event.type != Type::ButtonReleased) {
-		if (under != nullptr)
-			tell(Type::DragMoved, under);
-		return;
-	}
-
-	fDragSession = 0;
-	fDragOver = nullptr;
-	if (under != nullptr)
-		tell(Type::Dropped, under);
-	told.flag = under != nullptr;
-	tell(Type::DragFinished, nullptr);
 }
 
 

@@ -1,9 +1,8 @@
 // HeadlessBackend: a screen in memory, for tests, scripts and pictures.
 #pragma once
 
-#include <atomic>
-
 #include "backend/Backend.h"
+#include "backend/SimulatedDrag.h"
 #include "backend/headless/TaskQueue.h"
 
 namespace BPrivate {
@@ -59,7 +58,6 @@ public:
 
 private:
 	void _InjectPointer(BackendEvent event);
-	void _DesktopDrag(const BackendEvent& event);
 	void _Report(BackendEvent::Type type, HeadlessWindow* window);
 	HeadlessWindow* _NextActive() const;
 
@@ -77,9 +75,7 @@ private:
 
 	ScreenPicture fDragPicture;
 	BPoint fDragOffset;
-	DataOffer fDrag; // of the drag that the desktop has in hand
-	int32 fDragSession = 0; // 0 for none
-	HeadlessWindow* fDragOver = nullptr;
+	SimulatedDrag fDrag;
 };
 
 

@@ -96,7 +96,8 @@ PointerInput::_ForeignDrag(const BackendEvent& event)
 {
 	using Type = BackendEvent::Type;
 
-	const bool ours = fOnDesktop && fSession != nullptr && event.session == fSession->Serial();
+	const bool ours = fOnDesktop && fSession != nullptr
+		&& (event.session == fSession->Serial() || event.type == Type::DragLeft);
 	if (!ours && fOnDesktop)
 		return;
 	if (event.type == Type::DragEntered && !ours) {

@@ -69,6 +69,8 @@ PointerInput::_SetState(const BackendEvent& event)
 WindowReference
 PointerInput::_UnderPointer(const BackendEvent& event) const
 {
+	if (event.type == BackendEvent::Type::PointerLeft)
+		return nullptr;
 	if (fCaptured == nullptr && fSession == nullptr && event.window != nullptr)
 		return fDesktop.Find(event.window);
 	return fDesktop.WindowAt(event.where);

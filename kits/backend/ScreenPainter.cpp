@@ -1,4 +1,4 @@
-#include "backend/headless/ScreenPainter.h"
+#include "backend/ScreenPainter.h"
 
 #include <algorithm>
 #include <cstdio>
