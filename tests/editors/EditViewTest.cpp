@@ -1,0 +1,270 @@
+#include "editors/EditView.h"
+
+#include <functional>
+#include <string>
+
+#include <gtest/gtest.h>
+
+#include <Button.h>
+#include <MenuField.h>
+#include <MenuItem.h>
+#include <Message.h>
+#include <TextControl.h>
+#include <TextView.h>
+
+#include "support/TestWindow.h"
+
+namespace {
+
+
+// The panel beside a ground that holds the edited view.
+class EditViewTest : public testing::Test {
+protected:
+	EditViewTest() : window(BRect(20, 20, 739, 419))
+	{
+		panel = window.Add(new EditView);
+		ground = window.Add(new BView(
+			BRect(420, 0, 719, 399), "ground", B_FOLLOW_LEFT | B_FOLLOW_TOP, B_WILL_DRAW));
+	}
+
+	BView* Use(BView* view)
+	{
+		window.Locked([&] {
+			ground->AddChild(view);
+			EXPECT_TRUE(panel->UseView(view));
+		});
+		return view;
+	}
+
+	BView* UsePlain(uint32 mode = B_FOLLOW_LEFT | B_FOLLOW_TOP, uint32 flags = B_WILL_DRAW)
+	{
+		return Use(new BView(BRect(10, 20, 109, 79), "plain", mode, flags));
+	}
+
+	template<class Control> Control* Find(const char* label)
+	{
+		for (BView* child = panel->ChildAt(0); child != nullptr; child = child->NextSibling()) {
+			Control* control = dynamic_cast<Control*>(child);
+			if (control != nullptr && std::string(control->Label()) == label)
+				return control;
+		}
+		return nullptr;
+	}
+
+	BTextControl* Text(const char* label) { return Find<BTextControl>(label); }
+
+	void TypeOver(const char* label, const char* text)
+	{
+		BTextControl* control = Text(label);
+		window.driver.Click(control->TextView());
+		window.Locked([&] { control->TextView()->SelectAll(); });
+		window.driver.Type(text);
+		window.driver.Key("Return");
+	}
+
+	// The two resizing fields have the same label.
+	BMenu* ResizingMenu(int32 which)
+	{
+		for (BView* child = panel->ChildAt(0); child != nullptr; child = child->NextSibling()) {
+			BMenuField* field = dynamic_cast<BMenuField*>(child);
+			if (field != nullptr && std::string(field->Label()) == "Resizing:" && which-- == 0)
+				return field->Menu();
+		}
+		return nullptr;
+	}
+
+	std::string Marked(BMenu* menu)
+	{
+		BMenuItem* item = menu->FindMarked();
+		return item != nullptr ? item->Label() : "";
+	}
+
+	// Chooses as the menu does: the item marks itself and sends.
+	void Choose(BMenu* menu, const char* label)
+	{
+		window.Locked([&] {
+			BMenuItem* item = menu->FindItem(label);
+			ASSERT_NE(nullptr, item);
+			static_cast<BInvoker*>(item)->Invoke();
+		});
+	}
+
+	std::string ShownFlags() { return Find<BMenuField>("Flags:")->MenuItem()->Label(); }
+
+	TestWindow window;
+	EditView* panel;
+	BView* ground;
+};
+
+
+} // namespace
+
+
+TEST_F(EditViewTest, DeclinesNull)
+{
+	UsePlain();
+	window.Locked([&] { EXPECT_FALSE(panel->UseView(NULL)); });
+}
+
+
+TEST_F(EditViewTest, HasThePlatformClassInItsLabel)
+{
+	EXPECT_STREQ("EditView", panel->Name());
+	EXPECT_STREQ("Properties from BView", panel->Label());
+	EXPECT_EQ(330, panel->Bounds().Height());
+}
+
+
+TEST_F(EditViewTest, ShowsAndSetsTheName)
+{
+	BView* view = UsePlain();
+	EXPECT_STREQ("plain", Text("Name: ")->Text());
+	TypeOver("Name: ", "fancy");
+	EXPECT_STREQ("fancy", view->Name());
+}
+
+
+TEST_F(EditViewTest, ShowsAMissingName)
+{
+	BView* view = Use(new BView(BRect(0, 0, 9, 9), NULL, B_FOLLOW_NONE, B_WILL_DRAW));
+	EXPECT_STREQ("<unnamed>", Text("Name: ")->Text());
+	// Looking changes nothing.
+	EXPECT_EQ(NULL, view->Name());
+	TypeOver("Name: ", "now");
+	EXPECT_STREQ("now", view->Name());
+}
+
+
+TEST_F(EditViewTest, ShowsTheFrameAndFollowsIt)
+{
+	BView* view = UsePlain();
+	EXPECT_STREQ("10", Text("L:")->Text());
+	EXPECT_STREQ("20", Text("T:")->Text());
+	EXPECT_STREQ("109", Text("R:")->Text());
+	EXPECT_STREQ("79", Text("B:")->Text());
+	window.Locked([&] {
+		view->MoveBy(5, -3);
+		panel->FrameChanged();
+	});
+	EXPECT_STREQ("15", Text("L:")->Text());
+	EXPECT_STREQ("17", Text("T:")->Text());
+}
+
+
+TEST_F(EditViewTest, ANewRightEdgeResizes)
+{
+	BView* view = UsePlain();
+	TypeOver("R:", "159");
+	EXPECT_EQ(BRect(10, 20, 159, 79), view->Frame());
+}
+
+
+TEST_F(EditViewTest, ANewLeftEdgeKeepsTheRightOne)
+{
+	BView* view = UsePlain();
+	TypeOver("L:", "30");
+	EXPECT_EQ(BRect(30, 20, 109, 79), view->Frame());
+}
+
+
+TEST_F(EditViewTest, MarksTheResizingMode)
+{
+	UsePlain(B_FOLLOW_ALL_SIDES);
+	EXPECT_EQ("Left & Right", Marked(ResizingMenu(0)));
+	EXPECT_EQ("Top & Bottom", Marked(ResizingMenu(1)));
+}
+
+
+TEST_F(EditViewTest, MarksNothingForAnOddResizingMode)
+{
+	UsePlain(B_FOLLOW_NONE);
+	EXPECT_EQ("", Marked(ResizingMenu(0)));
+	EXPECT_EQ("", Marked(ResizingMenu(1)));
+}
+
+
+TEST_F(EditViewTest, SetsTheResizingMode)
+{
+	BView* view = UsePlain();
+	Choose(ResizingMenu(0), "Right");
+	EXPECT_EQ(uint32(B_FOLLOW_RIGHT | B_FOLLOW_TOP), view->ResizingMode());
+	Choose(ResizingMenu(1), "V. Center");
+	EXPECT_EQ(uint32(B_FOLLOW_RIGHT | B_FOLLOW_V_CENTER), view->ResizingMode());
+}
+
+
+TEST_F(EditViewTest, ShowsAndTogglesFlags)
+{
+	BView* view = UsePlain(B_FOLLOW_NONE, B_WILL_DRAW | B_FRAME_EVENTS);
+	EXPECT_EQ("Draw, FrEvts", ShownFlags());
+	BMenu* menu = Find<BMenuField>("Flags:")->Menu();
+	Choose(menu, "B_PULSE_NEEDED");
+	EXPECT_EQ("Draw, Pulse, FrEvts", ShownFlags());
+	EXPECT_EQ(uint32(B_WILL_DRAW | B_PULSE_NEEDED | B_FRAME_EVENTS), view->Flags());
+	Choose(menu, "B_WILL_DRAW");
+	EXPECT_EQ("Pulse, FrEvts", ShownFlags());
+}
+
+
+TEST_F(EditViewTest, FlagsThatTheMenuDoesNotShowSurvive)
+{
+	BView* view = UsePlain(B_FOLLOW_NONE, B_WILL_DRAW | 0x00010000);
+	Choose(Find<BMenuField>("Flags:")->Menu(), "B_NAVIGABLE");
+	EXPECT_EQ(uint32(B_WILL_DRAW | B_NAVIGABLE | 0x00010000), view->Flags());
+}
+
+
+TEST_F(EditViewTest, NoFlagsShowNoText)
+{
+	UsePlain(B_FOLLOW_NONE, 0);
+	EXPECT_EQ("", ShownFlags());
+}
+
+
+TEST_F(EditViewTest, PreferredKeepsTheBoundEdge)
+{
+	BView* left = Use(new BButton(BRect(100, 50, 250, 90), "b", "x", NULL));
+	window.driver.Click(Find<BButton>("preferred"));
+	EXPECT_EQ(100, left->Frame().left);
+	EXPECT_NE(250, left->Frame().right);
+
+	BView* right = Use(
+		new BButton(BRect(100, 150, 250, 190), "b", "x", NULL, B_FOLLOW_RIGHT | B_FOLLOW_BOTTOM));
+	window.driver.Click(Find<BButton>("preferred"));
+	EXPECT_EQ(250, right->Frame().right);
+	EXPECT_EQ(190, right->Frame().bottom);
+	EXPECT_NE(100, right->Frame().left);
+	EXPECT_EQ(std::to_string(static_cast<int>(right->Frame().left)), Text("L:")->Text());
+}
+
+
+TEST_F(EditViewTest, ZoomFillsTheParent)
+{
+	BView* view = UsePlain();
+	window.driver.Click(Find<BButton>("zoom"));
+	EXPECT_EQ(ground->Bounds(), view->Frame());
+	EXPECT_STREQ("299", Text("R:")->Text());
+}
+
+
+TEST_F(EditViewTest, LoadingFiresNothing)
+{
+	BView* first = UsePlain();
+	BView* second = Use(new BView(BRect(1, 2, 3.5, 4.25), "second", B_FOLLOW_NONE, 0));
+	window.Locked([&] { panel->UseView(first); });
+	EXPECT_STREQ("plain", first->Name());
+	EXPECT_STREQ("second", second->Name());
+	EXPECT_EQ(BRect(10, 20, 109, 79), first->Frame());
+}
+
+
+TEST_F(EditViewTest, ADeletedTargetIsNotTouched)
+{
+	BView* view = UsePlain();
+	window.Locked([&] {
+		view->RemoveSelf();
+		delete view;
+		panel->FrameChanged();
+	});
+	TypeOver("Name: ", "nobody");
+}

@@ -1,0 +1,450 @@
+#include "work/WorkView.h"
+
+#include <string>
+#include <vector>
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <Button.h>
+#include <Message.h>
+#include <ScrollBar.h>
+
+#include "archive/EditorCodes.h"
+#include "support/TestWindow.h"
+#include "work/HiliteView.h"
+#include "work/WorkBackgroundView.h"
+
+namespace {
+
+
+constexpr rgb_color kBlue = { 0, 0, 255, 255 };
+
+
+// Stands for the editor: notes what it is told.
+class Listener : public BView {
+public:
+	Listener() : BView(BRect(0, 0, 9, 9), "listener", B_FOLLOW_NONE, 0) {}
+
+	void MessageReceived(BMessage* message) override
+	{
+		void* view;
+		if (message->what == kSelectionChanged && message->FindPointer("what", &view) == B_OK)
+			selections.push_back(static_cast<BView*>(view));
+		else if (message->what == kSelectionMoved)
+			moves++;
+		else
+			BView::MessageReceived(message);
+	}
+
+	std::vector<BView*> selections;
+	int moves = 0;
+};
+
+
+// Tells of the presses that reach it.
+class PressedView : public BView {
+public:
+	PressedView(BRect frame, const char* name) :
+		BView(frame, name, B_FOLLOW_LEFT | B_FOLLOW_TOP, B_WILL_DRAW)
+	{
+	}
+
+	void MouseDown(BPoint) override { presses++; }
+
+	int presses = 0;
+};
+
+
+bool
+IsBlue(rgb_color color)
+{
+	return color.red == kBlue.red && color.green == kBlue.green && color.blue == kBlue.blue;
+}
+
+
+// A work view with a root that has a plain child, a button and a scroll view.
+class WorkViewTest : public testing::Test {
+protected:
+	WorkViewTest() : window(BRect(40, 40, 539, 439))
+	{
+		listener = new Listener;
+		window.Add(listener);
+		workView = new WorkView(BRect(20, 20, 449, 349), B_FOLLOW_ALL_SIDES, listener);
+		window.Add(workView);
+
+		root =
+			new BView(BRect(30, 40, 329, 239), "root", B_FOLLOW_LEFT | B_FOLLOW_TOP, B_WILL_DRAW);
+		plain = new PressedView(BRect(20, 20, 119, 79), "plain");
+		root->AddChild(plain);
+		button = new BButton(BRect(20, 100, 119, 130), "button", "Press", new BMessage('prss'));
+		root->AddChild(button);
+		target = new BView(BRect(160, 20, 240, 90), "target", B_FOLLOW_ALL_SIDES, B_WILL_DRAW);
+		scroll = new BScrollView(
+			"scroll", target, B_FOLLOW_LEFT | B_FOLLOW_TOP, 0, true, true, B_FANCY_BORDER);
+		root->AddChild(scroll);
+		window.Locked([&] { workView->SetEditView(root); });
+		listener->selections.clear();
+	}
+
+	// A point at a distance from the lower right corner of the view.
+	BPoint FromCorner(BView* view, float dx, float dy)
+	{
+		const BRect bounds = view->Bounds();
+		return BPoint(bounds.right - dx, bounds.bottom - dy);
+	}
+
+	TestWindow window;
+	Listener* listener;
+	WorkView* workView;
+	BView* root;
+	PressedView* plain;
+	BButton* button;
+	BView* target;
+	BScrollView* scroll;
+};
+
+
+} // namespace
+
+
+TEST_F(WorkViewTest, HasItsHierarchy)
+{
+	EXPECT_STREQ("WorkView", workView->Name());
+	BView* scrollTarget = workView->Target();
+	EXPECT_STREQ("scroll target", scrollTarget->Name());
+	EXPECT_EQ(0xa4000000u, scrollTarget->Flags());
+	ASSERT_EQ(2, scrollTarget->CountChildren());
+	BView* container = scrollTarget->ChildAt(0);
+	EXPECT_STREQ("container", container->Name());
+	EXPECT_EQ(BRect(0, 0, 10000, 10000), container->Frame());
+	EXPECT_EQ(0x1212u, container->ResizingMode());
+	EXPECT_EQ(root, container->ChildAt(0));
+	BView* hilite = scrollTarget->ChildAt(1);
+	EXPECT_STREQ("hilite view", hilite->Name());
+	EXPECT_EQ(0x20000000u, hilite->Flags());
+}
+
+
+TEST_F(WorkViewTest, ShowsTheRootWithAMargin)
+{
+	EXPECT_EQ(BPoint(22, 32), workView->ScrollOrigin());
+	EXPECT_EQ(BRect(30, 40, 329, 239), root->Frame());
+	window.Locked([&] {
+		const BPoint shown =
+			workView->Target()->ConvertFromScreen(root->ConvertToScreen(BPoint(0, 0)));
+		EXPECT_EQ(BPoint(8, 8), shown);
+	});
+}
+
+
+TEST_F(WorkViewTest, RangesFitTheRootAndItsMargins)
+{
+	window.Locked([&] {
+		float minimum, maximum;
+		workView->ScrollBar(B_VERTICAL)->GetRange(&minimum, &maximum);
+		EXPECT_EQ(0, minimum);
+		EXPECT_EQ(0, maximum); // the root fits
+	});
+	window.Locked([&] {
+		workView->SetEditView(
+			new BView(BRect(0, 0, 799, 599), "large", B_FOLLOW_LEFT | B_FOLLOW_TOP, B_WILL_DRAW));
+		float minimum, maximum;
+		workView->ScrollBar(B_HORIZONTAL)->GetRange(&minimum, &maximum);
+		EXPECT_EQ(799 + 16 - workView->Target()->Bounds().Width(), maximum);
+	});
+}
+
+
+TEST_F(WorkViewTest, TheFirstClickOnlySelects)
+{
+	window.driver.Click(plain);
+	EXPECT_EQ(plain, workView->SelectedView());
+	EXPECT_THAT(listener->selections, testing::ElementsAre(plain));
+	EXPECT_EQ(0, plain->presses);
+	EXPECT_EQ(BRect(20, 20, 119, 79), plain->Frame());
+}
+
+
+TEST_F(WorkViewTest, AClickOnAButtonDoesNotPressIt)
+{
+	window.driver.Click(button);
+	EXPECT_EQ(button, workView->SelectedView());
+	EXPECT_EQ(0, button->Value());
+}
+
+
+TEST_F(WorkViewTest, SelectingTheSelectedViewTellsNobody)
+{
+	window.driver.Click(plain);
+	listener->selections.clear();
+	window.Locked([&] { workView->SetSelectedView(plain); });
+	EXPECT_TRUE(listener->selections.empty());
+}
+
+
+TEST_F(WorkViewTest, ASecondaryClickReachesTheView)
+{
+	window.driver.Click(plain, 1, B_SECONDARY_MOUSE_BUTTON);
+	EXPECT_EQ(1, plain->presses);
+	EXPECT_EQ(root, workView->SelectedView());
+}
+
+
+TEST_F(WorkViewTest, AClickOnTheGroundChangesNothing)
+{
+	window.driver.Click(workView->Container(), BPoint(30 + 310, 100));
+	EXPECT_EQ(root, workView->SelectedView());
+	EXPECT_TRUE(listener->selections.empty());
+}
+
+
+TEST_F(WorkViewTest, TheCornerResizes)
+{
+	window.driver.Click(plain);
+	window.driver.Drag(plain, FromCorner(plain, 3, 3), plain, FromCorner(plain, -17, -7));
+	EXPECT_EQ(BRect(20, 20, 139, 89), plain->Frame());
+	EXPECT_GT(listener->moves, 0);
+
+	// The button is up again: further moves do nothing.
+	window.driver.MoveTo(plain, BPoint(5, 5));
+	EXPECT_EQ(BRect(20, 20, 139, 89), plain->Frame());
+}
+
+
+TEST_F(WorkViewTest, TheResizeZoneEndsAtTwelve)
+{
+	window.driver.Click(plain);
+	window.driver.Drag(plain, FromCorner(plain, 6, 6), plain, FromCorner(plain, -4, -4));
+	EXPECT_EQ(BRect(20, 20, 119, 79), plain->Frame());
+
+	window.driver.Click(plain, BPoint(5, 5));
+	window.driver.Drag(plain, FromCorner(plain, 6, 5), plain, FromCorner(plain, 5, 5));
+	EXPECT_EQ(BRect(20, 20, 120, 79), plain->Frame());
+}
+
+
+TEST_F(WorkViewTest, AHalfPixelInsideTheZoneResizes)
+{
+	window.Locked([&] {
+		workView->SetSelectedView(plain);
+		BMessage press(B_MOUSE_DOWN);
+		press.AddPoint("where", FromCorner(plain, 6, 5.5));
+		workView->HandleFilteredMouse(&press, plain, 0);
+		EXPECT_EQ(5u, workView->EventMask());
+		workView->MouseUp(BPoint(0, 0));
+		EXPECT_EQ(0u, workView->EventMask());
+
+		press.ReplacePoint("where", FromCorner(plain, 6, 6));
+		workView->HandleFilteredMouse(&press, plain, 0);
+		EXPECT_EQ(0u, workView->EventMask());
+	});
+}
+
+
+TEST_F(WorkViewTest, APressWithoutAPlaceIsIgnored)
+{
+	window.Locked([&] {
+		BMessage press(B_MOUSE_DOWN);
+		workView->HandleFilteredMouse(&press, plain, 0);
+	});
+	EXPECT_EQ(root, workView->SelectedView());
+}
+
+
+TEST_F(WorkViewTest, AFrameControledViewIsNotResized)
+{
+	window.driver.Click(target);
+	ASSERT_EQ(target, workView->SelectedView());
+	const BRect frame = target->Frame();
+	window.driver.Drag(target, FromCorner(target, 2, 2), target, FromCorner(target, -20, -20));
+	EXPECT_EQ(frame, target->Frame());
+}
+
+
+TEST_F(WorkViewTest, TheRootIsResizedByItsCorner)
+{
+	window.driver.Drag(root, FromCorner(root, 2, 2), root, FromCorner(root, 12, 22));
+	EXPECT_EQ(BRect(30, 40, 319, 219), root->Frame());
+}
+
+
+TEST_F(WorkViewTest, ArrowKeysMoveTheSelectedView)
+{
+	window.driver.Click(plain);
+	window.driver.Key("Right", 0, 3);
+	window.driver.Key("Down");
+	EXPECT_EQ(BRect(23, 21, 122, 80), plain->Frame());
+	EXPECT_EQ(4, listener->moves);
+}
+
+
+TEST_F(WorkViewTest, EachByteOfAKeyActs)
+{
+	window.driver.Click(plain);
+	window.Locked([&] {
+		const char bytes[] = { B_LEFT_ARROW, B_UP_ARROW, B_LEFT_ARROW };
+		workView->KeyDown(bytes, 3);
+	});
+	EXPECT_EQ(BRect(18, 19, 117, 78), plain->Frame());
+	EXPECT_EQ(3, listener->moves);
+}
+
+
+TEST_F(WorkViewTest, KeysAreTraced)
+{
+	window.driver.Click(plain);
+	testing::internal::CaptureStdout();
+	window.driver.Key("Left");
+	window.driver.Key("a");
+	fflush(stdout);
+	EXPECT_EQ("1c\n61\n", testing::internal::GetCapturedStdout());
+}
+
+
+TEST_F(WorkViewTest, ArrowKeysLeaveTheRootAndFrameControledViewsAlone)
+{
+	window.driver.Click(root, BPoint(290, 190));
+	window.driver.Key("Right");
+	EXPECT_EQ(BRect(30, 40, 329, 239), root->Frame());
+
+	window.driver.Click(target);
+	const BRect frame = target->Frame();
+	window.driver.Key("Right");
+	EXPECT_EQ(frame, target->Frame());
+	EXPECT_EQ(0, listener->moves);
+}
+
+
+TEST_F(WorkViewTest, DeleteSelectsTheParentFirst)
+{
+	window.driver.Click(plain);
+	listener->selections.clear();
+	window.driver.Key("Delete");
+	EXPECT_EQ(root, workView->SelectedView());
+	EXPECT_THAT(listener->selections, testing::ElementsAre(root));
+	EXPECT_EQ(2, root->CountChildren());
+	EXPECT_EQ(button, root->ChildAt(0));
+
+	window.driver.Click(button);
+	window.driver.Key("Backspace");
+	EXPECT_EQ(1, root->CountChildren());
+}
+
+
+TEST_F(WorkViewTest, TheRootAndFrameControledViewsAreNotDeleted)
+{
+	window.driver.Click(root, BPoint(290, 190));
+	window.driver.Key("Delete");
+	EXPECT_EQ(root, workView->EditView());
+	window.driver.Click(target);
+	window.driver.Key("Delete");
+	EXPECT_EQ(target, scroll->Target());
+}
+
+
+TEST_F(WorkViewTest, TheHighlightFramesTheSelectedView)
+{
+	window.driver.Click(plain);
+	for (const BPoint& point : { BPoint(0, 0), BPoint(1, 1), BPoint(50, 0), BPoint(99, 59),
+			 BPoint(98, 30), BPoint(0, 59), BPoint(95, 56) })
+		EXPECT_TRUE(IsBlue(window.driver.PixelAt(plain, point))) << point.x << "," << point.y;
+	for (const BPoint& point : { BPoint(2, 2), BPoint(50, 30), BPoint(88, 48) })
+		EXPECT_FALSE(IsBlue(window.driver.PixelAt(plain, point))) << point.x << "," << point.y;
+}
+
+
+TEST_F(WorkViewTest, TheOldHighlightIsErased)
+{
+	window.driver.Click(plain);
+	window.driver.Click(button);
+	for (const BPoint& point : { BPoint(0, 0), BPoint(1, 30), BPoint(99, 59), BPoint(94, 56) })
+		EXPECT_FALSE(IsBlue(window.driver.PixelAt(plain, point))) << point.x << "," << point.y;
+	EXPECT_TRUE(IsBlue(window.driver.PixelAt(button, BPoint(0, 0))));
+}
+
+
+TEST_F(WorkViewTest, TheHighlightFollowsAMove)
+{
+	window.driver.Click(plain);
+	window.driver.Key("Right", 0, 5);
+	EXPECT_TRUE(IsBlue(window.driver.PixelAt(plain, BPoint(0, 0))));
+	EXPECT_FALSE(IsBlue(window.driver.PixelAt(root, BPoint(20, 40))));
+}
+
+
+TEST_F(WorkViewTest, AFrameControledViewHasNoTriangle)
+{
+	window.driver.Click(target);
+	EXPECT_TRUE(IsBlue(window.driver.PixelAt(target, BPoint(0, 0))));
+	const BRect bounds = target->Bounds();
+	EXPECT_FALSE(
+		IsBlue(window.driver.PixelAt(target, BPoint(bounds.right - 4, bounds.bottom - 4))));
+}
+
+
+TEST_F(WorkViewTest, TheHighlightHidesBehindASibling)
+{
+	BView* cover = new BView(BRect(60, 10, 110, 90), "cover", B_FOLLOW_NONE, B_WILL_DRAW);
+	window.Locked([&] { root->AddChild(cover); });
+	window.driver.Click(plain, BPoint(10, 10));
+	EXPECT_TRUE(IsBlue(window.driver.PixelAt(plain, BPoint(10, 0))));
+	EXPECT_FALSE(IsBlue(window.driver.PixelAt(cover, BPoint(20, 10))));
+	EXPECT_TRUE(IsBlue(window.driver.PixelAt(plain, BPoint(97, 0))));
+}
+
+
+TEST_F(WorkViewTest, ADeletedViewLeavesNoHighlight)
+{
+	window.driver.Click(plain);
+	window.driver.Key("Delete");
+	EXPECT_FALSE(IsBlue(window.driver.PixelAt(root, BPoint(20, 20))));
+}
+
+
+TEST_F(WorkViewTest, TheGroundIsAlignedToTheContainer)
+{
+	// Scrolled by the origin, the pattern slides along.
+	BView* container = workView->Container();
+	for (const BPoint& cell : { BPoint(340, 48), BPoint(344, 52), BPoint(352, 56) }) {
+		const bool light = (static_cast<int>(cell.x) / 4 + static_cast<int>(cell.y) / 4) % 2 == 0;
+		EXPECT_EQ(light ? 204 : 153, window.driver.PixelAt(container, cell).red);
+	}
+}
+
+
+TEST_F(WorkViewTest, ReplacingTheTreeDeletesTheOldOne)
+{
+	window.driver.Click(plain);
+	BView* other = new BView(BRect(0, 0, 50, 50), "other", B_FOLLOW_NONE, B_WILL_DRAW);
+	window.Locked([&] { workView->SetEditView(other); });
+	EXPECT_EQ(other, workView->SelectedView());
+	EXPECT_EQ(1, workView->Container()->CountChildren());
+
+	window.Locked([&] { workView->SetEditView(NULL); });
+	EXPECT_EQ(NULL, workView->EditView());
+	EXPECT_EQ(NULL, workView->SelectedView());
+	EXPECT_EQ(0, workView->Container()->CountChildren());
+}
+
+
+TEST_F(WorkViewTest, ColorsOfTheTreeSurvive)
+{
+	BView* other = new BView(BRect(0, 0, 50, 50), "other", B_FOLLOW_NONE, B_WILL_DRAW);
+	BButton* inner = new BButton(BRect(5, 5, 40, 30), "inner", "x", NULL);
+	inner->SetViewColor(1, 2, 3);
+	other->AddChild(inner);
+	window.Locked([&] { workView->SetEditView(other); });
+	EXPECT_EQ(1, inner->ViewColor().red);
+}
+
+
+TEST_F(WorkViewTest, KeysWithNothingSelectedDoNothing)
+{
+	window.Locked([&] {
+		workView->SetEditView(NULL);
+		const char key = B_DELETE;
+		workView->KeyDown(&key, 1);
+	});
+	EXPECT_EQ(NULL, workView->SelectedView());
+}
