@@ -331,10 +331,21 @@ public:
 private:
 	friend class BPrivate::MessagePrivate;
 
-	BPrivate::MessageData* _Own(); // ours alone, made when there is none; NULL without memory
-	status_t _Replace(const char* name, type_code type, int32 index, const void* data, size_t size);
+	int32 _Find(const char* name) const;
+	status_t _FindItem(const char* name, type_code type, int32 index, uint32* _number) const;
 	status_t _FindFixed(
 		const char* name, type_code type, int32 index, void* value, size_t size) const;
+	BPrivate::MessageData* _Own(); // ours alone, made when there is none; NULL without memory
+	static BPrivate::MessageData* _Nested(const BMessage& message);
+	status_t _AddNested(const char* name, BPrivate::MessageData* nested);
+	status_t _AppendItem(
+		const BPrivate::MessageData& from, uint32 number, uint32 index, const char* name);
+	bool _SameField(uint32 number, const BPrivate::MessageData& other, uint32 otherNumber,
+		bool ignoreFieldOrder, bool deep) const;
+	int8 _SameMessages(uint32 number, const BPrivate::MessageData& other, uint32 otherNumber,
+		uint32 index, bool ignoreFieldOrder) const;
+	status_t _ReadRest(BDataIO* stream, const uint8* header, size_t have, size_t size);
+	void _Clear();
 	void _Release();
 
 	BPrivate::MessageData* fData = nullptr; // shared; NULL when there are no fields

@@ -1,0 +1,216 @@
+// MessageData: the fields of a message, shared by its copies.
+#pragma once
+
+#include <atomic>
+#include <cstring>
+
+#include <MessageForm.h>
+#include <SupportDefs.h>
+
+#include "app/private/SharedBytes.h"
+
+namespace BPrivate {
+
+class ManagedNote;
+
+
+// A field's items lie in the message's own store, or in the bytes that the message was read from.
+// Fields that were added one after another lie in the store just as the R5 form wants them, and so
+// do those that were read from that form; then writing the message is copying bytes.
+struct MessageField {
+	enum : uint16 {
+		kFixed = 0x01, // items of one size, one after another without sizes
+		kInSource = 0x02, // offsets count in the bytes that were read, else in the store
+		kNameInSource = 0x04,
+		kPacked = 0x08, // variable items without padding between them, as the Haiku form has them
+		kCompact = 0x10, // what lies from start on is this field in the compact R5 form
+		kWide = 0x20, // the same for the wide R5 form
+		kScattered = 0x40, // only the table tells where the items are
+	};
+
+	uint32 name; // offset
+	uint32 start; // offset of the encoded field; the data ends it
+	uint32 data; // offset of the first item (of its size, if variable)
+	uint32 size; // bytes of all items; scattered items count as padded
+	uint32 count;
+	uint32 capacity; // bytes that the data may take where they are, in the store
+	type_code type;
+	uint32 hash;
+	uint64* table; // where each variable item is, see ItemPlace; NULL when they are few
+	uint16 nameLength;
+	uint16 flags;
+
+	bool Has(uint16 flag) const { return (flags & flag) != 0; }
+	uint32 ItemSize() const { return size / count; } // of a fixed field
+};
+
+
+// Where a variable item is: its size word in one of the two stores, or a message that was added
+// and is kept as it is.
+class ItemPlace {
+public:
+	static ItemPlace InStore(uint32 offset) { return ItemPlace(uint64(offset) << 2); }
+	static ItemPlace InSource(uint32 offset) { return ItemPlace(uint64(offset) << 2 | 2); }
+	static ItemPlace Nested(MessageData* data)
+	{
+		return ItemPlace(reinterpret_cast<uint64>(data) | 1);
+	}
+	explicit ItemPlace(uint64 word) : fWord(word) {}
+
+	bool IsNested() const { return (fWord & 1) != 0; }
+	bool IsInSource() const { return (fWord & 3) == 2; }
+	uint32 Offset() const { return uint32(fWord >> 2); }
+	MessageData* Message() const { return reinterpret_cast<MessageData*>(fWord & ~uint64(3)); }
+	uint64 Word() const { return fWord; }
+
+private:
+	uint64 fWord;
+};
+
+
+// The owner of the only reference may change it; all others only read, from any thread.
+class MessageData {
+public:
+	static MessageData* Create(); // NULL without memory
+	// Takes over a reference to the source. The fields are copied, tables and all.
+	static MessageData* CreateFrom(SharedBytes* source, const uint8* base,
+		const MessageField* fields, uint32 count, int32 level);
+	MessageData* Clone() const;
+
+	void Acquire() { fReferences.fetch_add(1, std::memory_order_relaxed); }
+	void Release();
+	bool IsShared() const { return fReferences.load(std::memory_order_acquire) != 1; }
+
+	// The code is the message's business; this one counts for a message inside another.
+	uint32 What() const { return fWhat; }
+	void SetWhat(uint32 what) { fWhat = what; }
+
+	uint32 CountFields() const { return fCount; }
+	const MessageField& FieldAt(uint32 index) const { return fFields[index]; }
+	int32 Find(const char* name) const; // -1; the first of several with one name
+	int32 Find(const char* name, size_t length, uint32 hash) const;
+	const char* NameBytes(const MessageField& field) const; // without a NUL
+	const char* NameAt(uint32 index) const; // with one; valid until a change; NULL without memory
+
+	// Items. The index must be in range.
+	status_t GetItem(uint32 field, uint32 index, const void** _data, size_t* _size) const;
+	size_t ItemSizeAt(uint32 field, uint32 index) const;
+	// A new reference, or NULL when the item is no message, or is nested too deep.
+	MessageData* GetMessage(uint32 field, uint32 index) const;
+	// The message that was added as such, without a reference, or NULL when there are bytes.
+	MessageData* MessageAt(uint32 field, uint32 index) const;
+
+	// Changes, by the only owner. Sizes are not 0, types have been checked.
+	status_t AddField(const char* name, size_t length, type_code type, bool fixed,
+		const void* data, size_t size);
+	status_t AddItem(uint32 field, const void* data, size_t size);
+	status_t AddMessageField(const char* name, size_t length, type_code type, MessageData* data);
+	status_t AddMessageItem(uint32 field, MessageData* data);
+	status_t ReplaceItem(uint32 field, uint32 index, const void* data, size_t size);
+	status_t ReplaceMessage(uint32 field, uint32 index, MessageData* data);
+	status_t RemoveItem(uint32 field, uint32 index);
+	void RemoveField(uint32 field);
+	status_t RenameField(uint32 field, const char* name, size_t length);
+	// Copies a field of another message to the end, or in the place of one.
+	status_t CopyField(const MessageData& from, uint32 field);
+	status_t CopyFieldOver(uint32 target, const MessageData& from, uint32 field);
+
+	// How deep it lies in the message that was read, and how deep messages lie in it.
+	int32 Level() const { return fLevel; }
+	int32 Height() const { return fHeight; }
+
+	// The compact R5 form. Both go through the plan of MessageWriter when an item that is a
+	// message of another form lies somewhere in it.
+	size_t FlatSize() const;
+	bool IsPlain() const; // no such item
+	uint8* WritePlain(uint32 what, uint8* to) const;
+
+	ManagedNote* Note() const { return fNote; }
+	void SetNote(ManagedNote* note); // takes a reference of its own
+
+	const uint8* Base(const MessageField& field) const
+	{
+		return field.Has(MessageField::kInSource) ? fSourceBase : fStore;
+	}
+	ItemPlace PlaceAt(const MessageField& field, uint32 index) const;
+	const uint8* BytesAt(ItemPlace place) const // at the size word
+	{
+		return (place.IsInSource() ? fSourceBase : fStore) + place.Offset();
+	}
+
+private:
+	MessageData() = default;
+	~MessageData();
+
+	void _Changed();
+	bool _ReserveFields(uint32 count);
+	bool _ReserveStore(size_t size);
+	MessageField* _NewField(const char* name, size_t length, type_code type);
+	void _Index(uint32 field);
+	bool _BuildIndex();
+	uint32 _HeaderLength(const MessageField& field, uint32 count, size_t size) const;
+	void _WriteHeader(const MessageField& field);
+	bool _IsAtEnd(const MessageField& field) const;
+	status_t _AppendFixed(MessageField& field, const void* data, size_t size);
+	status_t _AppendVariable(MessageField& field, const void* data, size_t size);
+	status_t _Lengthen(MessageField& field, uint32 bytes);
+	bool _OwnFixed(MessageField& field, size_t capacity);
+	bool _MakeTable(MessageField& field, uint32 room);
+	bool _Scatter(MessageField& field, uint32 room);
+	bool _PutItem(const void* data, size_t size, uint32* _offset);
+	void _AddHeight(const MessageData& nested);
+	void _CompactStore();
+	bool _CompactInto(MessageData& target) const;
+	void _ReleaseTable(MessageField& field);
+
+	std::atomic<int32> fReferences { 1 };
+	uint32 fWhat = 0;
+	MessageField* fFields = nullptr;
+	uint32 fCount = 0;
+	uint32 fFieldRoom = 0;
+	uint32* fIndex = nullptr; // slots of field numbers + 1; NULL while there are few fields
+	uint32 fIndexMask = 0;
+	int16 fLevel = 0;
+	int16 fHeight = 0;
+	SharedBytes* fSource = nullptr;
+	const uint8* fSourceBase = nullptr;
+	uint8* fStore = nullptr;
+	uint32 fStoreSize = 0;
+	uint32 fStoreRoom = 0;
+	uint32 fWaste = 0; // bytes of the store that no field uses any more
+	ManagedNote* fNote = nullptr;
+	mutable std::atomic<uint32> fFlatSize { 0 }; // 0: not known
+	mutable std::atomic<int8> fPlain { -1 }; // -1: not known
+	mutable std::atomic<SharedBytes*> fFlat { nullptr }; // for those who want the bytes of an item
+	mutable std::atomic<char*> fNames { nullptr }; // all names with their NULs
+};
+
+
+// Bytes of an item with its size and padding.
+inline size_t
+padded_item_size(size_t size)
+{
+	return (size + 4 + 7) & ~size_t(7);
+}
+
+
+inline uint32
+read_uint32(const void* from)
+{
+	uint32 value;
+	memcpy(&value, from, sizeof(value));
+	return value;
+}
+
+
+inline void
+write_uint32(void* to, uint32 value)
+{
+	memcpy(to, &value, sizeof(value));
+}
+
+
+uint32 hash_name(const char* name, size_t length);
+
+
+} // namespace BPrivate
