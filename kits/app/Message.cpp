@@ -25,15 +25,12 @@ BMessage::BMessage()
 }
 
 
-BMessage::BMessage(uint32 what) :
-	what(what)
+BMessage::BMessage(uint32 what) : what(what)
 {
 }
 
 
-BMessage::BMessage(const BMessage& message) :
-	what(message.what),
-	fData(message.fData)
+BMessage::BMessage(const BMessage& message) : what(message.what), fData(message.fData)
 {
 	if (fData != nullptr)
 		fData->Acquire();
@@ -44,8 +41,7 @@ BMessage::BMessage(const BMessage& message) :
 
 
 BMessage::BMessage(BMessage&& message) :
-	what(message.what),
-	fData(std::exchange(message.fData, nullptr)),
+	what(message.what), fData(std::exchange(message.fData, nullptr)),
 	fDelivery(std::exchange(message.fDelivery, nullptr)),
 	fLookUps(std::exchange(message.fLookUps, nullptr)),
 	fCurrentSpecifier(std::exchange(message.fCurrentSpecifier, -1))
@@ -135,8 +131,7 @@ BMessage::GetInfo(const char* name, type_code* typeFound, bool* fixedSize) const
 
 
 status_t
-BMessage::GetInfo(
-	const char* name, type_code* typeFound, int32* countFound, bool* fixedSize) const
+BMessage::GetInfo(const char* name, type_code* typeFound, int32* countFound, bool* fixedSize) const
 {
 	if (countFound != nullptr)
 		*countFound = 0;
@@ -266,8 +261,8 @@ BMessage::Unflatten(const char* flatBuffer)
 	uint32 magic;
 	memcpy(&magic, flatBuffer, sizeof(magic));
 	const auto* bytes = reinterpret_cast<const uint8*>(flatBuffer);
-	const bool haiku = magic == BPrivate::kHaikuMagic
-		|| magic == __builtin_bswap32(BPrivate::kHaikuMagic);
+	const bool haiku =
+		magic == BPrivate::kHaikuMagic || magic == __builtin_bswap32(BPrivate::kHaikuMagic);
 	const bool known = haiku || magic == BPrivate::kR5Magic || magic == BPrivate::kDanoMagic
 		|| magic == __builtin_bswap32(BPrivate::kR5Magic)
 		|| magic == __builtin_bswap32(BPrivate::kDanoMagic);
@@ -275,8 +270,7 @@ BMessage::Unflatten(const char* flatBuffer)
 		_Clear();
 		return B_NOT_A_MESSAGE;
 	}
-	const size_t size
-		= BPrivate::read_message_size(bytes, haiku ? BPrivate::kHaikuHeaderSize : 16);
+	const size_t size = BPrivate::read_message_size(bytes, haiku ? BPrivate::kHaikuHeaderSize : 16);
 	return unflatten_message(this, flatBuffer, size);
 }
 
@@ -314,8 +308,8 @@ BMessage::Unflatten(BDataIO* stream)
 
 
 status_t
-BMessage::AddData(const char* name, type_code type, const void* data, ssize_t numBytes,
-	bool isFixedSize, int32)
+BMessage::AddData(
+	const char* name, type_code type, const void* data, ssize_t numBytes, bool isFixedSize, int32)
 {
 	if (name == nullptr || data == nullptr || numBytes <= 0)
 		return B_BAD_VALUE;
@@ -453,16 +447,15 @@ BMessage::MakeEmpty()
 
 
 status_t
-BMessage::FindData(
-	const char* name, type_code type, const void** data, ssize_t* numBytes) const
+BMessage::FindData(const char* name, type_code type, const void** data, ssize_t* numBytes) const
 {
 	return FindData(name, type, 0, data, numBytes);
 }
 
 
 status_t
-BMessage::FindData(const char* name, type_code type, int32 index, const void** data,
-	ssize_t* numBytes) const
+BMessage::FindData(
+	const char* name, type_code type, int32 index, const void** data, ssize_t* numBytes) const
 {
 	if (data == nullptr)
 		return B_BAD_VALUE;
@@ -546,9 +539,8 @@ BMessage::ReplaceData(
 	if (field.Has(MessageField::kFixed) && field.ItemSize() != size_t(numBytes))
 		return B_BAD_VALUE;
 	MessageData* owned = _Own();
-	return owned != nullptr
-		? owned->ReplaceItem(number, uint32(index), data, size_t(numBytes))
-		: status_t(B_NO_MEMORY);
+	return owned != nullptr ? owned->ReplaceItem(number, uint32(index), data, size_t(numBytes))
+							: status_t(B_NO_MEMORY);
 }
 
 
@@ -576,9 +568,9 @@ BMessage::ReplaceMessage(const char* name, int32 index, const BMessage* message)
 	else if (owned->FieldAt(number).Has(MessageField::kFixed)) {
 		// Such a field takes bytes of its size only.
 		BPrivate::SharedBytes* bytes = BPrivate::flatten_to_bytes(*nested, nested->What());
-		status = bytes != nullptr ? ReplaceData(name, B_MESSAGE_TYPE, index, bytes->Bytes(),
-										ssize_t(bytes->Size()))
-								  : status_t(B_NO_MEMORY);
+		status = bytes != nullptr
+			? ReplaceData(name, B_MESSAGE_TYPE, index, bytes->Bytes(), ssize_t(bytes->Size()))
+			: status_t(B_NO_MEMORY);
 		if (bytes != nullptr)
 			bytes->Release();
 	} else
@@ -697,8 +689,7 @@ BMessage::_FindItem(const char* name, type_code type, int32 index, uint32* _numb
 // A shorter item than the value is refused, a longer one is cut, as in sources that were written
 // for a smaller type.
 status_t
-BMessage::_FindFixed(
-	const char* name, type_code type, int32 index, void* value, size_t size) const
+BMessage::_FindFixed(const char* name, type_code type, int32 index, void* value, size_t size) const
 {
 	if (value == nullptr)
 		return B_BAD_VALUE;
@@ -764,16 +755,15 @@ BMessage::_AddNested(const char* name, MessageData* nested)
 {
 	const size_t length = strlen(name);
 	const int32 number = fData->Find(name, length, BPrivate::hash_name(name, length));
-	const bool fixed
-		= number >= 0 && fData->FieldAt(uint32(number)).Has(MessageField::kFixed);
+	const bool fixed = number >= 0 && fData->FieldAt(uint32(number)).Has(MessageField::kFixed);
 	// Messages that lie deep in each other are kept as bytes from some depth on, so that no walk
 	// over them has to go deeper than that.
 	if (fixed || nested->Height() >= B_MAX_MESSAGE_NESTING - 1) {
 		BPrivate::SharedBytes* bytes = BPrivate::flatten_to_bytes(*nested, nested->What());
 		if (bytes == nullptr)
 			return B_NO_MEMORY;
-		const status_t status
-			= AddData(name, B_MESSAGE_TYPE, bytes->Bytes(), ssize_t(bytes->Size()), false);
+		const status_t status =
+			AddData(name, B_MESSAGE_TYPE, bytes->Bytes(), ssize_t(bytes->Size()), false);
 		bytes->Release();
 		return status;
 	}

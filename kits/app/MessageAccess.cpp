@@ -379,8 +379,7 @@ void*
 BMessage::GetPointer(const char* name, int32 index, const void* defaultValue) const
 {
 	void* pointer;
-	return FindPointer(name, index, &pointer) == B_OK ? pointer
-		: const_cast<void*>(defaultValue);
+	return FindPointer(name, index, &pointer) == B_OK ? pointer : const_cast<void*>(defaultValue);
 }
 
 
@@ -517,9 +516,10 @@ BMessage::SetPointer(const char* name, const void* value)
 
 
 status_t
-BMessage::SetData(const char* name, type_code type, const void* data, ssize_t numBytes, bool fixedSize, int32 count)
+BMessage::SetData(const char* name, type_code type, const void* data, ssize_t numBytes,
+	bool fixedSize, int32 count)
 {
 	const status_t status = ReplaceData(name, type, 0, data, numBytes);
 	return status == B_NAME_NOT_FOUND ? AddData(name, type, data, numBytes, fixedSize, count)
-		: status;
+									  : status;
 }

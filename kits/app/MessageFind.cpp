@@ -310,8 +310,7 @@ BMessage::FindPointer(const char* name, void** pointer) const
 status_t
 BMessage::FindPointer(const char* name, int32 index, void** pointer) const
 {
-	const status_t status
-		= _FindFixed(name, B_POINTER_TYPE, index, pointer, sizeof(*pointer));
+	const status_t status = _FindFixed(name, B_POINTER_TYPE, index, pointer, sizeof(*pointer));
 	if (status != B_OK && pointer != nullptr)
 		*pointer = nullptr;
 	return status;

@@ -249,11 +249,15 @@ symbol_of_image(const image_info& image, const char* name)
 std::string
 image_signature(const image_info& image)
 {
+	// An attribute's value begins with the four bytes of its type.
+	constexpr ssize_t kTypeSize = 4;
 	char signature[256];
-	const ssize_t length = getxattr(image.name, "user.BEOS:APP_SIG", signature, sizeof(signature));
-	if (length <= 0)
+	const ssize_t length =
+		getxattr(image.name, "user.be.BEOS:APP_SIG", signature, sizeof(signature));
+	if (length <= kTypeSize)
 		return std::string();
-	return std::string(signature, strnlen(signature, size_t(length)));
+	return std::string(
+		signature + kTypeSize, strnlen(signature + kTypeSize, size_t(length - kTypeSize)));
 }
 
 

@@ -43,7 +43,7 @@ public:
 		const char* name = static_cast<const char*>(data) + 12;
 		if (size > 12 && memchr(name, 0, size - 12) == nullptr)
 			return B_BAD_VALUE;
-		*ref = entry_ref(dev_t(device), ino_t(directory), size > 12 ? name : nullptr);
+		*ref = entry_ref(_Device(device), ino_t(directory), size > 12 ? name : nullptr);
 		return B_OK;
 	}
 
@@ -53,13 +53,13 @@ public:
 		int64 node;
 		if (!_Get(data, size, &device, &node))
 			return B_BAD_VALUE;
-		ref->device = dev_t(device);
+		ref->device = _Device(device);
 		ref->node = ino_t(node);
 		return B_OK;
 	}
 
 private:
-	template <typename Device, typename Node> void _Put(Device device, Node node)
+	template<typename Device, typename Node> void _Put(Device device, Node node)
 	{
 		const int32 device32 = int32(device);
 		const int64 node64 = int64(node);
@@ -75,6 +75,9 @@ private:
 		memcpy(node, static_cast<const char*>(data) + 4, sizeof(*node));
 		return true;
 	}
+
+	// -1 means none; other numbers with the top bit set are not negative.
+	static dev_t _Device(int32 device) { return device == -1 ? dev_t(-1) : dev_t(uint32(device)); }
 
 	std::vector<char> fBytes;
 };

@@ -13,7 +13,8 @@ namespace BPrivate {
 // by the object that was made from it; only one thread uses them at a time.
 class LookUps {
 public:
-	explicit LookUps(MessageData* data) : // may be NULL
+	explicit LookUps(MessageData* data) :
+		// may be NULL
 		fData(data)
 	{
 		if (fData != nullptr)

@@ -29,9 +29,7 @@ struct ManagedOrigin {
 // One archive's place. Never changes; shared by copies of the archive.
 class ManagedNote {
 public:
-	ManagedNote(ManagedOrigin* origin, int32 token) :
-		fOrigin(origin),
-		fToken(token)
+	ManagedNote(ManagedOrigin* origin, int32 token) : fOrigin(origin), fToken(token)
 	{
 		origin->Acquire();
 	}

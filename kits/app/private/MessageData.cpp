@@ -90,8 +90,8 @@ MessageData::Create()
 
 
 MessageData*
-MessageData::CreateFrom(SharedBytes* source, const uint8* base, const MessageField* fields,
-	uint32 count, int32 level)
+MessageData::CreateFrom(
+	SharedBytes* source, const uint8* base, const MessageField* fields, uint32 count, int32 level)
 {
 	MessageData* data = Create();
 	if (data == nullptr || !data->_ReserveFields(count)) {
@@ -350,9 +350,8 @@ MessageData::GetMessage(uint32 number, uint32 index) const
 	size_t size;
 	GetItem(number, index, &bytes, &size);
 	const MessageField& field = fFields[number];
-	const bool inSource = field.Has(MessageField::kFixed)
-		? field.Has(MessageField::kInSource)
-		: PlaceAt(field, index).IsInSource();
+	const bool inSource = field.Has(MessageField::kFixed) ? field.Has(MessageField::kInSource)
+														  : PlaceAt(field, index).IsInSource();
 	SharedBytes* source = fSource;
 	if (inSource)
 		source->Acquire();
@@ -372,8 +371,8 @@ MessageData::GetMessage(uint32 number, uint32 index) const
 
 
 status_t
-MessageData::AddField(const char* name, size_t length, type_code type, bool fixed,
-	const void* data, size_t size)
+MessageData::AddField(
+	const char* name, size_t length, type_code type, bool fixed, const void* data, size_t size)
 {
 	if (size > kLargestStore)
 		return B_NO_MEMORY;
@@ -576,8 +575,7 @@ MessageData::RemoveField(uint32 number)
 	if (!field.Has(MessageField::kInSource | MessageField::kScattered))
 		fWaste += field.size + field.nameLength;
 	_ReleaseTable(field);
-	memmove(fFields + number, fFields + number + 1,
-		(fCount - number - 1) * sizeof(MessageField));
+	memmove(fFields + number, fFields + number + 1, (fCount - number - 1) * sizeof(MessageField));
 	fCount--;
 	if (fIndex != nullptr)
 		_BuildIndex();
@@ -601,8 +599,8 @@ MessageData::RenameField(uint32 number, const char* name, size_t length)
 	field.name = fStoreSize;
 	field.nameLength = uint16(length);
 	field.hash = hash_name(name, length);
-	field.flags &= uint16(
-		~(MessageField::kCompact | MessageField::kWide | MessageField::kNameInSource));
+	field.flags &=
+		uint16(~(MessageField::kCompact | MessageField::kWide | MessageField::kNameInSource));
 	fStoreSize += uint32(length);
 	if (fIndex != nullptr)
 		_BuildIndex();
@@ -761,8 +759,7 @@ MessageData::WritePlain(uint32 what, uint8* to) const
 		}
 		to = append_bytes(to, run, runEnd);
 		run = runEnd = nullptr;
-		to = write_r5_field_header(
-			to, *this, field, padded_field_size(*this, field), B_R5_FORM);
+		to = write_r5_field_header(to, *this, field, padded_field_size(*this, field), B_R5_FORM);
 		if (field.Has(MessageField::kFixed)
 			|| !field.Has(MessageField::kScattered | MessageField::kPacked)) {
 			const uint8* data = Base(field) + field.data;
@@ -941,8 +938,7 @@ MessageData::_AppendVariable(MessageField& field, const void* data, size_t size)
 		return B_OK;
 	}
 
-	if ((field.table != nullptr || field.count >= kFewItems)
-		&& !_MakeTable(field, field.count + 1))
+	if ((field.table != nullptr || field.count >= kFewItems) && !_MakeTable(field, field.count + 1))
 		return B_NO_MEMORY;
 	const status_t status = _Lengthen(field, uint32(bytes));
 	if (status != B_OK)
@@ -1002,8 +998,8 @@ MessageData::_OwnFixed(MessageField& field, size_t capacity)
 		fWaste += field.capacity;
 	field.data = fStoreSize;
 	field.capacity = uint32(capacity);
-	field.flags &= uint16(
-		~(MessageField::kInSource | MessageField::kCompact | MessageField::kWide));
+	field.flags &=
+		uint16(~(MessageField::kInSource | MessageField::kCompact | MessageField::kWide));
 	fStoreSize += uint32(capacity);
 	return true;
 }
@@ -1046,8 +1042,7 @@ MessageData::_Scatter(MessageField& field, uint32 room)
 	if (field.Has(MessageField::kScattered))
 		return true;
 	field.size = uint32(padded_field_size(*this, field));
-	field.flags &= uint16(
-		~(MessageField::kCompact | MessageField::kWide | MessageField::kPacked));
+	field.flags &= uint16(~(MessageField::kCompact | MessageField::kWide | MessageField::kPacked));
 	field.flags |= MessageField::kScattered;
 	return true;
 }

@@ -101,8 +101,8 @@ public:
 	MessageData* MessageAt(uint32 field, uint32 index) const;
 
 	// Changes, by the only owner. Sizes are not 0, types have been checked.
-	status_t AddField(const char* name, size_t length, type_code type, bool fixed,
-		const void* data, size_t size);
+	status_t AddField(
+		const char* name, size_t length, type_code type, bool fixed, const void* data, size_t size);
 	status_t AddItem(uint32 field, const void* data, size_t size);
 	status_t AddMessageField(const char* name, size_t length, type_code type, MessageData* data);
 	status_t AddMessageItem(uint32 field, MessageData* data);

@@ -94,10 +94,7 @@ swap_item(type_code type, uint8* item, size_t size)
 
 
 MessageReader::MessageReader(SharedBytes* source, const uint8* bytes, size_t size, int32 level) :
-	fSource(source),
-	fBytes(bytes),
-	fSize(size),
-	fLevel(level)
+	fSource(source), fBytes(bytes), fSize(size), fLevel(level)
 {
 }
 
@@ -335,8 +332,7 @@ MessageReader::_ReadDano()
 			_Fail(B_BAD_DATA, position + 4, "the section's size does not fit the message");
 			return nullptr;
 		}
-		if (sectionSize > 8
-			&& !_ReadDanoSection(code, position + 8, position + sectionSize))
+		if (sectionSize > 8 && !_ReadDanoSection(code, position + 8, position + sectionSize))
 			return nullptr;
 		position += min_c((sectionSize + 7) & ~size_t(7), fSize - position);
 	}
@@ -391,8 +387,7 @@ MessageReader::_ReadDanoSection(uint32 code, size_t position, size_t end)
 
 
 bool
-MessageReader::_AddDanoItems(
-	const Field& field, const uint8* items, size_t size, const uint8* ends)
+MessageReader::_AddDanoItems(const Field& field, const uint8* items, size_t size, const uint8* ends)
 {
 	if (memchr(field.name, 0, field.nameLength) != nullptr)
 		return _Fail(B_BAD_DATA, items, "the field's name has an end inside it");
@@ -539,9 +534,9 @@ MessageReader::_AddSwappedItem(const Field& field, bool first, const uint8* item
 		memcpy(swapped, item, size);
 		if (fSwapped)
 			swap_item(field.type, swapped, size);
-		status = first ? fBuilt->AddField(field.name, field.nameLength, field.type, field.fixed,
-							 swapped, size)
-					   : fBuilt->AddItem(fBuilt->CountFields() - 1, swapped, size);
+		status = first
+			? fBuilt->AddField(field.name, field.nameLength, field.type, field.fixed, swapped, size)
+			: fBuilt->AddItem(fBuilt->CountFields() - 1, swapped, size);
 	}
 	if (swapped != few)
 		free(swapped);

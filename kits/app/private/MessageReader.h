@@ -44,8 +44,7 @@ private:
 	bool _ReadR5Header();
 	bool _ReadR5Field(size_t* position, Field* field);
 	MessageData* _ReadHaiku();
-	bool _ReadHaikuField(
-		size_t position, size_t areaStart, size_t areaSize, Field* field);
+	bool _ReadHaikuField(size_t position, size_t areaStart, size_t areaSize, Field* field);
 	MessageData* _ReadDano();
 	bool _ReadDanoSection(uint32 code, size_t position, size_t end);
 	bool _AddDanoItems(const Field& field, const uint8* items, size_t size, const uint8* ends);
@@ -54,8 +53,7 @@ private:
 	bool _TakeReference(const Field& field);
 	bool _TakeSwapped(const Field& field);
 	bool _CheckItems(const Field& field, uint64* table);
-	bool _AddSwappedItem(
-		const Field& field, bool first, const uint8* item, size_t size);
+	bool _AddSwappedItem(const Field& field, bool first, const uint8* item, size_t size);
 	MessageData* _Finish();
 	bool _Fail(status_t status, const uint8* where, const char* reason);
 	bool _Fail(status_t status, size_t offset, const char* reason);

@@ -71,8 +71,8 @@ write_r5_field_head(uint8* to, const MessageField& field, size_t size, message_f
 
 // Longer names than the form can hold are cut.
 uint8*
-write_r5_field_header(uint8* to, const MessageData& data, const MessageField& field, size_t size,
-	message_form form)
+write_r5_field_header(
+	uint8* to, const MessageData& data, const MessageField& field, size_t size, message_form form)
 {
 	to = write_r5_field_head(to, field, size, form);
 	const size_t length = min_c(field.nameLength, 255);
@@ -168,9 +168,7 @@ haiku_name_hash(const char* name, size_t length)
 
 
 MessageWriter::MessageWriter(const MessageData* data, uint32 what, message_form form) :
-	fData(data),
-	fWhat(what),
-	fForm(form)
+	fData(data), fWhat(what), fForm(form)
 {
 	size_t size;
 	if (data == nullptr)
@@ -258,8 +256,8 @@ MessageWriter::_MeasureItem(const MessageData& data, uint32 number, uint32 index
 	const size_t place = fNested.size();
 	MessageData* nested = _NestedToConvert(data, number, index, depth);
 	fNested.push_back({ nested, 0 });
-	const size_t size = nested != nullptr ? _Measure(*nested, depth + 1)
-										  : data.ItemSizeAt(number, index);
+	const size_t size =
+		nested != nullptr ? _Measure(*nested, depth + 1) : data.ItemSizeAt(number, index);
 	fNested[place].size = size;
 	return size;
 }
@@ -352,8 +350,7 @@ MessageWriter::_WriteHaiku(const MessageData& data, uint32 what, size_t size, ui
 
 // The header with its hash chains; the links of the fields are written along with it.
 uint8*
-MessageWriter::_WriteHaikuHeader(
-	const MessageData& data, uint32 what, size_t size, uint8* to) const
+MessageWriter::_WriteHaikuHeader(const MessageData& data, uint32 what, size_t size, uint8* to) const
 {
 	const uint32 count = data.CountFields();
 	memset(to, 0xff, kHaikuHeaderSize);
@@ -370,8 +367,8 @@ MessageWriter::_WriteHaikuHeader(
 		ends[slot] = to + 48 + slot * 4;
 	for (uint32 i = 0; i < count; i++) {
 		const MessageField& field = data.FieldAt(i);
-		const uint32 slot
-			= haiku_name_hash(data.NameBytes(field), field.nameLength) % kHaikuHashSize;
+		const uint32 slot =
+			haiku_name_hash(data.NameBytes(field), field.nameLength) % kHaikuHashSize;
 		write_uint32(ends[slot], i);
 		ends[slot] = fields + i * kHaikuFieldSize + 20;
 		write_uint32(ends[slot], 0xffffffff);
@@ -392,8 +389,8 @@ MessageWriter::_WriteItems(const MessageData& data, uint32 number, uint8* to)
 	const bool packed = fForm == B_HAIKU_FORM;
 	for (uint32 i = 0; i < field.count; i++) {
 		const ItemPlace place = data.PlaceAt(field, i);
-		const Nested nested
-			= holds_messages(field) ? fNested[fNextNested++] : Nested { nullptr, 0 };
+		const Nested nested =
+			holds_messages(field) ? fNested[fNextNested++] : Nested { nullptr, 0 };
 		if (nested.data != nullptr) {
 			write_uint32(to, uint32(nested.size));
 			uint8* end = _Write(*nested.data, nested.data->What(), nested.size, to + 4);

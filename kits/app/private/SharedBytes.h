@@ -30,8 +30,8 @@ public:
 		void* block = malloc(sizeof(SharedBytes));
 		if (block == nullptr)
 			return nullptr;
-		auto* shared = new (block)
-			SharedBytes(const_cast<uint8*>(static_cast<const uint8*>(bytes)), size);
+		auto* shared =
+			new (block) SharedBytes(const_cast<uint8*>(static_cast<const uint8*>(bytes)), size);
 		shared->fRelease = release;
 		shared->fCookie = cookie;
 		return shared;
