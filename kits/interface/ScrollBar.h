@@ -68,10 +68,14 @@ public:
 
 private:
 	friend class BPrivate::ViewPrivate;
+	friend class BView;
 
 	enum class Part : uint8;
 
-	void _ApplyValue(float value, bool scrollTarget);
+	float _Clamped(float value) const;
+	// The target is about to scroll there; returns where it may.
+	float _Follow(float position);
+	bool _Take(float value);
 	void _TargetGone();
 	bool _IsUsable() const;
 	BRect _ArrowRect(Part part) const;

@@ -374,6 +374,7 @@ public:
 
 private:
 	friend class BPrivate::ViewPrivate;
+	friend class BWindow;
 
 	void _InitFromArchive(BMessage* archive);
 	status_t _ArchiveOwnFields(BMessage* archive) const;
@@ -382,7 +383,7 @@ private:
 	const BPrivate::ViewState& _StateToRead() const;
 	BPrivate::ViewExtras* _Extras();
 	BPrivate::Painter* _BeginDrawing();
-	void _MoveAndResize(BRect frame);
+	void _SetPen(BPoint location);
 	void _CheckLock() const;
 	bool _CheckOwnerLock() const;
 	bool _StartDrag(BMessage* message, BBitmap* bitmap, drawing_mode mode, BRect rect,

@@ -68,8 +68,8 @@ class BMenuBar;
 class BMessage;
 
 namespace BPrivate {
+class Surface;
 class WindowInternals;
-class WindowPrivate;
 } // namespace BPrivate
 
 
@@ -222,10 +222,17 @@ protected:
 
 private:
 	friend class BPrivate::WindowInternals;
-	friend class BPrivate::WindowPrivate;
 
 	// A window that draws into a bitmap.
-	BWindow(BRect frame, BBitmap* bitmap);
+	BWindow(BRect frame, BBitmap* bitmap, BPrivate::Surface* surface);
+
+	virtual void _RouteMessage(BMessage* message, BHandler* target);
+	void _Init(BRect frame, const char* title, window_look look, window_feel feel, uint32 flags,
+		uint32 workspaces, window_type type);
+	void _DispatchToView(BMessage* message, BView* view);
+	void _DeleteViews();
+	bool _OpenKeyMenuBar();
+	bool _InvokeMenuShortcut(uint32 character, uint32 modifiers);
 
 	BPrivate::WindowInternals* fInternals; // owned
 };

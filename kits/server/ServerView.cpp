@@ -49,9 +49,7 @@ follow_size(BRect rect, uint32 mode, int32 dx, int32 dy)
 
 
 ServerView::ServerView(BView* owner, BRect frame, uint32 word) :
-	fOwner(owner),
-	fFrame(frame),
-	fWord(word)
+	fOwner(owner), fFrame(frame), fWord(word)
 {
 }
 
@@ -139,8 +137,7 @@ ServerView::Unlink()
 BRect
 ServerView::Bounds() const
 {
-	return BRect(
-		fScroll.x, fScroll.y, fScroll.x + fFrame.Width(), fScroll.y + fFrame.Height());
+	return BRect(fScroll.x, fScroll.y, fScroll.x + fFrame.Width(), fScroll.y + fFrame.Height());
 }
 
 

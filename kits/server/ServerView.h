@@ -19,7 +19,7 @@ class ViewTree;
 // The picture behind a view. The destination rectangle is in the view's coordinates and follows
 // the view's own size by the digits of a resizing mode.
 struct ViewBackground {
-	Surface image;
+	std::shared_ptr<const Surface> image;
 	BRect source;
 	BRect destination;
 	uint32 follow = 0;
@@ -85,6 +85,10 @@ public:
 	// Where the own point (0, 0) lies in the window, or in the topmost ancestor.
 	BPoint Origin() const;
 
+	// Marks for walks that tell every view of a subtree something once.
+	uint16 Marks() const { return fMarks; }
+	void SetMarks(uint16 marks) { fMarks = marks; }
+
 private:
 	friend class ViewTree;
 
@@ -101,6 +105,7 @@ private:
 	rgb_color fColor = { 255, 255, 255, 255 };
 	int32 fChildCount = 0;
 	int16 fHideCount = 0;
+	uint16 fMarks = 0;
 	std::unique_ptr<ViewBackground> fBackground;
 };
 

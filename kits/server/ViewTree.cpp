@@ -19,8 +19,7 @@ rounded(float value)
 
 
 ViewTree::ViewTree(ViewTreeClient& client, BRect bounds) :
-	fClient(client),
-	fRoot(nullptr, bounds, 0)
+	fClient(client), fRoot(nullptr, bounds, 0)
 {
 	fRoot.fTree = this;
 }
@@ -220,7 +219,8 @@ ViewTree::ViewAt(BPoint point) const
 	ServerView* found = nullptr;
 	while (view != nullptr) {
 		const ServerView* hit = nullptr;
-		for (const ServerView* child = view->FirstChild(); child != nullptr; child = child->Next()) {
+		for (const ServerView* child = view->FirstChild(); child != nullptr;
+			 child = child->Next()) {
 			if (child->HideCount() <= 0 && child->Frame().Contains(where)) {
 				hit = child;
 				break;

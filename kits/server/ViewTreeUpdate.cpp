@@ -142,7 +142,7 @@ ViewTree::_PaintBackground(const ServerView& view, const Step& step, const BRegi
 		fPainter->FillRect(area);
 	}
 	if (const ViewBackground* background = view.Background()) {
-		fPainter->DrawTiled(background->image, background->source, background->destination, area,
+		fPainter->DrawTiled(*background->image, background->source, background->destination, area,
 			background->options & (B_TILE_BITMAP_X | B_TILE_BITMAP_Y),
 			background->options & B_FILTER_BITMAP_BILINEAR);
 	}
@@ -218,7 +218,7 @@ ViewTree::_Covering(const ServerView& view, const clipping_rect& cut, bool opaqu
 			continue;
 		const Place parent = _PlaceOf(*level->Parent());
 		for (const ServerView* sibling = level->Next(); sibling != nullptr;
-			sibling = sibling->Next()) {
+			 sibling = sibling->Next()) {
 			if (sibling->HideCount() > 0 || (opaqueOnly && !sibling->IsOpaque()))
 				continue;
 			const Place place = _PlaceIn(parent, *sibling, sibling->Frame());
@@ -305,8 +305,8 @@ ViewTree::CopyBits(ServerView& view, BRect source, BRect destination)
 	if (!fDirty.IsEmpty()) {
 		BRegion stale(source.OffsetByCopy(place.origin));
 		stale.IntersectWith(&fDirty.Region());
-		stale.OffsetBy(rounded(destination.left - source.left),
-			rounded(destination.top - source.top));
+		stale.OffsetBy(
+			rounded(destination.left - source.left), rounded(destination.top - source.top));
 		missing.Include(&stale);
 	}
 	missing.IntersectWith(&fCurrent.clip);

@@ -3,6 +3,7 @@
 #include <Message.h>
 
 #include "app/private/Delivery.h"
+#include "app/private/HandlerPrivate.h"
 #include "app/private/LooperCore.h"
 
 namespace BPrivate {
@@ -32,6 +33,13 @@ LooperPrivate::PostSystem(BMessage* message, bool toPreferred)
 {
 	const int32 token = toPreferred ? kPreferredToken : fLooper->fCore->OwnToken();
 	fLooper->fCore->Put(Addressed(message, token), false);
+}
+
+
+void
+LooperPrivate::PostSystemTo(BMessage* message, const BHandler* handler)
+{
+	fLooper->fCore->Put(Addressed(message, HandlerPrivate(handler).Token()), false);
 }
 
 

@@ -27,6 +27,8 @@ public:
 	// thread, takes the queue's lock only. Its target is the looper, or the preferred handler.
 	// Takes ownership. The looper must be alive, as a window is while its ServerWindow exists.
 	void PostSystem(BMessage* message, bool toPreferred = false);
+	// The same for one handler, which may be gone when its turn comes.
+	void PostSystemTo(BMessage* message, const BHandler* handler);
 	// The same, ahead of everything that waits.
 	void PostAhead(BMessage* message);
 	// Queues _UPDATE_ for the looper ahead of everything, unless one is waiting already. Any thread.

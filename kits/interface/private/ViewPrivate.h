@@ -12,7 +12,6 @@ class ViewPrivate {
 public:
 	explicit ViewPrivate(const BView* view) : fView(const_cast<BView*>(view)) {}
 
-	static BView* Of(const ServerView* node); // NULL for none and for the top node
 	ServerView* Node() const { return fView->fNode; }
 	ArchiveSource* Source() const { return fView->fSource; }
 	ViewExtras* Extras() const { return fView->fExtras; } // NULL while there are none
@@ -20,21 +19,21 @@ public:
 
 	// A bar enters or leaves its target; NULL takes it out.
 	void SetScrollBar(orientation direction, BScrollBar* bar);
+	// The first view of this or an ancestor that has bars; wheel movements go there.
+	static bool ScrollByWheel(BView* view, float dx, float dy);
 
-	// The steps of attaching and detaching, for a whole subtree.
+	// The subtree is linked below a node of the window's tree, which is locked: runs the hooks.
 	void Attach(BWindow* window);
+	// Runs the hooks and takes the subtree out of the window, and out of its parent.
 	void Detach();
-	// Deletes a child tree without taking its views out one by one.
-	void DeleteChildren();
+	// Puts an unattached view, and its subtree, among the children of a node.
+	static bool Insert(ServerView* parent, BView* child, BView* before, BWindow* window);
 
+	// The state that a hook sets is undone afterwards.
 	void CallDraw(BRect updateRect, bool afterChildren);
-	void DropState();
-	int16 HideCount() const;
-	const char* ToolTip() const;
+	void SetSource(BMessage* archive);
 
 private:
-	void _SetOwner(BWindow* window);
-
 	BView* fView; // borrowed
 };
 

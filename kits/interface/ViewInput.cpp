@@ -1,0 +1,282 @@
+// Mouse, keys and drags of views.
+#include <View.h>
+
+#include <cmath>
+#include <cstring>
+#include <vector>
+
+#include <AppDefs.h>
+#include <Bitmap.h>
+#include <Cursor.h>
+#include <Message.h>
+#include <Messenger.h>
+#include <Window.h>
+
+#include "app/private/Delivery.h"
+#include "app/private/LooperPrivate.h"
+#include "interface/private/BitmapAccess.h"
+#include "interface/private/ViewPrivate.h"
+#include "interface/private/ViewState.h"
+#include "interface/private/WindowInternals.h"
+#include "kernel/private/Activity.h"
+#include "server/Desktop.h"
+
+using namespace BPrivate;
+
+namespace {
+
+// How long a program that polls the mouse waits for news, so that it neither turns in circles nor
+// keeps others waiting for it.
+constexpr bigtime_t kPollPause = 10000;
+
+
+bool
+is_pointer_message(const BMessage& message)
+{
+	return message.what == B_MOUSE_MOVED || message.what == B_MOUSE_UP;
+}
+
+
+// The bitmap's pixels, opaque unless the drag's mode looks at transparency.
+std::vector<uint32>
+drag_pixels(const Surface& image, drawing_mode mode)
+{
+	std::vector<uint32> pixels;
+	pixels.reserve(static_cast<size_t>(image.Width()) * image.Height());
+	const bool keepsAlpha = mode != B_OP_COPY && image.Format() == SurfaceFormat::kAlpha;
+	for (int32 y = 0; y < image.Height(); y++) {
+		const uint32* row = image.Row(y);
+		for (int32 x = 0; x < image.Width(); x++) {
+			const bool clear = mode != B_OP_COPY && image.Format() == SurfaceFormat::kOpaque
+				&& (row[x] & 0xffffff) == 0x777477;
+			if (clear)
+				pixels.push_back(0);
+			else
+				pixels.push_back(keepsAlpha ? row[x] : row[x] | 0xff000000);
+		}
+	}
+	return pixels;
+}
+
+} // namespace
+
+
+void
+BView::MouseDown(BPoint where)
+{
+}
+
+
+void
+BView::MouseUp(BPoint where)
+{
+}
+
+
+void
+BView::MouseMoved(BPoint where, uint32 transit, const BMessage* dragMessage)
+{
+}
+
+
+void
+BView::KeyDown(const char* bytes, int32 numBytes)
+{
+	if (fOwner == nullptr || numBytes < 1 || bytes[0] != B_TAB)
+		return;
+	const BMessage* message = fOwner->CurrentMessage();
+	const uint32 held =
+		message != nullptr ? static_cast<uint32>(message->GetInt32("modifiers", 0)) : 0;
+	WindowInternals::Of(fOwner).Navigate(
+		this, (held & B_SHIFT_KEY) != 0, (held & B_CONTROL_KEY) != 0);
+}
+
+
+void
+BView::KeyUp(const char* bytes, int32 numBytes)
+{
+}
+
+
+void
+BView::GetMouse(BPoint* location, uint32* buttons, bool checkMessageQueue)
+{
+	BPoint screen;
+	uint32 held = 0;
+	Desktop* desktop = Desktop::Get();
+	if (fOwner == nullptr || desktop == nullptr || !_CheckOwnerLock()) {
+		if (location != nullptr)
+			*location = BPoint(0, 0);
+		if (buttons != nullptr)
+			*buttons = 0;
+		return;
+	}
+
+	LooperPrivate looper(fOwner);
+	std::unique_ptr<BMessage> message;
+	if (checkMessageQueue)
+		message.reset(looper.TakeMessage(is_pointer_message));
+	if (message != nullptr) {
+		screen = message->FindPoint("screen_where");
+		held = message->what == B_MOUSE_UP ? 0 : message->FindInt32("buttons");
+		WindowInternals::Of(fOwner).NoteConsumedPointer(*message);
+	} else {
+		static thread_local uint32 sSeen = 0;
+		const uint32 serial = desktop->PointerSerial();
+		if (checkMessageQueue && serial == sSeen) {
+			WaitingScope waiting(&looper.Activity());
+			desktop->WaitForPointer(serial, kPollPause);
+		}
+		sSeen = desktop->PointerSerial();
+		desktop->GetMouse(&screen, &held);
+	}
+	if (location != nullptr)
+		*location = ConvertFromScreen(screen);
+	if (buttons != nullptr)
+		*buttons = held;
+}
+
+
+// #pragma mark - event masks
+
+
+void
+BView::SetEventMask(uint32 mask, uint32 options)
+{
+	const uint32 oldMask = fExtras != nullptr ? fExtras->eventMask : 0;
+	const uint32 oldOptions = fExtras != nullptr ? fExtras->eventOptions : 0;
+	if (mask == oldMask && options == oldOptions)
+		return;
+	_CheckLock();
+	_Extras()->eventMask = mask;
+	_Extras()->eventOptions = options;
+	fTouched |= kTouchedEventMask;
+	if (fOwner != nullptr)
+		WindowInternals::Of(fOwner).EventMaskChanged(this);
+}
+
+
+uint32
+BView::EventMask()
+{
+	return fExtras != nullptr ? fExtras->eventMask : 0;
+}
+
+
+void
+BView::SetMouseEventMask(uint32 mask, uint32 options)
+{
+	if (fOwner == nullptr || !_CheckOwnerLock())
+		return;
+	WindowInternals& internals = WindowInternals::Of(fOwner);
+	if (!internals.inMouseDown)
+		return;
+	_Extras()->mouseEventMask |= mask;
+	_Extras()->mouseEventOptions |= options;
+	internals.EventMaskChanged(this);
+}
+
+
+void
+BView::SetViewCursor(const BCursor* cursor, bool sync)
+{
+	_CheckLock();
+	if (cursor == nullptr && fExtras == nullptr)
+		return;
+	_Extras()->cursor = cursor != nullptr ? std::make_unique<BCursor>(*cursor) : nullptr;
+	if (fOwner != nullptr)
+		WindowInternals::Of(fOwner).ApplyCursor();
+}
+
+
+// #pragma mark - drags
+
+
+void
+BView::DragMessage(BMessage* message, BRect dragRect, BHandler* replyTo)
+{
+	BPoint pointer;
+	GetMouse(&pointer, nullptr, false);
+	_StartDrag(message, nullptr, B_OP_COPY, dragRect, pointer - dragRect.LeftTop(), replyTo);
+}
+
+
+void
+BView::DragMessage(BMessage* message, BBitmap* bitmap, BPoint offset, BHandler* replyTo)
+{
+	DragMessage(message, bitmap, B_OP_COPY, offset, replyTo);
+}
+
+
+void
+BView::DragMessage(
+	BMessage* message, BBitmap* bitmap, drawing_mode dragMode, BPoint offset, BHandler* replyTo)
+{
+	_StartDrag(message, bitmap, dragMode, BRect(), offset, replyTo);
+	delete bitmap;
+}
+
+
+bool
+BView::_StartDrag(BMessage* message, BBitmap* bitmap, drawing_mode mode, BRect rect, BPoint offset,
+	BHandler* replyTo)
+{
+	Desktop* desktop = Desktop::Get();
+	if (message == nullptr || fOwner == nullptr || desktop == nullptr || !_CheckOwnerLock())
+		return false;
+	WindowInternals& internals = WindowInternals::Of(fOwner);
+	if (internals.server == nullptr)
+		return false;
+
+	BHandler* source = replyTo != nullptr ? replyTo : this;
+	if (source->Looper() == nullptr) {
+		debugger("DragMessage(): the reply target must belong to a looper.");
+		return false;
+	}
+	auto dragged = std::make_unique<BMessage>(*message);
+	Delivery::Of(*dragged).replyTo = BMessenger(source);
+
+	DragImage image;
+	image.offset = offset;
+	std::vector<uint32> pixels;
+	if (bitmap != nullptr) {
+		if (const std::shared_ptr<const Surface> surface = BitmapAccess::Pixels(*bitmap)) {
+			pixels = drag_pixels(*surface, mode);
+			image.bits = pixels.data();
+			image.width = surface->Width();
+			image.height = surface->Height();
+			image.bytesPerRow = image.width * 4;
+		}
+	} else if (rect.IsValid()) {
+		image.width = static_cast<int32>(std::ceil(rect.Width())) + 1;
+		image.height = static_cast<int32>(std::ceil(rect.Height())) + 1;
+	}
+	desktop->StartDrag(*internals.server, std::move(dragged), image);
+	return true;
+}
+
+
+// #pragma mark - rectangle tracking
+
+
+void
+BView::BeginRectTracking(BRect startRect, uint32 style)
+{
+	if (fOwner == nullptr || !_CheckOwnerLock())
+		return;
+	ViewExtras* extras = _Extras();
+	extras->trackingRect = startRect;
+	extras->trackingStyle = style;
+	extras->isTracking = true;
+	InvertRect(startRect);
+}
+
+
+void
+BView::EndRectTracking()
+{
+	if (fExtras == nullptr || !fExtras->isTracking)
+		return;
+	fExtras->isTracking = false;
+	InvertRect(fExtras->trackingRect);
+}

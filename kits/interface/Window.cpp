@@ -1,0 +1,631 @@
+#include <Window.h>
+
+#include <cmath>
+
+#include <AppDefs.h>
+#include <Application.h>
+#include <Button.h>
+#include <Debug.h>
+#include <MenuBar.h>
+#include <Message.h>
+#include <MessageQueue.h>
+#include <Screen.h>
+
+#include "app/private/LooperPrivate.h"
+#include "interface/private/OffscreenWindow.h"
+#include "interface/private/ViewPrivate.h"
+#include "interface/private/WindowInternals.h"
+
+using namespace BPrivate;
+
+namespace {
+
+struct TypeTraits {
+	window_type type;
+	window_look look;
+	window_feel feel;
+};
+
+constexpr TypeTraits kTypes[] = {
+	{ B_TITLED_WINDOW, B_TITLED_WINDOW_LOOK, B_NORMAL_WINDOW_FEEL },
+	{ B_DOCUMENT_WINDOW, B_DOCUMENT_WINDOW_LOOK, B_NORMAL_WINDOW_FEEL },
+	{ B_MODAL_WINDOW, B_MODAL_WINDOW_LOOK, B_MODAL_APP_WINDOW_FEEL },
+	{ B_FLOATING_WINDOW, B_FLOATING_WINDOW_LOOK, B_FLOATING_APP_WINDOW_FEEL },
+	{ B_BORDERED_WINDOW, B_BORDERED_WINDOW_LOOK, B_NORMAL_WINDOW_FEEL },
+	{ B_UNTYPED_WINDOW, B_TITLED_WINDOW_LOOK, B_NORMAL_WINDOW_FEEL },
+};
+
+
+const TypeTraits&
+traits_of(window_type type)
+{
+	for (const TypeTraits& traits : kTypes) {
+		if (traits.type == type)
+			return traits;
+	}
+	return kTypes[0];
+}
+
+
+window_type
+type_of(window_look look, window_feel feel)
+{
+	for (const TypeTraits& traits : kTypes) {
+		if (traits.look == look && traits.feel == feel)
+			return traits.type;
+	}
+	return B_UNTYPED_WINDOW;
+}
+
+
+BRect
+whole_frame(BRect frame)
+{
+	return BRect(std::round(frame.left), std::round(frame.top), std::round(frame.right),
+		std::round(frame.bottom));
+}
+
+} // namespace
+
+
+BWindow::BWindow(
+	BRect frame, const char* title, window_type type, uint32 flags, uint32 workspaces) :
+	BLooper(title, B_DISPLAY_PRIORITY)
+{
+	const TypeTraits& traits = traits_of(type);
+	_Init(frame, title, traits.look, traits.feel, flags, workspaces, type);
+}
+
+
+BWindow::BWindow(BRect frame, const char* title, window_look look, window_feel feel, uint32 flags,
+	uint32 workspaces) :
+	BLooper(title, B_DISPLAY_PRIORITY)
+{
+	_Init(frame, title, look, feel, flags, workspaces, type_of(look, feel));
+}
+
+
+BWindow::BWindow(BRect frame, BBitmap* bitmap, Surface* surface) :
+	BLooper("offscreen bitmap"), fInternals(new WindowInternals(*this, frame, surface, bitmap))
+{
+}
+
+
+BWindow::~BWindow()
+{
+	if (fInternals == nullptr)
+		return;
+	_DeleteViews();
+	delete fInternals;
+	fInternals = nullptr;
+}
+
+
+void
+BWindow::_Init(BRect frame, const char* title, window_look look, window_feel feel, uint32 flags,
+	uint32 workspaces, window_type type)
+{
+	frame = whole_frame(frame);
+	fInternals = new WindowInternals(*this, frame, nullptr, nullptr);
+	fInternals->title = title != nullptr ? title : "";
+	fInternals->type = type;
+	fInternals->look = look;
+	fInternals->feel = feel;
+	fInternals->flags = flags;
+	fInternals->workspaces = workspaces;
+	fInternals->server = std::make_unique<ServerWindow>(
+		fInternals, frame, fInternals->title.c_str(), look, feel, flags);
+	LooperPrivate(this).MarkAsWindow();
+}
+
+
+// Every view leaves its window before it is deleted, so that its hooks find both whole.
+void
+BWindow::_DeleteViews()
+{
+	ServerView& root = fInternals->tree.Root();
+	while (ServerView* node = root.FirstChild()) {
+		BView* view = node->Owner();
+		view->RemoveSelf();
+		delete view;
+	}
+}
+
+
+void
+BWindow::Quit()
+{
+	if (!IsLocked()) {
+		debugger("A window must be locked before Quit().");
+		return;
+	}
+	const bool quitsApplication =
+		(Flags() & B_QUIT_ON_WINDOW_CLOSE) != 0 && be_app != nullptr && fInternals->shownOnce;
+	while (fInternals->server != nullptr && !IsHidden())
+		Hide();
+	_DeleteViews();
+	if (quitsApplication)
+		be_app->PostMessage(B_QUIT_REQUESTED);
+	BLooper::Quit();
+}
+
+
+bool
+BWindow::QuitRequested()
+{
+	return BLooper::QuitRequested();
+}
+
+
+thread_id
+BWindow::Run()
+{
+	return BLooper::Run();
+}
+
+
+void
+BWindow::task_looper()
+{
+}
+
+
+// #pragma mark - views
+
+
+void
+BWindow::AddChild(BView* child, BView* before)
+{
+	const bool locked = Lock();
+	ViewPrivate::Insert(&fInternals->tree.Root(), child, before, this);
+	if (locked)
+		Unlock();
+}
+
+
+bool
+BWindow::RemoveChild(BView* child)
+{
+	if (child == nullptr || child->Window() != this || child->Parent() != nullptr)
+		return false;
+	return child->RemoveSelf();
+}
+
+
+int32
+BWindow::CountChildren() const
+{
+	return fInternals->tree.Root().CountChildren();
+}
+
+
+BView*
+BWindow::ChildAt(int32 index) const
+{
+	const ServerView* node = fInternals->tree.Root().ChildAt(index);
+	return node != nullptr ? node->Owner() : nullptr;
+}
+
+
+BView*
+BWindow::FindView(const char* name) const
+{
+	const ServerView& root = fInternals->tree.Root();
+	for (ServerView* node = root.FirstChild(); node != nullptr; node = node->Next()) {
+		if (BView* found = node->Owner()->FindView(name))
+			return found;
+	}
+	return nullptr;
+}
+
+
+BView*
+BWindow::FindView(BPoint point) const
+{
+	const ServerView* node = fInternals->tree.ViewAt(point);
+	return node != nullptr ? node->Owner() : nullptr;
+}
+
+
+BView*
+BWindow::CurrentFocus() const
+{
+	return fInternals->focus;
+}
+
+
+BView*
+BWindow::LastMouseMovedView() const
+{
+	return fInternals->mouseView;
+}
+
+
+// #pragma mark - showing
+
+
+void
+BWindow::Show()
+{
+	if (fInternals->server == nullptr)
+		return;
+	const bool wasLocked = IsLocked();
+	if (!wasLocked && !Lock())
+		return;
+
+	WindowInternals& internals = *fInternals;
+	internals.hideCount--;
+	if (internals.hideCount == 0) {
+		internals.PrepareSurface();
+		internals.tree.Invalidate(internals.tree.Root(), internals.tree.Root().Bounds());
+		internals.server->Show();
+		internals.UpdateNeeded();
+	}
+	const bool starts = !internals.shownOnce;
+	internals.shownOnce = true;
+	if (starts) {
+		LooperPrivate(this).RegisterWindow(this);
+		Run(); // lets go of the lock that the constructor took
+	}
+	if (!wasLocked)
+		Unlock();
+}
+
+
+void
+BWindow::Hide()
+{
+	if (fInternals->server == nullptr)
+		return;
+	const bool wasLocked = IsLocked();
+	if (!wasLocked && !Lock())
+		return;
+	if (fInternals->hideCount++ == 0)
+		fInternals->server->Hide();
+	if (!wasLocked)
+		Unlock();
+}
+
+
+bool
+BWindow::IsHidden() const
+{
+	return fInternals->bitmap == nullptr && fInternals->hideCount > 0;
+}
+
+
+bool
+BWindow::IsMinimized() const
+{
+	return fInternals->minimized;
+}
+
+
+void
+BWindow::Minimize(bool minimize)
+{
+	if (fInternals->server == nullptr || IsModal() || IsHidden())
+		return;
+	fInternals->minimized = minimize;
+	fInternals->server->Minimize(minimize);
+}
+
+
+void
+BWindow::Activate(bool active)
+{
+	if (fInternals->server != nullptr && !IsHidden())
+		fInternals->server->Activate(active);
+}
+
+
+bool
+BWindow::IsActive() const
+{
+	return fInternals->active;
+}
+
+
+bool
+BWindow::IsFront() const
+{
+	return fInternals->server != nullptr && fInternals->server->IsFront();
+}
+
+
+status_t
+BWindow::SendBehind(const BWindow* window)
+{
+	if (fInternals->server == nullptr)
+		return B_ERROR;
+	const ServerWindow* other = window != nullptr ? window->fInternals->server.get() : nullptr;
+	fInternals->server->SendBehind(other);
+	return B_OK;
+}
+
+
+// #pragma mark - hooks
+
+
+void
+BWindow::MessageReceived(BMessage* message)
+{
+	BLooper::MessageReceived(message);
+}
+
+
+void
+BWindow::FrameMoved(BPoint newPosition)
+{
+}
+
+
+void
+BWindow::FrameResized(float newWidth, float newHeight)
+{
+}
+
+
+void
+BWindow::WorkspacesChanged(uint32 oldWorkspaces, uint32 newWorkspaces)
+{
+}
+
+
+void
+BWindow::WorkspaceActivated(int32 workspace, bool state)
+{
+}
+
+
+void
+BWindow::WindowActivated(bool active)
+{
+}
+
+
+void
+BWindow::ScreenChanged(BRect screenSize, color_space format)
+{
+}
+
+
+void
+BWindow::MenusBeginning()
+{
+}
+
+
+void
+BWindow::MenusEnded()
+{
+}
+
+
+void
+BWindow::Zoom(BPoint leftTop, float width, float height)
+{
+	MoveTo(leftTop);
+	ResizeTo(width, height);
+}
+
+
+// The largest frame that the limits and the screen allow, and back to the one before.
+void
+BWindow::Zoom()
+{
+	const BRect now = Frame();
+	if (fInternals->beforeZoom.IsValid()) {
+		const BRect before = fInternals->beforeZoom;
+		fInternals->beforeZoom = BRect();
+		Zoom(before.LeftTop(), before.Width(), before.Height());
+		return;
+	}
+	fInternals->beforeZoom = now;
+	const BRect screen = BScreen(this).Frame();
+	const float width =
+		std::min({ screen.Width(), fInternals->maxWidth, fInternals->zoomMaxWidth });
+	const float height =
+		std::min({ screen.Height(), fInternals->maxHeight, fInternals->zoomMaxHeight });
+	const BPoint leftTop(
+		std::min(now.left, screen.right - width), std::min(now.top, screen.bottom - height));
+	Zoom(leftTop, width, height);
+}
+
+
+void
+BWindow::SetZoomLimits(float maxWidth, float maxHeight)
+{
+	fInternals->zoomMaxWidth = maxWidth;
+	fInternals->zoomMaxHeight = maxHeight;
+}
+
+
+// #pragma mark - input
+
+
+void
+BWindow::SetPulseRate(bigtime_t rate)
+{
+	if (rate < 0 || rate == fInternals->pulseRate)
+		return;
+	fInternals->pulseRate = rate;
+	fInternals->UpdatePulse();
+}
+
+
+bigtime_t
+BWindow::PulseRate() const
+{
+	return fInternals->pulseRate;
+}
+
+
+void
+BWindow::AddShortcut(uint32 key, uint32 modifiers, BMessage* message)
+{
+	fInternals->AddShortcut(key, modifiers, message, nullptr, false);
+}
+
+
+void
+BWindow::AddShortcut(uint32 key, uint32 modifiers, BMessage* message, BHandler* target)
+{
+	fInternals->AddShortcut(key, modifiers, message, target, true);
+}
+
+
+void
+BWindow::RemoveShortcut(uint32 key, uint32 modifiers)
+{
+	fInternals->RemoveShortcut(key, modifiers);
+}
+
+
+void
+BWindow::SetDefaultButton(BButton* button)
+{
+	BButton* previous = fInternals->defaultButton;
+	if (previous == button)
+		return;
+	// The pointer changes first: MakeDefault() calls back.
+	fInternals->defaultButton = button;
+	fInternals->defaultButtonView = button;
+	if (previous != nullptr) {
+		previous->MakeDefault(false);
+		previous->Invalidate();
+	}
+	if (button != nullptr) {
+		button->MakeDefault(true);
+		button->Invalidate();
+	}
+}
+
+
+BButton*
+BWindow::DefaultButton() const
+{
+	return fInternals->defaultButton;
+}
+
+
+void
+BWindow::SetKeyMenuBar(BMenuBar* bar)
+{
+	fInternals->keyMenuBar = bar;
+	fInternals->keyMenuBarView = bar;
+}
+
+
+BMenuBar*
+BWindow::KeyMenuBar() const
+{
+	return fInternals->keyMenuBar;
+}
+
+
+bool
+BWindow::_OpenKeyMenuBar()
+{
+	if (fInternals->keyMenuBar == nullptr)
+		return false;
+	fInternals->keyMenuBar->_OpenByKey();
+	return true;
+}
+
+
+// #pragma mark - updates
+
+
+bool
+BWindow::NeedsUpdate() const
+{
+	return fInternals->tree.IsDirty();
+}
+
+
+void
+BWindow::UpdateIfNeeded()
+{
+	if (fInternals->server == nullptr || Thread() != find_thread(nullptr) || !IsLocked())
+		return;
+	if (!fInternals->tree.IsDirty() || fInternals->tree.IsUpdating())
+		return;
+	LooperPrivate looper(this);
+	looper.CancelUpdate();
+	looper.Deliver(new BMessage(_UPDATE_), this);
+}
+
+
+void
+BWindow::Flush() const
+{
+	if (IsLocked())
+		fInternals->Present();
+}
+
+
+void
+BWindow::Sync() const
+{
+	Flush();
+}
+
+
+void
+BWindow::DisableUpdates()
+{
+	fInternals->updatesDisabled++;
+}
+
+
+void
+BWindow::EnableUpdates()
+{
+	if (fInternals->updatesDisabled == 0 || --fInternals->updatesDisabled > 0)
+		return;
+	if (fInternals->tree.IsDirty())
+		fInternals->UpdateNeeded();
+}
+
+
+void
+BWindow::BeginViewTransaction()
+{
+	fInternals->transactions++;
+}
+
+
+void
+BWindow::EndViewTransaction()
+{
+	if (fInternals->transactions > 0 && --fInternals->transactions == 0)
+		fInternals->MessageHandled();
+}
+
+
+bool
+BWindow::InViewTransaction() const
+{
+	return fInternals->transactions > 0;
+}
+
+
+// #pragma mark - private
+
+
+BWindow*
+BPrivate::NewOffscreenWindow(BBitmap* bitmap, Surface* surface)
+{
+	return WindowInternals::NewOffscreen(bitmap, surface);
+}
+
+
+BWindow*
+WindowInternals::NewOffscreen(BBitmap* bitmap, Surface* surface)
+{
+	const BRect frame(0, 0, surface->Width() - 1, surface->Height() - 1);
+	BWindow* window = new BWindow(frame, bitmap, surface);
+	window->Unlock();
+	return window;
+}

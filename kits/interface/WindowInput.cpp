@@ -1,0 +1,473 @@
+// How a window finds the view for its input, and what reaches which hook.
+#include <Window.h>
+
+#include <algorithm>
+#include <cstring>
+
+#include <AppDefs.h>
+#include <Message.h>
+#include <ScrollBar.h>
+
+#include "app/private/Delivery.h"
+#include "app/private/LooperPrivate.h"
+#include "interface/private/ViewPrivate.h"
+#include "interface/private/ViewState.h"
+#include "interface/private/WindowInternals.h"
+
+using namespace BPrivate;
+
+namespace {
+
+// A pointer movement older than this is left out when a newer one waits.
+constexpr bigtime_t kStaleMove = 20000;
+
+constexpr const char* kViewWhere = "be:view_where";
+constexpr const char* kTransit = "be:transit";
+
+
+int32
+transit(bool wasInside, bool isInside)
+{
+	if (isInside)
+		return wasInside ? B_INSIDE_VIEW : B_ENTERED_VIEW;
+	return wasInside ? B_EXITED_VIEW : B_OUTSIDE_VIEW;
+}
+
+
+BView*
+owner_of(const ServerView* node)
+{
+	return node != nullptr ? node->Owner() : nullptr;
+}
+
+
+uint32
+pointer_options(const BView* view)
+{
+	const ViewExtras* extras = ViewPrivate(view).Extras();
+	return extras != nullptr ? extras->eventOptions | extras->mouseEventOptions : 0;
+}
+
+
+bool
+has_mask(const BView* view, uint32 bit)
+{
+	const ViewExtras* extras = ViewPrivate(view).Extras();
+	return extras != nullptr && ((extras->eventMask | extras->mouseEventMask) & bit) != 0;
+}
+
+} // namespace
+
+
+void
+BWindow::_RouteMessage(BMessage* message, BHandler* target)
+{
+	fInternals->Route(message, target);
+	fInternals->MessageHandled();
+}
+
+
+void
+WindowInternals::Route(BMessage* message, BHandler* target)
+{
+	if (target != &window) {
+		_Deliver(message, target);
+		return;
+	}
+	switch (message->what) {
+		case B_MOUSE_DOWN:
+		case B_MOUSE_UP:
+			_RoutePress(message);
+			break;
+
+		case B_MOUSE_MOVED:
+			_RouteMove(message);
+			break;
+
+		case B_MOUSE_WHEEL_CHANGED:
+			_RouteWheel(message);
+			break;
+
+		case _MESSAGE_DROPPED_:
+			_RouteDrop(message);
+			break;
+
+		case B_KEY_DOWN:
+		case B_KEY_UP:
+		case B_UNMAPPED_KEY_DOWN:
+		case B_UNMAPPED_KEY_UP:
+		case B_MODIFIERS_CHANGED:
+			_RouteKey(message);
+			break;
+
+		default:
+			_Deliver(message, target);
+			break;
+	}
+}
+
+
+void
+WindowInternals::_Deliver(BMessage* message, BHandler* target)
+{
+	LooperPrivate(&window).Deliver(message, target);
+}
+
+
+// #pragma mark - pointer
+
+
+void
+WindowInternals::_RoutePress(BMessage* message)
+{
+	const std::unique_ptr<BMessage> event(message);
+	server->BeginInput(*event);
+	const bool elsewhere = event->GetBool(kPointerElsewhere, false);
+	const bool isDown = event->what == B_MOUSE_DOWN;
+	pointerTarget = elsewhere ? nullptr : owner_of(tree.ViewAt(event->FindPoint("where")));
+	if (isDown)
+		pressed = true;
+
+	inMouseDown = isDown;
+	bool delivered = _DeliverToMasks(*event, pointerTarget, false);
+	if (pointerTarget != nullptr && !has_mask(pointerTarget, B_POINTER_EVENTS)) {
+		_DeliverPointer(*event, pointerTarget, -1);
+		delivered = true;
+	}
+	inMouseDown = false;
+	pointerTarget = nullptr;
+	if (!delivered && !elsewhere)
+		_Deliver(new BMessage(*event), &window);
+	if (!isDown)
+		_EndPress();
+}
+
+
+// Every view with a pointer mask hears first, then the view that was left, then the one entered.
+void
+WindowInternals::_RouteMove(BMessage* message)
+{
+	const std::unique_ptr<BMessage> event(message);
+	const bool elsewhere = event->GetBool(kPointerElsewhere, false);
+	BView* view = elsewhere ? nullptr : owner_of(tree.ViewAt(event->FindPoint("where")));
+	if (view == mouseView && _IsStale(*event))
+		return;
+	if (server != nullptr)
+		server->BeginInput(*event);
+
+	const bool changed = view != mouseView;
+	leftView = changed ? mouseView : nullptr;
+	mouseView = view;
+	enteredView = changed ? view : nullptr;
+	if (changed)
+		ApplyCursor();
+
+	bool delivered = _DeliverToMasks(*event, view, true);
+	if (leftView != nullptr && !has_mask(leftView, B_POINTER_EVENTS)) {
+		_DeliverPointer(*event, leftView, B_EXITED_VIEW);
+		delivered = true;
+	}
+	// Hooks may have taken the view out, or have moved the pointer on by a nested loop.
+	if (mouseView != nullptr && mouseView == view && !has_mask(view, B_POINTER_EVENTS)) {
+		_DeliverPointer(*event, view, transit(enteredView != view, true));
+		delivered = true;
+	}
+	leftView = enteredView = nullptr;
+	if (!delivered && !elsewhere)
+		_Deliver(new BMessage(*event), &window);
+}
+
+
+// Returns whether any view has got the message.
+bool
+WindowInternals::_DeliverToMasks(const BMessage& event, BView* under, bool isMove)
+{
+	if (eventMaskViews.empty())
+		return false;
+	bool delivered = false;
+	// Hooks change masks and take views out.
+	const std::vector<BView*> views = eventMaskViews;
+	for (BView* view : views) {
+		const bool still =
+			std::find(eventMaskViews.begin(), eventMaskViews.end(), view) != eventMaskViews.end();
+		if (!still || !has_mask(view, B_POINTER_EVENTS))
+			continue;
+		if (isMove && (pointer_options(view) & B_NO_POINTER_HISTORY) != 0 && _NewerMoveWaits())
+			continue;
+		int32 how = -1;
+		if (isMove) {
+			const bool wasInside = view == leftView || (view == under && view != enteredView);
+			how = transit(wasInside, view == under);
+		}
+		_DeliverPointer(event, view, how);
+		delivered = true;
+	}
+	return delivered;
+}
+
+
+// A copy for one view: the place in its coordinates, and the transit if there is one.
+void
+WindowInternals::_DeliverPointer(const BMessage& event, BView* view, int32 how)
+{
+	auto copy = new BMessage(event);
+	copy->RemoveName(kPointerElsewhere);
+	const BPoint where = event.FindPoint("where") - ViewPrivate(view).Node()->Origin();
+	if (how >= 0)
+		copy->AddInt32(kTransit, how);
+	else
+		copy->ReplacePoint("where", where);
+	copy->AddPoint(kViewWhere, where);
+	_Deliver(copy, view);
+}
+
+
+bool
+WindowInternals::_NewerMoveWaits()
+{
+	bool waits = false;
+	LooperPrivate(&window).TakeMessage([&waits](const BMessage& message) {
+		waits = waits || message.what == B_MOUSE_MOVED;
+		return false;
+	});
+	return waits;
+}
+
+
+// An old movement inside of one view is left out, unless somebody wants them all.
+bool
+WindowInternals::_IsStale(const BMessage& event)
+{
+	if (system_time() - event.GetInt64("when", 0) < kStaleMove)
+		return false;
+	for (const BView* view : eventMaskViews) {
+		if ((pointer_options(view) & B_FULL_POINTER_HISTORY) != 0)
+			return false;
+	}
+	return _NewerMoveWaits();
+}
+
+
+void
+WindowInternals::_RouteWheel(BMessage* message)
+{
+	BPoint where;
+	BView* view = mouseView;
+	if (message->FindPoint("where", &where) == B_OK)
+		view = owner_of(tree.ViewAt(where));
+	_Deliver(message, view != nullptr ? static_cast<BHandler*>(view) : &window);
+}
+
+
+// What GetMouse() has taken out of the queue never reaches a hook, but what follows from it does.
+void
+WindowInternals::NoteConsumedPointer(const BMessage& message)
+{
+	server->BeginInput(message);
+	if (message.what == B_MOUSE_UP)
+		_EndPress();
+}
+
+
+// #pragma mark - event masks
+
+
+void
+WindowInternals::EventMaskChanged(BView* view)
+{
+	const bool wanted = has_mask(view, ~0u);
+	const auto found = std::find(eventMaskViews.begin(), eventMaskViews.end(), view);
+	if (wanted && found == eventMaskViews.end())
+		eventMaskViews.push_back(view);
+	else if (!wanted && found != eventMaskViews.end())
+		eventMaskViews.erase(found);
+	_UpdatePointerWish();
+}
+
+
+void
+WindowInternals::_EndPress()
+{
+	pressed = false;
+	const std::vector<BView*> views = eventMaskViews;
+	for (BView* view : views) {
+		ViewExtras* extras = ViewPrivate(view).Extras();
+		extras->mouseEventMask = 0;
+		extras->mouseEventOptions = 0;
+		EventMaskChanged(view);
+	}
+}
+
+
+void
+WindowInternals::_UpdatePointerWish()
+{
+	if (server == nullptr)
+		return;
+	const bool wants = std::any_of(eventMaskViews.begin(), eventMaskViews.end(),
+		[](const BView* view) { return has_mask(view, B_POINTER_EVENTS); });
+	if (wants != wantsAllPointer) {
+		wantsAllPointer = wants;
+		server->SetWantsAllPointerEvents(wants);
+	}
+}
+
+
+// #pragma mark - drops
+
+
+// The dragged message arrives under its own code. Its target is found now: the view that was under
+// the pointer may have gone meanwhile.
+void
+WindowInternals::_RouteDrop(BMessage* message)
+{
+	const BPoint where = window.ConvertFromScreen(message->FindPoint("_drop_point_"));
+	message->what = static_cast<uint32>(message->FindInt32("_original_what"));
+	message->RemoveName("_original_what");
+	const Delivery* delivery = Delivery::Find(*message);
+	mark_as_dropped(message, delivery != nullptr ? delivery->replyTo : BMessenger());
+	BView* view = owner_of(tree.ViewAt(where));
+	_Deliver(message, view != nullptr ? static_cast<BHandler*>(view) : &window);
+}
+
+
+// #pragma mark - dispatch
+
+
+void
+BWindow::DispatchMessage(BMessage* message, BHandler* handler)
+{
+	if (BView* view = dynamic_cast<BView*>(handler)) {
+		_DispatchToView(message, view);
+		return;
+	}
+	if (handler != this) {
+		BLooper::DispatchMessage(message, handler);
+		return;
+	}
+
+	WindowInternals& internals = *fInternals;
+	switch (message->what) {
+		case _UPDATE_:
+			internals.Update();
+			break;
+
+		case B_WINDOW_RESIZED: {
+			internals.FollowServerSize();
+			const BRect bounds = Bounds();
+			FrameResized(message->GetInt32("width", bounds.IntegerWidth()),
+				message->GetInt32("height", bounds.IntegerHeight()));
+			break;
+		}
+
+		case B_WINDOW_MOVED:
+			FrameMoved(message->GetPoint("where", Frame().LeftTop()));
+			break;
+
+		case B_WINDOW_ACTIVATED:
+			internals.CallWindowActivated(message->FindBool("active"));
+			break;
+
+		case B_KEY_DOWN:
+			if (!internals.HandleKeyDown(message)) {
+				const char* bytes = message->GetString("bytes", "");
+				if (bytes[0] == B_TAB)
+					internals.Navigate(
+						nullptr, (message->FindInt32("modifiers") & B_SHIFT_KEY) != 0, false);
+				else
+					MessageReceived(message);
+			}
+			break;
+
+		case B_PULSE:
+			internals.Pulse();
+			break;
+
+		case B_MINIMIZE:
+			Minimize(message->GetBool("minimize", true));
+			break;
+
+		case B_ZOOM:
+			Zoom();
+			break;
+
+		case B_SCREEN_CHANGED:
+			internals.UpdateNeeded();
+			ScreenChanged(message->FindRect("frame"),
+				static_cast<color_space>(message->GetInt32("mode", B_RGBA32)));
+			break;
+
+		case B_WORKSPACE_ACTIVATED:
+			WorkspaceActivated(message->FindInt32("workspace"), message->FindBool("active"));
+			break;
+
+		case B_WORKSPACES_CHANGED:
+			WorkspacesChanged(message->FindInt32("old"), message->FindInt32("new"));
+			break;
+
+		default:
+			BLooper::DispatchMessage(message, handler);
+			break;
+	}
+}
+
+
+void
+BWindow::_DispatchToView(BMessage* message, BView* view)
+{
+	// A drop may carry any code, also one of these.
+	if (message->WasDropped()) {
+		view->MessageReceived(message);
+		return;
+	}
+	switch (message->what) {
+		case B_MOUSE_DOWN:
+			view->MouseDown(message->FindPoint("where"));
+			break;
+
+		case B_MOUSE_UP:
+			view->MouseUp(message->FindPoint("where"));
+			break;
+
+		case B_MOUSE_MOVED: {
+			BMessage dragged;
+			const bool drags = message->FindMessage("be:drag_message", &dragged) == B_OK;
+			view->MouseMoved(message->FindPoint(kViewWhere),
+				static_cast<uint32>(message->GetInt32(kTransit, B_INSIDE_VIEW)),
+				drags ? &dragged : nullptr);
+			break;
+		}
+
+		case B_KEY_DOWN:
+			if (!fInternals->HandleKeyDown(message)) {
+				const char* bytes = message->GetString("bytes", "");
+				view->KeyDown(bytes, static_cast<int32>(strlen(bytes)));
+			}
+			break;
+
+		case B_KEY_UP: {
+			const char* bytes = message->GetString("bytes", "");
+			view->KeyUp(bytes, static_cast<int32>(strlen(bytes)));
+			break;
+		}
+
+		case B_VIEW_MOVED:
+			view->FrameMoved(message->FindPoint("where"));
+			break;
+
+		case B_VIEW_RESIZED:
+			view->FrameResized(message->FindInt32("width"), message->FindInt32("height"));
+			break;
+
+		case B_VALUE_CHANGED:
+			if (BScrollBar* bar = dynamic_cast<BScrollBar*>(view))
+				bar->ValueChanged(message->FindInt32("value"));
+			else
+				BLooper::DispatchMessage(message, view);
+			break;
+
+		default:
+			BLooper::DispatchMessage(message, view);
+			break;
+	}
+}

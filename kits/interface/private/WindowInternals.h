@@ -1,0 +1,143 @@
+// WindowInternals: a window's views, its input and its updates.
+#pragma once
+
+#include <memory>
+#include <string>
+#include <vector>
+
+#include <MessageRunner.h>
+#include <Window.h>
+
+#include "app/private/ArchiveSource.h"
+#include "server/ServerWindow.h"
+#include "server/ViewTree.h"
+
+namespace BPrivate {
+
+class ViewWalk;
+
+
+// Belongs to who holds the window's lock, except for PostInput(), which the display thread calls.
+class WindowInternals final : public WindowClient, public ViewTreeClient {
+public:
+	struct Shortcut {
+		uint32 key; // lower case
+		uint32 modifiers;
+		std::unique_ptr<BMessage> message; // NULL for those of the window itself
+		BHandler* target; // borrowed; NULL for the focus
+		BView* targetView; // the same, if it is a view
+		bool hasTarget; // false: the window
+	};
+
+	// Without a bitmap's surface it is a window of the desktop.
+	WindowInternals(BWindow& window, BRect frame, Surface* bitmapSurface, BBitmap* bitmap);
+	~WindowInternals() override;
+
+	static WindowInternals& Of(const BWindow* window) { return *window->fInternals; }
+	static BWindow* NewOffscreen(BBitmap* bitmap, Surface* surface);
+
+	// WindowClient
+	void PostInput(BMessage* message) override;
+	// ViewTreeClient
+	void DrawView(ServerView& view, BRect updateRect, bool afterChildren) override;
+	void FrameChanged(ServerView& view, bool moved, bool resized) override;
+	void UpdateNeeded() override;
+
+	// Views come and go; the hooks are not this class's affair.
+	void ViewsEntered(ServerView& top);
+	void ViewsLeave(ServerView& top); // forgets every pointer into the subtree
+	void EventMaskChanged(BView* view);
+	void ViewHidden(BView* view);
+	void NeedPulse();
+	void UpdatePulse();
+	void Pulse();
+
+	// Drawing outside of an update: shown when the present message has been handled, or by a
+	// message of its own when another thread draws.
+	void NoteDrawing();
+	void Present();
+	void Update();
+	void PrepareSurface();
+	void MessageHandled();
+	void FollowServerSize();
+	void ResizeViews(float width, float height);
+	status_t ApplyKind();
+
+	// Input, in WindowInput.cpp and WindowKeys.cpp. Takes ownership of the message.
+	void Route(BMessage* message, BHandler* target);
+	void NoteConsumedPointer(const BMessage& message);
+	void SetFocus(BView* view);
+	void Navigate(const BView* from, bool backwards, bool byGroups);
+	// Whether the key belongs to the window: a shortcut, or a key with Command held.
+	bool HandleKeyDown(BMessage* message);
+	bool SendShortcut(uint32 key, uint32 modifiers);
+	void AddShortcut(
+		uint32 key, uint32 modifiers, BMessage* message, BHandler* target, bool hasTarget);
+	void RemoveShortcut(uint32 key, uint32 modifiers);
+	void ApplyCursor();
+	void CallWindowActivated(bool active);
+
+	BWindow& window;
+	ViewTree tree;
+	std::unique_ptr<ServerWindow> server; // NULL for a bitmap's window
+	Surface* bitmapSurface; // borrowed; NULL for a window of the desktop
+	BBitmap* bitmap; // borrowed
+
+	std::string title;
+	window_type type = B_TITLED_WINDOW;
+	window_look look = B_TITLED_WINDOW_LOOK;
+	window_feel feel = B_NORMAL_WINDOW_FEEL;
+	uint32 flags = 0;
+	uint32 workspaces = 0;
+	float minWidth = 0, maxWidth = 32768, minHeight = 0, maxHeight = 32768;
+	float zoomMaxWidth = 32768, zoomMaxHeight = 32768;
+	BRect beforeZoom; // not valid while the window is not zoomed
+	int32 hideCount = 1; // a new window is hidden
+	bool shownOnce = false;
+	bool minimized = false;
+	bool active = false; // what the window has been told
+	int32 updatesDisabled = 0;
+	int32 transactions = 0;
+	bool presentPosted = false;
+	float surfaceScale = 0; // of what the tree paints on
+	BRegion toPresent; // painted and not yet shown
+
+	BView* focus = nullptr; // borrowed, as are the following
+	BView* mouseView = nullptr;
+	BButton* defaultButton = nullptr;
+	BView* defaultButtonView = nullptr; // the same
+	BMenuBar* keyMenuBar = nullptr;
+	BView* keyMenuBarView = nullptr; // the same
+	std::vector<BView*> eventMaskViews; // with a permanent or temporary mask
+	bool pressed = false; // between a press that came in and its release
+	bool inMouseDown = false;
+	bool wantsAllPointer = false;
+	BView* pointerTarget = nullptr; // during the handling of one pointer message
+	BView* leftView = nullptr;
+	BView* enteredView = nullptr;
+
+	std::vector<Shortcut> shortcuts;
+	std::unique_ptr<BMessageRunner> pulseRunner;
+	bigtime_t pulseRate = 500000;
+	bool pulseNeeded = false;
+	ViewWalk* walks = nullptr;
+	std::unique_ptr<ArchiveSource> source;
+
+private:
+	void _RoutePress(BMessage* message);
+	void _RouteMove(BMessage* message);
+	void _RouteWheel(BMessage* message);
+	void _RouteDrop(BMessage* message);
+	void _RouteKey(BMessage* message);
+	bool _DeliverToMasks(const BMessage& event, BView* under, bool isMove);
+	void _DeliverPointer(const BMessage& event, BView* view, int32 transit);
+	void _Deliver(BMessage* message, BHandler* target);
+	bool _NewerMoveWaits();
+	bool _IsStale(const BMessage& event);
+	void _EndPress();
+	void _UpdatePointerWish();
+	void _HandleCommandKey(uint32 raw, uint32 typed, uint32 held);
+};
+
+
+} // namespace BPrivate
