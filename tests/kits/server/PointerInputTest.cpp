@@ -144,6 +144,7 @@ TEST_F(PointerInput, WindowIsToldOnceThatThePointerLeftIt)
 
 TEST_F(PointerInput, FrontmostWindowIsUnderThePointer)
 {
+	input.Move(BPoint(500, 500));
 	TestWindow back(BRect(0, 0, 99, 99)), front(BRect(50, 0, 149, 99));
 	Settle();
 	back.Take();

@@ -6,10 +6,10 @@ using WindowPolicy = DesktopTest;
 
 namespace {
 
-constexpr BRect kLeft(0, 0, 99, 99);
-constexpr BRect kRight(200, 0, 299, 99);
-constexpr BPoint kInLeft(50, 50);
-constexpr BPoint kInRight(250, 50);
+const BRect kLeft(0, 0, 99, 99);
+const BRect kRight(200, 0, 299, 99);
+const BPoint kInLeft(50, 50);
+const BPoint kInRight(250, 50);
 
 } // namespace
 
