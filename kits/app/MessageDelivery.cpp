@@ -20,33 +20,58 @@ namespace {
 
 constexpr const char* kPrevious = "_previous_";
 
-// Where a synchronous sender waits for its answer: the first one counts.
+// Where a synchronous sender waits for its answer: the first one counts. If the sender runs a loop,
+// it counts as idle while it waits, since the receiver may be waiting for its user; it has work
+// again from the moment the answer is given, which is part of the receiver's own work.
 class ReplyPort final : public Port {
 public:
+	ReplyPort()
+	{
+		if (LooperCore* loop = LooperCore::OfThisThread())
+			fSender = &loop->Activity();
+		if (fSender != nullptr)
+			fSender->BeginWaiting();
+	}
+
 	status_t Receive(std::unique_ptr<BMessage> message, bigtime_t) override
 	{
 		std::lock_guard lock(fLock);
+		if (fIsOver)
+			return B_BAD_PORT_ID;
 		if (!fReply)
 			fReply = std::move(message);
+		_EndWaiting();
 		fArrived.notify_all();
 		return B_OK;
 	}
 
+	// Ends the waiting, also when there was no answer in time.
 	std::unique_ptr<BMessage> Wait(bigtime_t timeout)
 	{
 		std::unique_lock lock(fLock);
 		const auto arrived = [&] { return fReply != nullptr; };
-		if (timeout == B_INFINITE_TIMEOUT)
+		if (timeout > bigtime_t(1) << 51) // would overflow the clock
 			fArrived.wait(lock, arrived);
 		else
 			fArrived.wait_for(lock, std::chrono::microseconds(timeout), arrived);
+		fIsOver = true;
+		_EndWaiting();
 		return std::move(fReply);
 	}
 
 private:
+	void _EndWaiting()
+	{
+		if (fSender != nullptr)
+			fSender->EndWaiting();
+		fSender = nullptr;
+	}
+
 	std::mutex fLock;
 	std::condition_variable fArrived;
 	std::unique_ptr<BMessage> fReply;
+	Worker* fSender = nullptr; // borrowed while it waits
+	bool fIsOver = false;
 };
 
 } // namespace
@@ -125,9 +150,7 @@ deliver_and_wait(const BMessenger& target, const BMessage& message, bool isReply
 	delivery.isReply = isReply;
 
 	const status_t status = deliver(target, std::move(copy), deliveryTimeout);
-	std::unique_ptr<BMessage> answer;
-	if (status == B_OK)
-		answer = port->Wait(replyTimeout);
+	std::unique_ptr<BMessage> answer = port->Wait(status == B_OK ? replyTimeout : 0);
 	PortTable::Remove(id);
 	if (status != B_OK)
 		return status;

@@ -20,8 +20,8 @@ ThisThread()
 	return sThread;
 }
 
-// Whether this thread runs the loop of some looper.
-thread_local bool sRunsLoop = false;
+// Of the looper whose loop this thread runs.
+thread_local LooperCore* sLoop = nullptr;
 
 // Waits on a condition with the platform's relative timeout; false when the time is over.
 template<typename Condition, typename Lock, typename Predicate>
@@ -179,7 +179,7 @@ LooperCore::Receive(std::unique_ptr<BMessage> message, bigtime_t timeout)
 
 	// Who keeps the loop from emptying its port, or runs a loop that others may wait for, must not
 	// wait here for ever: the two would never go on.
-	const bool mayWait = timeout != B_INFINITE_TIMEOUT || (!IsLockedByCaller() && !sRunsLoop);
+	const bool mayWait = timeout != B_INFINITE_TIMEOUT || (!IsLockedByCaller() && sLoop == nullptr);
 	if (fInPort >= fCapacity && mayWait) {
 		if (timeout <= 0)
 			return B_WOULD_BLOCK;
@@ -317,14 +317,14 @@ LooperCore::BeginLoop(thread_id thread)
 	fCounting = true;
 	fWorker.AddWork(int32(fQueue.fMessages.size()));
 	if (thread == ThisThread())
-		sRunsLoop = true;
+		sLoop = this;
 }
 
 
 void
 LooperCore::EnterLoop()
 {
-	sRunsLoop = true;
+	sLoop = this;
 }
 
 
@@ -332,7 +332,7 @@ void
 LooperCore::EndLoop()
 {
 	std::unique_lock lock(fQueue.fLock);
-	sRunsLoop = false;
+	sLoop = nullptr;
 	if (fCounting)
 		fWorker.WorkDone(int32(fQueue.fMessages.size()) + fInWork);
 	fCounting = false;
@@ -344,6 +344,10 @@ LooperCore::EndLoop()
 void
 LooperCore::Die()
 {
+	if (sLoop == this)
+		sLoop = nullptr;
+	_EndMourning();
+
 	std::deque<BMessage*> left;
 	{
 		std::unique_lock lock(fQueue.fLock);
@@ -378,7 +382,36 @@ void
 LooperCore::WaitUntilDead()
 {
 	std::unique_lock lock(fMutex);
+	if (fGone)
+		return;
+
+	Worker* self = sLoop != nullptr ? &sLoop->fWorker : nullptr;
+	if (self != nullptr) {
+		self->BeginWaiting();
+		fMourners.push_back(self);
+	}
 	fDead.wait(lock, [&] { return fGone; });
+	if (self != nullptr && std::erase(fMourners, self) > 0)
+		self->EndWaiting();
+}
+
+
+// Those who wait have work again before the last of ours is done, so the program is not taken for
+// idle in between.
+void
+LooperCore::_EndMourning()
+{
+	std::unique_lock lock(fMutex);
+	for (Worker* worker : fMourners)
+		worker->EndWaiting();
+	fMourners.clear();
+}
+
+
+LooperCore*
+LooperCore::OfThisThread()
+{
+	return sLoop;
 }
 
 

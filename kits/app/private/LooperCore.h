@@ -57,7 +57,11 @@ public:
 
 	// Nothing arrives and nobody gets the lock any more; the waiting messages are deleted.
 	void Die();
+	// A looper that waits here counts as idle: this one may be waiting for its user.
 	void WaitUntilDead();
+
+	// Whose loop the calling thread runs; NULL for none.
+	static LooperCore* OfThisThread();
 
 	BMessageQueue& Queue() { return fQueue; }
 	Worker& Activity() { return fWorker; }
@@ -76,6 +80,7 @@ private:
 
 	struct Waiter;
 
+	void _EndMourning();
 	// The queue's lock is held.
 	void _Added();
 	void _Removed(uint32 what);
@@ -84,6 +89,7 @@ private:
 	mutable std::mutex fMutex;
 	std::condition_variable fDead;
 	std::list<Waiter*> fWaiters; // on their threads' stacks
+	std::vector<Worker*> fMourners; // loopers that wait for the death of this one
 	std::atomic<thread_id> fOwner { -1 };
 	std::atomic<int32> fLockCount { 0 };
 	bool fGone = false;

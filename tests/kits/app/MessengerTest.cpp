@@ -198,7 +198,7 @@ TEST(Messenger, WaitsForTheAnswer)
 		}
 	};
 	Running<Answering> looper;
-	BMessage message('quest');
+	BMessage message('ques');
 	message.AddInt32("value", 21);
 	BMessage reply;
 
