@@ -472,7 +472,9 @@ BLooper::_Deliver(BMessage* message, BHandler* target)
 	Dispatch dispatch { message, fDispatch };
 	fDispatch = &dispatch;
 
-	if (_FilterCommon(message, &target) && _FilterByHandler(message, &target))
+	// A filter that skips everything must not keep the looper from ending.
+	if (message->what == _QUIT_
+		|| (_FilterCommon(message, &target) && _FilterByHandler(message, &target)))
 		DispatchMessage(message, target);
 
 	// Not reached when the message has ended the looper, which then deleted it.
