@@ -1,0 +1,7 @@
+#include "tools/arcv/Command.h"
+
+int
+main(int argc, char** argv)
+{
+	return Arcv::RunArcv(argc, argv);
+}
