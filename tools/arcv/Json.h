@@ -29,6 +29,9 @@ public:
 	// A string, or its bytes when it is not UTF-8.
 	void Text(std::string_view text);
 
+	// A value that is JSON already.
+	void Verbatim(std::string_view json) { _Value(json); }
+
 	// Ends the line. The writer is empty afterwards.
 	std::string Finish();
 

@@ -5,6 +5,7 @@
 #include <memory>
 
 #include "tools/arcv/Command.h"
+#include "tools/arcv/Forms.h"
 #include "tools/arcv/Input.h"
 #include "tools/arcv/Json.h"
 #include "tools/arcv/Output.h"
@@ -18,24 +19,6 @@ struct ListOptions {
 	std::string file;
 	bool json = false;
 };
-
-
-const char*
-FormName(message_form form)
-{
-	switch (form) {
-		case B_R5_FORM:
-			return "r5";
-		case B_R5_WIDE_FORM:
-			return "r5-wide";
-		case B_HAIKU_FORM:
-			return "haiku";
-		case B_DANO_FORM:
-			return "dano";
-		default:
-			return "raw";
-	}
-}
 
 
 const char*
