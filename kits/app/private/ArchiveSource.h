@@ -25,22 +25,12 @@ public:
 	// The archive as it was read. Look-ups through the result are not recorded.
 	BMessage Archive() const;
 
-	// A field counts as known when it was looked up, also in vain.
+	// A field counts as known when it was looked up. A name that the archive has not is not known.
 	bool IsKnown(const char* name) const;
 	void SetKnown(const char* name);
 
 	// Whether the archive was part of a managed one; see ManagedArchive.h.
 	bool WasManaged() const;
-
-	// Turns what the object archives now into what is written. "before" is what the same object
-	// would archive if nothing had changed since it was revived. A field that is the same in both
-	// is written as it was read: same presence, type, entries and place. One that differs is
-	// written as in "now", in the place that it had, or at the end. All other fields of the
-	// archive, the ones never looked up among them, stay as they were read. Nested messages that
-	// are equal count as the same. Fields named in "own" are always taken from "now": the caller
-	// has already settled them ("_views").
-	status_t Merge(const BMessage& before, BMessage* now, const char* const* own = nullptr,
-		int32 ownCount = 0) const;
 
 private:
 	MessageData* fData = nullptr; // shared

@@ -35,6 +35,8 @@ public:
 	// The shared contents; NULL for a message without fields.
 	MessageData* Data() const { return fMessage->fData; }
 	void SetData(MessageData* data); // takes a reference of its own
+	// The contents for changing, shared with nobody; NULL without memory.
+	MessageData* OwnData() const { return fMessage->_Own(); }
 
 	LookUps* GetLookUps() const { return fMessage->fLookUps; }
 	void SetLookUps(LookUps* lookUps); // takes a reference of its own
