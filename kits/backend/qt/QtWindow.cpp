@@ -134,7 +134,6 @@ QtWindow::SetOwner(BackendWindow* owner)
 void
 QtWindow::SetShown(bool shown)
 {
-	fShown = shown;
 	if (shown && windowState() == Qt::WindowMinimized)
 		setWindowState(Qt::WindowNoState);
 	setVisible(shown);
@@ -312,10 +311,14 @@ QtWindow::_FrameChanged()
 void
 QtWindow::_StateChanged()
 {
+	const bool minimized = windowState() == Qt::WindowMinimized;
+	if (minimized == fMinimized)
+		return;
+	fMinimized = minimized;
 	BackendEvent event;
 	event.type = BackendEvent::Type::Minimized;
 	event.window = this;
-	event.flag = windowState() == Qt::WindowMinimized;
+	event.flag = minimized;
 	fBackend.Sink().HandleEvent(event);
 }
 

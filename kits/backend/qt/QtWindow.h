@@ -73,7 +73,7 @@ private:
 	QCursor fCursor;
 	BRect fTextSpot; // screen, logical
 	int32 fRepeat = 0; // of the key that is held
-	bool fShown = false;
+	bool fMinimized = false;
 };
 
 

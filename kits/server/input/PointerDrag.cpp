@@ -21,7 +21,7 @@ PointerInput::StartDrag(const WindowReference& source, int32 serial, const DragR
 
 	// The user has let go already: what would have been seen in time is told now, in order.
 	_Replay(*press, *session);
-	_Drop(*session, press->release);
+	_Drop(*session, press->release, fDesktop.WindowAt(press->release.where));
 }
 
 
@@ -53,9 +53,9 @@ PointerInput::_Replay(const PressRecord& press, const DragSession& session)
 
 
 void
-PointerInput::_Drop(const DragSession& session, const BackendEvent& event)
+PointerInput::_Drop(
+	const DragSession& session, const BackendEvent& event, const WindowReference& under)
 {
-	const WindowReference under = fDesktop.WindowAt(event.where);
 	if (under == nullptr)
 		return;
 	const PressRecord* press = fHistory.Find(0);
@@ -121,14 +121,15 @@ PointerInput::_ForeignDrag(const BackendEvent& event)
 			break;
 
 		case Type::Dropped: {
+			const WindowReference under = _UnderPointer(event);
 			_SetState(event);
 			const DragReference session =
 				ours ? fSession : std::make_shared<DragSession>(make_foreign_drag(event.message));
 			if (ours) {
 				fHistory.End(event);
-				_DeliverRelease(event, fDesktop.WindowAt(event.where));
+				_DeliverRelease(event, under);
 			}
-			_Drop(*session, event);
+			_Drop(*session, event, under);
 			// The desktop's own word that the drag is finished comes later, and is then no news.
 			_EndSession();
 			WindowsRearranged();

@@ -65,13 +65,18 @@ PointerInput::_SetState(const BackendEvent& event)
 }
 
 
-// While a button is down the desktop names the window of the press, wherever the pointer is.
+// While a button is down the desktop names the window of the press, wherever the pointer is; a drag
+// in its hands is over the window that it names.
 WindowReference
 PointerInput::_UnderPointer(const BackendEvent& event) const
 {
-	if (event.type == BackendEvent::Type::PointerLeft)
+	using Type = BackendEvent::Type;
+
+	if (event.type == Type::PointerLeft)
 		return nullptr;
-	if (fCaptured == nullptr && fSession == nullptr && event.window != nullptr)
+	const bool desktopDrag = event.type == Type::DragMoved || event.type == Type::Dropped;
+	const bool free = fCaptured == nullptr && fSession == nullptr;
+	if ((free || desktopDrag) && event.window != nullptr)
 		return fDesktop.Find(event.window);
 	return fDesktop.WindowAt(event.where);
 }
@@ -228,7 +233,7 @@ PointerInput::_Released(const BackendEvent& event)
 	if (fSession != nullptr && !fSession->IsForeign()) {
 		const DragReference session = fSession;
 		_EndSession();
-		_Drop(*session, event);
+		_Drop(*session, event, under);
 	}
 	WindowsRearranged();
 }

@@ -65,7 +65,7 @@ private:
 
 	void _BeginSession(const DragReference& session);
 	void _Replay(const PressRecord& press, const DragSession& session);
-	void _Drop(const DragSession& session, const BackendEvent& event);
+	void _Drop(const DragSession& session, const BackendEvent& event, const WindowReference& under);
 	void _EndSession();
 	bool _LeaveForDesktop();
 
