@@ -12,10 +12,11 @@ class BMenu;
 class BMenuBar;
 class BMenuItem;
 class BMessenger;
+class _BMCMenuBar_;
 
 namespace BPrivate {
+class MenuAccess;
 class MenuTracker;
-class MenuWindow;
 } // namespace BPrivate
 
 enum menu_layout { B_ITEMS_IN_ROW = 0, B_ITEMS_IN_COLUMN, B_ITEMS_IN_MATRIX };
@@ -149,52 +150,53 @@ private:
 	friend class BMenuField;
 	friend class BMenuItem;
 	friend class BPopUpMenu;
-	friend class BWindow;
+	friend class BSeparatorItem;
+	friend class _BMCMenuBar_;
+	friend class BPrivate::MenuAccess;
 	friend class BPrivate::MenuTracker;
-	friend class BPrivate::MenuWindow;
 
-	void _InitData(BMessage* archive);
+	void _Init();
 	void _ReadItems(BMessage* archive);
-	bool _AddItem(BMenuItem* item, int32 index);
-	BMenuItem* _TakeItem(int32 index);
-	void _InstallItems(BWindow* window);
-	void _UninstallItems();
+	bool _Insert(BMenuItem* item, int32 index);
+	BMenuItem* _Take(int32 index);
+	void _Install(BWindow* window);
+	void _Uninstall();
 	void _ItemMarked(BMenuItem* item);
-	void _ItemChanged(BMenuItem* item, bool size);
+	void _ItemChanged(BMenuItem* item, bool newSize);
 	void _UpdateSuperitemLabel();
-	BWindow* _OwnerWindow() const;
-	BMenu* _RootMenu();
+	void _Opened(BPrivate::MenuTracker* tracker, BPoint screenOrigin);
+	void _Closed();
+	void _EndTracking();
 
 	void _ValidateLayout();
-	BRect _LayOut();
-	BRect _LayOutColumn();
-	BRect _LayOutRow();
-	BRect _LayOutMatrix();
-	void _UpdateMatrixSize();
+	BPoint _LayOut();
+	BPoint _LayOutColumn();
+	BPoint _LayOutRow();
+	BPoint _LayOutMatrix();
+	virtual void _LayoutChanged(); // of a menu that is attached and not open
+	void _MeasureItem(BMenuItem* item, float* _width, float* _height);
 	void _ChooseTriggers();
-	float _LabelLeft() const;
+	bool _AddDynamicItems();
+	void _DrawItems(BRect updateRect);
 
 	BMenuItem* _ItemAtPoint(BPoint where) const;
 	BMenuItem* _NextItem(BMenuItem* from, bool forward) const;
 	BMenuItem* _ItemWithTrigger(uint32 character) const;
 	void _SelectItem(BMenuItem* item);
-	BMenuItem* _ItemForShortcut(uint32 character, uint32 modifiers);
-	BRect _ScreenFrame(bool* _scrolls);
-	void _AddDynamicItems();
-	void _EndTracking();
 
 	std::vector<BMenuItem*> fItems; // owned
 	BMenuItem* fSuperitem; // borrowed
 	BMenuItem* fSelected; // borrowed
 	BPrivate::MenuTracker* fTracker; // while it is open; borrowed
+	BWindow* fInstalledWindow; // whose shortcuts and targets its items take part in
+	BPoint fScreenOrigin; // of its coordinates, while it is open
+	BPoint fContentSize; // right - left and bottom - top of all items
+	BPoint fMatrixSize; // as the constructor was told
 	float fMarginLeft;
 	float fMarginTop;
 	float fMarginRight;
 	float fMarginBottom;
-	float fItemHeight;
-	float fAscent;
 	float fMaxContentWidth;
-	BPoint fInitialSize; // of a matrix
 	menu_tracking_hook fTrackingHook;
 	void* fTrackingState;
 	menu_layout fLayout;
@@ -203,10 +205,8 @@ private:
 	bool fRadioMode;
 	bool fLabelFromMarked;
 	bool fTriggersEnabled;
+	bool fShowTriggers;
 	bool fLayoutValid;
-	bool fHasMarks; // columns leave room on the left only for menus that may show marks
-	bool fDynamicAdded;
-	bool fRevived;
 };
 
 #include <MenuItem.h>

@@ -3,6 +3,10 @@
 
 #include <Menu.h>
 
+namespace BPrivate {
+class MenuKeys;
+}
+
 enum menu_bar_border { B_BORDER_FRAME, B_BORDER_CONTENTS, B_BORDER_EACH_ITEM };
 
 
@@ -45,19 +49,15 @@ public:
 	virtual void AllDetached();
 	virtual status_t Perform(perform_code code, void* data);
 
-protected:
-	// Whether attaching makes it the key menu bar of its window.
-	bool IsKeyMenuBar() const;
-
 private:
 	friend class BMenuField;
-	friend class BWindow;
 	friend class BPrivate::MenuTracker;
 
+	virtual void _LayoutChanged();
+	void _FitToItems();
+	// Opens it for the keyboard, as the menu key does.
 	void _OpenByKey();
-	void _OpenByMouse(BMenuItem* item);
+	friend class BPrivate::MenuKeys;
 
 	menu_bar_border fBorder;
-	bool fIsFieldBar; // inside a menu field: never the key menu bar
-	float fLastWidth;
 };

@@ -5,6 +5,7 @@
 #include <View.h>
 
 class BMenuBar;
+class _BMCMenuBar_;
 
 
 // The menu passed in is owned from then on: it is the submenu of the only item of a menu bar,
@@ -65,19 +66,21 @@ public:
 	virtual void GetPreferredSize(float* _width, float* _height);
 
 private:
-	void _Init(const char* label, BMenu* menu, bool fixedSize);
-	void _CreateBar(BMenu* menu, bool fixedSize);
+	friend class _BMCMenuBar_;
+
+	void _Init();
+	void _CreateBar(BMenu* menu);
+	BRect _BarFrame() const;
 	void _FitBar();
 	void _OpenMenu(bool byKey);
-	BRect _BarFrame() const;
+	float _LabelWidth() const;
 
 	char* fLabel; // owned
-	BMenu* fMenu; // owned by the bar's item
+	BMenu* fMenu; // owned by the bar's item; NULL if an archive has none
 	BMenuBar* fMenuBar; // child
 	alignment fAlignment;
 	float fDivider;
 	bool fEnabled;
 	bool fFixedSize;
 	bool fPopUpMarker;
-	bool fRevived;
 };

@@ -1,6 +1,9 @@
 // BMenuItem: one choice of a menu, or the way into a submenu.
 #pragma once
 
+#include <memory>
+#include <string>
+
 #include <Archivable.h>
 #include <Invoker.h>
 #include <Menu.h>
@@ -8,8 +11,11 @@
 class BWindow;
 
 namespace BPrivate {
+class ArchiveSource;
+class ArchiveWriter;
+class MenuAccess;
 class MenuTracker;
-}
+} // namespace BPrivate
 
 
 // Belongs to the menu that it was added to, and owns its submenu. While its menu is attached,
@@ -20,6 +26,8 @@ public:
 	BMenuItem(BMenu* menu, BMessage* message = NULL);
 	BMenuItem(BMessage* archive);
 	virtual ~BMenuItem();
+	BMenuItem(const BMenuItem&) = delete;
+	BMenuItem& operator=(const BMenuItem&) = delete;
 
 	static BArchivable* Instantiate(BMessage* archive);
 	virtual status_t Archive(BMessage* archive, bool deep = true) const;
@@ -64,26 +72,24 @@ private:
 	friend class BMenuField;
 	friend class BPopUpMenu;
 	friend class BSeparatorItem;
-	friend class BWindow;
+	friend class _BMCMenuBar_;
+	friend class BPrivate::MenuAccess;
 	friend class BPrivate::MenuTracker;
 
-	BMenuItem(const BMenuItem&) = delete;
-	BMenuItem& operator=(const BMenuItem&) = delete;
-
-	void _InitData();
+	void _Init();
+	void _ArchiveSubmenu(BPrivate::ArchiveWriter& writer) const;
 	void _SetSubmenu(BMenu* submenu);
 	void _TakeLabelFromSubmenu();
 	void _SetLabelText(const char* label);
 	void _Install(BWindow* window);
 	void _Uninstall();
 	void _Select(bool selected);
-	void _DrawMark(rgb_color color);
-	void _DrawShortcut(rgb_color color);
-	void _DrawSubmenuArrow(rgb_color color);
+	float _LabelWidth();
 	float _ShortcutWidth() const;
-	void _GetShortcutText(char* buffer, size_t size) const;
-	int32 _TriggerIndex() const;
-	rgb_color _TextColor() const;
+	std::string _ShortcutText() const;
+	int32 _TriggerOffset() const;
+	uint32 _LookState() const;
+	void _DrawTrigger(BPoint baseline) const;
 
 	char* fLabel; // owned
 	BMenu* fSubmenu; // owned
@@ -91,6 +97,8 @@ private:
 	BWindow* fWindow; // the window that it was installed in, borrowed
 	BRect fBounds; // in its menu's coordinates
 	float fLabelWidth; // negative: measure anew
+	float fContentWidth;
+	float fContentHeight;
 	uint32 fModifiers;
 	int32 fIndex; // where the menu saw it last: a first guess
 	char fShortcut;
@@ -99,8 +107,8 @@ private:
 	bool fEnabled;
 	bool fMarked;
 	bool fSelected;
-	bool fDefaultTarget; // the target is the window only because none was set
-	BMessage* fArchive; // what it was revived from, for exact write-back; owned
+	bool fLabelTouched; // since it was revived
+	std::unique_ptr<BPrivate::ArchiveSource> fSource; // what it was revived from
 };
 
 #include <SeparatorItem.h>
