@@ -59,11 +59,18 @@ is_fixed_in_dano(type_code type)
 }
 
 
-// Turns an item of the other byte order into the host's.
+// Turns an item of the other byte order into the host's. Sizes and alignments are younger than the
+// R5 form's swapping: its writers and readers leave their bytes alone.
 void
-swap_item(type_code type, uint8* item, size_t size)
+swap_item(type_code type, uint8* item, size_t size, bool isR5)
 {
 	switch (type) {
+		case B_SIZE_TYPE:
+		case B_ALIGNMENT_TYPE:
+			if (!isR5)
+				swap_data(type, item, size, B_SWAP_ALWAYS);
+			break;
+
 		case B_SIZE_T_TYPE:
 		case B_SSIZE_T_TYPE:
 		case B_POINTER_TYPE:
@@ -533,7 +540,7 @@ MessageReader::_AddSwappedItem(const Field& field, bool first, const uint8* item
 	if (status == B_OK) {
 		memcpy(swapped, item, size);
 		if (fSwapped)
-			swap_item(field.type, swapped, size);
+			swap_item(field.type, swapped, size, read_uint32(fBytes) == swap_if(kR5Magic, true));
 		status = first
 			? fBuilt->AddField(field.name, field.nameLength, field.type, field.fixed, swapped, size)
 			: fBuilt->AddItem(fBuilt->CountFields() - 1, swapped, size);
