@@ -2,6 +2,7 @@
 #pragma once
 
 #include <memory>
+#include <string>
 
 #include <NodeInfo.h>
 
@@ -44,10 +45,14 @@ public:
 	// Strings in the field "types".
 	status_t GetSupportedTypes(BMessage* _types) const;
 	status_t SetSupportedTypes(const BMessage* types);
+	status_t SetSupportedTypes(const BMessage* types, bool syncAll);
 	bool IsSupportedType(const char* type) const;
 	bool Supports(BMimeType* type) const;
 	virtual status_t GetIcon(BBitmap* icon, icon_size size = B_LARGE_ICON) const;
 	virtual status_t SetIcon(const BBitmap* icon, icon_size size = B_LARGE_ICON);
+	// Of a file type that the program supports; NULL is the program itself.
+	status_t GetIconForType(const char* type, BBitmap* icon, icon_size size = B_LARGE_ICON) const;
+	status_t SetIconForType(const char* type, const BBitmap* icon, icon_size size = B_LARGE_ICON);
 	status_t GetVersionInfo(version_info* _info, version_kind kind) const;
 	status_t SetVersionInfo(const version_info* info, version_kind kind);
 
@@ -58,6 +63,12 @@ public:
 private:
 	BAppFileInfo(const BAppFileInfo&);
 	BAppFileInfo& operator=(const BAppFileInfo&);
+
+	struct Item;
+
+	status_t _Read(const Item& item, std::string* _data) const;
+	status_t _Write(const Item& item, const void* data, size_t size);
+	status_t _ReadText(const Item& item, char* buffer) const;
 
 	std::unique_ptr<BResources> fResources; // NULL when the file cannot hold resources
 	info_location fWhere;

@@ -7,6 +7,7 @@
 
 class BBitmap;
 class BMessage;
+class BString;
 struct entry_ref;
 
 enum icon_size { B_LARGE_ICON = 32, B_MINI_ICON = 16 };
@@ -43,14 +44,16 @@ enum {
 };
 
 
-// Answers from the desktop's shared MIME database. What a program sets is kept in the user's part
-// of that database ($XDG_DATA_HOME/mime/packages), where other programs see it too.
+// Answers from the desktop's shared MIME database, and before that from what programs on this
+// platform set: that is kept in the user's settings folder. Different objects may be used by
+// different threads. Setters take NULL to forget a value.
 class BMimeType {
 public:
 	BMimeType();
 	BMimeType(const char* type);
 	virtual ~BMimeType();
 
+	// B_BAD_VALUE for what is no type. Case does not matter when types are compared.
 	status_t SetTo(const char* type);
 	void Unset();
 	status_t InitCheck() const;
@@ -60,11 +63,13 @@ public:
 	bool IsSupertypeOnly() const;
 	bool IsInstalled() const;
 	status_t GetSupertype(BMimeType* _type) const;
+	// A supertype contains its types, and a type itself.
 	bool Contains(const BMimeType* type) const;
 
 	bool operator==(const BMimeType& type) const;
 	bool operator==(const char* type) const;
 
+	// Only what was installed here can be deleted.
 	status_t Install();
 	status_t Delete();
 
@@ -76,16 +81,26 @@ public:
 	// Strings in the field "extensions", without the leading dot.
 	status_t GetFileExtensions(BMessage* _extensions) const;
 	status_t SetFileExtensions(const BMessage* extensions);
+	// `signature` has room for B_MIME_TYPE_LENGTH + 1 bytes.
 	status_t GetPreferredApp(char* signature, app_verb verb = B_OPEN) const;
 	status_t SetPreferredApp(const char* signature, app_verb verb = B_OPEN);
+	status_t GetAttrInfo(BMessage* _info) const;
+	status_t SetAttrInfo(const BMessage* info);
+	status_t GetAppHint(entry_ref* _ref) const;
+	status_t SetAppHint(const entry_ref* ref);
+	// Icons of `size` times `size` pixels; those that are set are B_CMAP8.
 	status_t GetIcon(BBitmap* icon, icon_size size) const;
+	status_t SetIcon(const BBitmap* icon, icon_size size);
+	status_t GetIconForType(const char* type, BBitmap* icon, icon_size size) const;
+	status_t SetIconForType(const char* type, const BBitmap* icon, icon_size size);
 
 	// Strings in the field "super_types", or in "types".
 	static status_t GetInstalledSupertypes(BMessage* _supertypes);
 	static status_t GetInstalledTypes(BMessage* _types);
 	static status_t GetInstalledTypes(const char* supertype, BMessage* _types);
 
-	// By the file's name and first bytes; by bytes alone; by name alone.
+	// By the file's name and first bytes; by bytes alone; by name alone. What cannot be told is
+	// B_FILE_MIME_TYPE.
 	static status_t GuessMimeType(const entry_ref* file, BMimeType* _type);
 	static status_t GuessMimeType(const void* buffer, int32 length, BMimeType* _type);
 	static status_t GuessMimeType(const char* filename, BMimeType* _type);
@@ -101,4 +116,6 @@ private:
 };
 
 
+// Writes the type that is guessed to the file's attributes: where it has none, or always if
+// `force` is set. A folder's files too if `recursive` is set.
 status_t update_mime_info(const char* path, int recursive, int synchronous, int force);

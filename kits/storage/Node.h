@@ -86,6 +86,7 @@ private:
 	friend class BDirectory;
 	friend class BEntry;
 	friend class BFile;
+	friend class BAppFileInfo;
 	friend class BNodeInfo;
 	friend class BResources;
 	friend class BSymLink;

@@ -34,6 +34,11 @@ public:
 	status_t GetAppHint(entry_ref* _ref) const;
 	status_t SetAppHint(const entry_ref* ref);
 
+	// The file's own icon, or that of its type.
+	status_t GetTrackerIcon(BBitmap* icon, icon_size size = B_LARGE_ICON) const;
+	static status_t GetTrackerIcon(
+		const entry_ref* ref, BBitmap* icon, icon_size size = B_LARGE_ICON);
+
 private:
 	friend class BAppFileInfo;
 

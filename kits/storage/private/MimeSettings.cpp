@@ -1,0 +1,112 @@
+#include "storage/private/MimeSettings.h"
+
+#include <unistd.h>
+
+#include <vector>
+
+#include <Directory.h>
+#include <Entry.h>
+#include <File.h>
+#include <FindDirectory.h>
+#include <Path.h>
+
+#include "storage/private/AtomicFile.h"
+#include "storage/private/Errno.h"
+
+namespace BPrivate {
+
+namespace {
+
+constexpr off_t kLargestSettings = 1024 * 1024;
+
+
+// The type's slash would make a folder, so another character stands for it; types have none.
+status_t
+PathFor(const std::string& type, bool create, BPath* _path)
+{
+	status_t status = find_directory(B_USER_SETTINGS_DIRECTORY, _path, create);
+	if (status == B_OK)
+		status = _path->Append("mime");
+	if (status == B_OK && create)
+		status = create_directory(_path->Path(), 0755);
+	std::string leaf = type;
+	const size_t slash = leaf.find('/');
+	if (slash != std::string::npos)
+		leaf[slash] = ',';
+	if (status == B_OK && !leaf.empty())
+		status = _path->Append(leaf.c_str());
+	return status;
+}
+
+} // namespace
+
+
+status_t
+ReadMimeSettings(const std::string& type, BMessage* _settings)
+{
+	BPath path;
+	status_t status = PathFor(type, false, &path);
+	if (status != B_OK)
+		return status;
+	BFile file(path.Path(), B_READ_ONLY);
+	off_t size = 0;
+	status = file.GetSize(&size);
+	if (status != B_OK)
+		return status;
+	if (size > kLargestSettings)
+		return B_BAD_DATA;
+	return _settings->Unflatten(&file);
+}
+
+
+status_t
+WriteMimeSettings(const std::string& type, const BMessage& settings)
+{
+	BPath path;
+	status_t status = PathFor(type, true, &path);
+	if (status != B_OK)
+		return status;
+	std::vector<char> bytes(settings.FlattenedSize());
+	status = settings.Flatten(bytes.data(), bytes.size());
+	AtomicFile file;
+	if (status == B_OK)
+		status = file.SetTo(path.Path());
+	if (status == B_OK)
+		status = file.Write(bytes.data(), bytes.size());
+	return status == B_OK ? file.Commit() : status;
+}
+
+
+status_t
+RemoveMimeSettings(const std::string& type)
+{
+	BPath path;
+	const status_t status = PathFor(type, false, &path);
+	if (status != B_OK)
+		return status;
+	return unlink(path.Path()) < 0 ? LastStatus() : B_OK;
+}
+
+
+std::set<std::string>
+TypesWithMimeSettings()
+{
+	std::set<std::string> types;
+	BPath path;
+	if (PathFor("", false, &path) != B_OK)
+		return types;
+	BDirectory directory(path.Path());
+	entry_ref ref;
+	while (directory.GetNextRef(&ref) == B_OK) {
+		std::string type(ref.name);
+		const size_t comma = type.find(',');
+		if (type[0] == '.')
+			continue; // a file that is just being written
+		if (comma != std::string::npos)
+			type[comma] = '/';
+		types.insert(type);
+	}
+	return types;
+}
+
+} // namespace BPrivate
