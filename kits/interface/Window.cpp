@@ -12,6 +12,7 @@
 #include <Screen.h>
 
 #include "app/private/LooperPrivate.h"
+#include "interface/private/MenuTracker.h"
 #include "interface/private/OffscreenWindow.h"
 #include "interface/private/ViewPrivate.h"
 #include "interface/private/WindowInternals.h"
@@ -141,6 +142,7 @@ BWindow::Quit()
 	}
 	const bool quitsApplication =
 		(Flags() & B_QUIT_ON_WINDOW_CLOSE) != 0 && be_app != nullptr && fInternals->shownOnce;
+	MenuTracker::WindowCloses(this);
 	while (fInternals->server != nullptr && !IsHidden())
 		Hide();
 	_DeleteViews();
@@ -521,16 +523,6 @@ BMenuBar*
 BWindow::KeyMenuBar() const
 {
 	return fInternals->keyMenuBar;
-}
-
-
-bool
-BWindow::_OpenKeyMenuBar()
-{
-	if (fInternals->keyMenuBar == nullptr)
-		return false;
-	fInternals->keyMenuBar->_OpenByKey();
-	return true;
 }
 
 

@@ -231,8 +231,6 @@ private:
 		uint32 workspaces, window_type type);
 	void _DispatchToView(BMessage* message, BView* view);
 	void _DeleteViews();
-	bool _OpenKeyMenuBar();
-	bool _InvokeMenuShortcut(uint32 character, uint32 modifiers);
 
 	BPrivate::WindowInternals* fInternals; // owned
 };

@@ -8,10 +8,10 @@
 #include <AppDefs.h>
 #include <Application.h>
 #include <Control.h>
-#include <MenuBar.h>
-#include <MenuItem.h>
 #include <Message.h>
 
+#include "interface/private/MenuBarKeys.h"
+#include "interface/private/MenuShortcuts.h"
 #include "interface/private/ViewPrivate.h"
 #include "interface/private/ViewState.h"
 #include "interface/private/WindowInternals.h"
@@ -36,6 +36,7 @@ constexpr EditKey kEditKeys[] = {
 	{ 'a', 0, B_SELECT_ALL },
 	{ 'z', 0, B_UNDO },
 	{ 'z', B_SHIFT_KEY, B_REDO },
+	{ 'y', 0, B_REDO },
 };
 
 
@@ -53,6 +54,14 @@ significant(uint32 modifiers)
 {
 	modifiers &= kModifiers;
 	return (modifiers & B_COMMAND_KEY) != 0 ? modifiers & ~B_CONTROL_KEY : modifiers;
+}
+
+
+bool
+is_motion_key(uint32 key)
+{
+	return (key >= B_LEFT_ARROW && key <= B_DOWN_ARROW) || key == B_HOME || key == B_END
+		|| key == B_PAGE_UP || key == B_PAGE_DOWN || key == B_BACKSPACE || key == B_DELETE;
 }
 
 
@@ -155,20 +164,6 @@ WindowInternals::SendShortcut(uint32 key, uint32 modifiers)
 
 
 bool
-BWindow::_InvokeMenuShortcut(uint32 character, uint32 modifiers)
-{
-	if (fInternals->keyMenuBar == nullptr)
-		return false;
-	BMenuItem* item = fInternals->keyMenuBar->_ItemForShortcut(character, modifiers);
-	if (item == nullptr)
-		return false;
-	if (item->IsEnabled())
-		item->Invoke();
-	return true;
-}
-
-
-bool
 WindowInternals::HandleKeyDown(BMessage* message)
 {
 	const uint32 held = message->GetInt32("modifiers", 0);
@@ -186,22 +181,25 @@ WindowInternals::HandleKeyDown(BMessage* message)
 		}
 		return SendShortcut(raw, significant(held));
 	}
-	if (raw == B_ESCAPE)
-		return window._OpenKeyMenuBar() || true;
-	_HandleCommandKey(raw, static_cast<uint8>(bytes[0]), significant(held));
-	return true;
+	if (raw == B_ESCAPE) {
+		if (keyMenuBar != nullptr)
+			MenuKeys::Open(keyMenuBar);
+		return true;
+	}
+	return _HandleCommandKey(raw, static_cast<uint8>(bytes[0]), significant(held));
 }
 
 
-// What is typed with Command held belongs to the window, whether it means something or not.
-void
+// What is typed with Command held belongs to the window, whether it means something or not; only
+// keys that move or erase go on to the focus view, which does it by words then.
+bool
 WindowInternals::_HandleCommandKey(uint32 raw, uint32 typed, uint32 held)
 {
 	if (raw == 'q' && held == B_COMMAND_KEY) {
 		BMessage quit(B_QUIT_REQUESTED);
 		quit.AddBool("shortcut", true);
 		be_app->PostMessage(&quit);
-		return;
+		return true;
 	}
 	if (raw == 'w' && held == B_COMMAND_KEY) {
 		if ((flags & B_NOT_CLOSABLE) == 0 && !window.IsModal()) {
@@ -209,24 +207,25 @@ WindowInternals::_HandleCommandKey(uint32 raw, uint32 typed, uint32 held)
 			quit.AddBool("shortcut", true);
 			window.PostMessage(&quit);
 		}
-		return;
+		return true;
 	}
 
 	window.MenusBeginning();
-	bool found = window._InvokeMenuShortcut(raw, held) || SendShortcut(raw, held);
+	bool found = MenuShortcuts::Send(&window, raw, held) || SendShortcut(raw, held);
 	// A sign that is typed with Shift is found by the sign as well.
 	const uint32 plain = held & ~B_SHIFT_KEY;
 	if (!found && typed > ' ' && typed != raw && !std::isalpha(typed) && typed < 127)
-		found = window._InvokeMenuShortcut(typed, plain) || SendShortcut(typed, plain);
+		found = MenuShortcuts::Send(&window, typed, plain) || SendShortcut(typed, plain);
 	window.MenusEnded();
 	if (found || focus == nullptr)
-		return;
+		return true;
 	for (const EditKey& edit : kEditKeys) {
 		if (edit.key == raw && (edit.modifiers | B_COMMAND_KEY) == held) {
 			window.PostMessage(edit.what, focus);
-			return;
+			return true;
 		}
 	}
+	return !is_motion_key(typed);
 }
 
 

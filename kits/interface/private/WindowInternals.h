@@ -136,7 +136,7 @@ private:
 	bool _IsStale(const BMessage& event);
 	void _EndPress();
 	void _UpdatePointerWish();
-	void _HandleCommandKey(uint32 raw, uint32 typed, uint32 held);
+	bool _HandleCommandKey(uint32 raw, uint32 typed, uint32 held);
 };
 
 
