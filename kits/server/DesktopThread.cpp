@@ -116,12 +116,15 @@ DesktopThread::_Run(StartSignal& signal)
 
 	fPointer->Clear();
 	fWindows.clear();
+	{
+		std::lock_guard lock(fPostLock);
+		fBackend.reset();
+	}
+	// The drags, which the backend may have kept, are gone now too.
 	for (const std::string& folder : fFolders) {
 		std::error_code ignored;
 		std::filesystem::remove_all(folder, ignored);
 	}
-	std::lock_guard lock(fPostLock);
-	fBackend.reset();
 }
 
 

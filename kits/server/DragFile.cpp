@@ -11,6 +11,7 @@
 #include <AppDefs.h>
 #include <Entry.h>
 
+#include "app/private/Delivery.h"
 #include "server/DesktopThread.h"
 
 namespace BPrivate {
@@ -55,6 +56,8 @@ CopyStrings(const BMessage& from, const char* field, BMessage& to)
 DragFile::DragFile(DesktopThread& desktop, const BMessage& dragMessage) :
 	fDesktop(desktop), fMessage(dragMessage)
 {
+	// Only what was delivered can be answered: here the desktop itself is where it was dropped.
+	mark_as_dropped(&fMessage, dragMessage.ReturnAddress());
 }
 
 

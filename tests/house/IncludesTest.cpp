@@ -40,8 +40,10 @@ const std::vector<Rule> kRules = {
 	{ "kits",
 		{ "kernel/", "support/", "app/", "storage/", "interface/", "translation/", "server/" },
 		true, true, false },
-	{ "kits/server", { "kernel/private/", "support/private/", "server/", "backend/Backend" }, true,
-		true, false },
+	{ "kits/server",
+		{ "kernel/private/", "support/private/", "server/", "backend/Backend", "backend/KeyTable.h",
+			"backend/FolderDrop.h", "app/private/Delivery.h" },
+		true, true, false },
 	{ "kits/server/paint", { "kernel/private/", "support/private/", "server/paint/" }, true, true,
 		true },
 	{ "kits/backend",
@@ -57,8 +59,8 @@ const std::vector<Rule> kRules = {
 // The value classes, which server and backend take from the other kits.
 const std::set<std::string> kValueHeaders = { "BeBuild.h", "SupportDefs.h", "Errors.h",
 	"TypeConstants.h", "String.h", "List.h", "OS.h", "Debug.h", "AppDefs.h", "Message.h",
-	"Messenger.h", "DataIO.h", "Font.h", "Point.h", "Rect.h", "Region.h", "GraphicsDefs.h",
-	"InterfaceDefs.h" };
+	"Messenger.h", "MessageForm.h", "DataIO.h", "Entry.h", "Path.h", "Font.h", "Point.h", "Rect.h",
+	"Region.h", "GraphicsDefs.h", "InterfaceDefs.h" };
 
 // The language's own headers that end in ".h" are not used by folders that must be portable,
 // but for these.

@@ -1,11 +1,18 @@
 #include "kits/server/DesktopFixture.h"
 
 #include <Entry.h>
+#include <Handler.h>
+#include <Looper.h>
+#include <Path.h>
 #include <TypeConstants.h>
 
 #include <cstdio>
 #include <cstdlib>
 #include <filesystem>
+#include <fstream>
+
+#include "app/private/Delivery.h"
+#include "kernel/private/Activity.h"
 
 namespace BPrivate {
 
@@ -57,6 +64,36 @@ protected:
 	}
 
 	std::unique_ptr<TestWindow> source, target;
+};
+
+
+// The source of a drag that writes a file when it is asked to, as the negotiation demands.
+class FileWriter : public BHandler {
+public:
+	void MessageReceived(BMessage* message) override
+	{
+		if (message->what != B_COPY_TARGET) {
+			BHandler::MessageReceived(message);
+			return;
+		}
+		asked++;
+		isReply = message->IsReply() && message->Previous() != nullptr
+			&& message->Previous()->what == B_SIMPLE_DATA;
+		entry_ref directory;
+		const char* name;
+		if (message->FindRef("directory", &directory) != B_OK
+			|| message->FindString("name", &name) != B_OK)
+			return;
+		BPath path(&directory);
+		path.Append(name);
+		if (std::FILE* file = std::fopen(path.Path(), "r+")) {
+			std::fputs("written", file);
+			std::fclose(file);
+		}
+	}
+
+	int32 asked = 0;
+	bool isReply = false;
 };
 
 
@@ -293,6 +330,59 @@ TEST_F(Drag, FileCanBeDroppedOnAFolder)
 	EXPECT_EQ(1u, source->Take(B_MOUSE_UP).size());
 	std::filesystem::remove_all(folder);
 	std::filesystem::remove_all(from);
+}
+
+
+TEST_F(Drag, FileIsWrittenOnceWhenTheFolderAsks)
+{
+	char folder[] = "/tmp/drag-test-XXXXXX";
+	ASSERT_NE(nullptr, mkdtemp(folder));
+	auto* looper = new BLooper("writer");
+	FileWriter writer;
+	looper->AddHandler(&writer);
+	looper->Run();
+
+	PressSource();
+	auto message = std::make_unique<BMessage>(B_SIMPLE_DATA);
+	message->AddString("be:types", "application/octet-stream");
+	message->AddInt32("be:actions", B_COPY_TARGET);
+	message->AddString("be:clip_name", "a/widget");
+	Delivery::Of(*message).replyTo = BMessenger(&writer);
+	Desktop::Get()->StartDrag(source->server, std::move(message), DragImage());
+	input.Leave();
+	input.DropOnFolder(folder);
+	// The display thread goes on with other tasks while it waits for the file.
+	ASSERT_TRUE(wait_until_idle(20000000));
+
+	std::ifstream file(std::string(folder) + "/a-widget");
+	std::string contents;
+	std::getline(file, contents);
+	EXPECT_EQ("written", contents);
+	EXPECT_EQ(1, writer.asked);
+	EXPECT_TRUE(writer.isReply);
+
+	looper->Lock();
+	looper->RemoveHandler(&writer);
+	looper->Quit();
+	std::filesystem::remove_all(folder);
+}
+
+
+TEST_F(Drag, SourceThatIsGoneOffersNoFile)
+{
+	char folder[] = "/tmp/drag-test-XXXXXX";
+	ASSERT_NE(nullptr, mkdtemp(folder));
+	PressSource();
+	auto message = std::make_unique<BMessage>(B_SIMPLE_DATA);
+	message->AddString("be:types", "application/octet-stream");
+	message->AddInt32("be:actions", B_COPY_TARGET);
+	Desktop::Get()->StartDrag(source->server, std::move(message), DragImage());
+	input.Leave();
+	input.DropOnFolder(folder);
+	Settle();
+	EXPECT_TRUE(std::filesystem::is_empty(folder));
+	EXPECT_EQ(1u, source->Take(B_MOUSE_UP).size());
+	std::filesystem::remove_all(folder);
 }
 
 
