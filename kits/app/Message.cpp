@@ -487,10 +487,8 @@ BMessage::FindMessage(const char* name, int32 index, BMessage* message) const
 	uint32 number;
 	status_t status = _FindItem(name, B_MESSAGE_TYPE, index, &number);
 	MessageData* nested = nullptr;
-	if (status == B_OK) {
-		nested = fData->GetMessage(number, uint32(index));
-		status = nested != nullptr ? status_t(B_OK) : status_t(B_BAD_DATA);
-	}
+	if (status == B_OK)
+		nested = fData->GetMessage(number, uint32(index), &status);
 
 	BMessage found(nested != nullptr ? nested->What() : 0);
 	found.fData = nested;

@@ -337,12 +337,16 @@ MessageData::MessageAt(uint32 number, uint32 index) const
 
 
 MessageData*
-MessageData::GetMessage(uint32 number, uint32 index) const
+MessageData::GetMessage(uint32 number, uint32 index, status_t* _status) const
 {
+	status_t ignored;
+	status_t& status = _status != nullptr ? *_status : ignored;
+	status = B_OK;
 	if (MessageData* nested = MessageAt(number, index)) {
 		nested->Acquire();
 		return nested;
 	}
+	status = B_BAD_DATA;
 	if (fLevel >= B_MAX_MESSAGE_NESTING)
 		return nullptr;
 
@@ -358,12 +362,16 @@ MessageData::GetMessage(uint32 number, uint32 index) const
 	else {
 		// The store moves when it grows, so the message gets bytes of its own.
 		source = SharedBytes::Create(size);
+		status = B_NO_MEMORY;
 		if (source == nullptr)
 			return nullptr;
 		memcpy(source->Bytes(), bytes, size);
 		bytes = source->Bytes();
 	}
-	return MessageReader(source, static_cast<const uint8*>(bytes), size, fLevel + 1).Read();
+	MessageReader reader(source, static_cast<const uint8*>(bytes), size, fLevel + 1);
+	MessageData* nested = reader.Read();
+	status = reader.Status();
+	return nested;
 }
 
 

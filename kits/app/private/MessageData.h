@@ -95,8 +95,8 @@ public:
 	// Items. The index must be in range.
 	status_t GetItem(uint32 field, uint32 index, const void** _data, size_t* _size) const;
 	size_t ItemSizeAt(uint32 field, uint32 index) const;
-	// A new reference, or NULL when the item is no message, or is nested too deep.
-	MessageData* GetMessage(uint32 field, uint32 index) const;
+	// A new reference, or NULL when the item is no message, or is nested too deep: B_BAD_DATA.
+	MessageData* GetMessage(uint32 field, uint32 index, status_t* _status = nullptr) const;
 	// The message that was added as such, without a reference, or NULL when there are bytes.
 	MessageData* MessageAt(uint32 field, uint32 index) const;
 
