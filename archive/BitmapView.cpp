@@ -13,13 +13,6 @@ constexpr const char* kBitmapField = "bitmap";
 } // namespace
 
 
-// The bitmap of a revived view, and the archive that it came from: it is written back as it was.
-struct BitmapView::Source {
-	BMessage archive;
-	std::unique_ptr<BBitmap> bitmap;
-};
-
-
 BitmapView::BitmapView(BRect frame, const char* name, uint32 resizingMode, uint32 flags) :
 	BView(frame, name, resizingMode, flags), fBitmap(nullptr)
 {
@@ -28,10 +21,9 @@ BitmapView::BitmapView(BRect frame, const char* name, uint32 resizingMode, uint3
 
 BitmapView::BitmapView(BMessage* archive) : BView(archive), fBitmap(nullptr)
 {
-	auto source = std::make_unique<Source>();
-	if (archive->FindMessage(kBitmapField, &source->archive) == B_OK) {
-		source->bitmap = std::make_unique<BBitmap>(&source->archive);
-		fBitmap = source->bitmap.get();
+	auto source = std::make_unique<BMessage>();
+	if (archive->FindMessage(kBitmapField, source.get()) == B_OK) {
+		AdoptBitmap(std::make_unique<BBitmap>(source.get()));
 		fSource = std::move(source);
 	}
 }
@@ -59,7 +51,7 @@ BitmapView::Archive(BMessage* archive, bool deep) const
 		return B_OK;
 
 	if (fSource != nullptr) {
-		archive->AddMessage(kBitmapField, &fSource->archive);
+		archive->AddMessage(kBitmapField, fSource.get());
 		return B_OK;
 	}
 
@@ -93,5 +85,14 @@ BitmapView::SetBitmap(BBitmap* bitmap)
 		return;
 
 	fBitmap = bitmap;
+	fOwnBitmap.reset();
 	fSource.reset();
+}
+
+
+void
+BitmapView::AdoptBitmap(std::unique_ptr<BBitmap> bitmap)
+{
+	SetBitmap(bitmap.get());
+	fOwnBitmap = std::move(bitmap);
 }

@@ -7,6 +7,7 @@
 #include <View.h>
 
 class BBitmap;
+class BMessage;
 
 
 // Exported, so that any program that loads the add-on can revive archives that name it.
@@ -29,9 +30,11 @@ public:
 	// attachment on.
 	void SetBitmap(BBitmap* bitmap);
 
-private:
-	struct Source;
+	// The same, but the view owns the bitmap.
+	void AdoptBitmap(std::unique_ptr<BBitmap> bitmap);
 
-	BBitmap* fBitmap; // borrowed, or ours when it came from the archive
-	std::unique_ptr<Source> fSource;
+private:
+	BBitmap* fBitmap; // borrowed, or fOwnBitmap
+	std::unique_ptr<BBitmap> fOwnBitmap;
+	std::unique_ptr<BMessage> fSource; // the archive that the bitmap came from, to be written back
 };

@@ -14,4 +14,7 @@ extern WidgetWindow* widgetWindow;
 class WidgetWindow : public BWindow {
 public:
 	explicit WidgetWindow(BPoint leftTop); // in screen coordinates
+
+	// Writes the file when a sample was dropped on a file manager.
+	void MessageReceived(BMessage* message) override;
 };

@@ -9,6 +9,7 @@
 #include <Window.h>
 
 #include "archive/EditorCodes.h"
+#include "archive/ViewDrag.h"
 #include "archive/ViewTree.h"
 #include "work/HiliteView.h"
 #include "work/WorkBackgroundView.h"
@@ -231,12 +232,15 @@ WorkView::HandleFilteredMouse(BMessage* message, BView* view, int32 modifiers)
 	}
 
 	const BRect bounds = view->Bounds();
-	if (!FrameControled(view)
-		&& (bounds.right - where.x) + (bounds.bottom - where.y) < kResizeZone) {
+	const bool inResizeZone = (bounds.right - where.x) + (bounds.bottom - where.y) < kResizeZone;
+	if (FrameControled(view))
+		beep();
+	else if (inResizeZone)
 		_BeginResize(where);
-		return;
-	}
-	beep();
+	else if (view != fEditView)
+		_BeginMove(view, where, (modifiers & B_CONTROL_KEY) != 0);
+	else
+		beep();
 }
 
 
@@ -254,6 +258,33 @@ WorkView::_BeginResize(BPoint where)
 	SetEventMask(kResizeEventMask, 0);
 	fResizing = true;
 	fLastResizePoint = where;
+}
+
+
+// A view that is moved is taken away at once: it will exist again where it is dropped.
+void
+WorkView::_BeginMove(BView* view, BPoint where, bool copy)
+{
+	BView* parent = view->Parent();
+	SetSelectedView(parent);
+	parent->RemoveChild(view);
+	const BPoint leftTop = view->Frame().LeftTop();
+	view->MoveTo(0, 0);
+
+	BBitmap* image = MakeDragImage(view);
+	BMessage drag;
+	if (kFramesFollowScrolling)
+		MoveScrolledViews(view, false);
+	MakeDragMessage(view, &drag);
+	DragMessage(&drag, image, B_OP_ALPHA, where, this);
+
+	if (copy) {
+		if (kFramesFollowScrolling)
+			MoveScrolledViews(view, true);
+		view->MoveTo(leftTop);
+		ColorfulAddChild(parent, view);
+	} else
+		delete view;
 }
 
 

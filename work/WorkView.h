@@ -23,6 +23,7 @@ public:
 	void AttachedToWindow() override;
 	void FrameResized(float width, float height) override;
 	void KeyDown(const char* bytes, int32 numBytes) override;
+	void MessageReceived(BMessage* message) override;
 	void MouseMoved(BPoint where, uint32 transit, const BMessage* drag) override;
 	void MouseUp(BPoint where) override;
 
@@ -53,9 +54,16 @@ public:
 	// A press of the primary button on an edited view.
 	void HandleFilteredMouse(BMessage* message, BView* view, int32 modifiers);
 
+	// Something dropped on an edited view, or on the container: a view, a picture, or a file that a
+	// view was dragged into.
+	void HandleFilteredDrop(BMessage* message, BView* target);
+
 private:
 	bool _MayMove(const BView* view) const;
 	void _BeginResize(BPoint where);
+	void _BeginMove(BView* view, BPoint where, bool copy);
+	void _AddDropped(BMessage* message, BView* target, BView* view);
+	void _ReplaceTree(BView* view);
 	void _DeleteSelection();
 	void _HandleKey(char key);
 	void _MoveSelection(float x, float y);

@@ -78,7 +78,14 @@ WorkViewFilter(BMessage* message, BHandler** target, BMessageFilter* filter)
 	}
 
 	BView* view = dynamic_cast<BView*>(*target);
-	if (LiveViewAttached(workView->Container(), view) == nullptr || view == workView->Container())
+	if (LiveViewAttached(workView->Container(), view) == nullptr)
+		return B_DISPATCH_MESSAGE;
+
+	if (IsDropCode(message->what)) {
+		workView->HandleFilteredDrop(message, view);
+		return B_SKIP_MESSAGE;
+	}
+	if (view == workView->Container())
 		return B_DISPATCH_MESSAGE;
 
 	if (message->what == B_MOUSE_DOWN)

@@ -1,0 +1,160 @@
+// WorkView: what is dropped on it, and what becomes of its own drags.
+
+#include <memory>
+
+#include <Alert.h>
+#include <AppDefs.h>
+#include <Beep.h>
+#include <Bitmap.h>
+#include <Entry.h>
+#include <File.h>
+#include <MenuBar.h>
+#include <Message.h>
+#include <Resources.h>
+#include <TranslationUtils.h>
+#include <Window.h>
+
+#include "archive/BitmapView.h"
+#include "archive/EditorCodes.h"
+#include "archive/ViewArchive.h"
+#include "archive/ViewDrag.h"
+#include "archive/ViewTree.h"
+#include "work/WorkBackgroundView.h"
+#include "work/WorkView.h"
+
+namespace {
+
+
+constexpr const char* kReplaceQuestion =
+	"Whoa!  You have dropped a view onto the main work area.  Normally you want to drop a view "
+	"inside an existing view.\n\nDo you wish to remove the exiting view(s) and replace with the "
+	"dropped view?";
+constexpr int32 kYes = 0;
+constexpr int32 kNo = 1;
+
+
+// The view lives as long as the design, and the bitmap with it.
+BArchivable*
+MakeBitmapView(BBitmap* bitmap, const char* name)
+{
+	BitmapView* view = new BitmapView(bitmap->Bounds(), name, B_FOLLOW_LEFT | B_FOLLOW_TOP, 0);
+	view->AdoptBitmap(std::unique_ptr<BBitmap>(bitmap));
+	return view;
+}
+
+
+// A picture, or a file that a view was dragged into. NULL when it is neither.
+BArchivable*
+ObjectFromFile(const entry_ref& ref)
+{
+	BFile file(&ref, B_READ_ONLY);
+	if (BBitmap* bitmap = BTranslationUtils::GetBitmap(&file))
+		return MakeBitmapView(bitmap, ref.name);
+
+	BResources resources;
+	if (resources.SetTo(&file, false) != B_OK)
+		return NULL;
+	size_t size;
+	const void* data = resources.LoadResource(kArchiveType, kDraggedResourceName, &size);
+	BMessage archive;
+	if (data == NULL || archive.Unflatten(static_cast<const char*>(data)) != B_OK)
+		return NULL;
+	return instantiate_object(&archive);
+}
+
+
+BArchivable*
+ObjectFromDrop(BMessage* message)
+{
+	if (message->what != B_SIMPLE_DATA)
+		return instantiate_object(message);
+
+	BMessage archive;
+	if (message->FindMessage(kDroppedViewField, &archive) == B_OK)
+		return instantiate_object(&archive);
+
+	entry_ref ref;
+	return message->FindRef("refs", &ref) == B_OK ? ObjectFromFile(ref) : NULL;
+}
+
+
+bool
+AskToReplace()
+{
+	BAlert* alert = new BAlert("Warning!", kReplaceQuestion, "Yes", "No", NULL, B_WIDTH_AS_USUAL,
+		B_OFFSET_SPACING, B_WARNING_ALERT);
+	alert->SetShortcut(kNo, B_ESCAPE);
+	return alert->Go() == kYes;
+}
+
+
+} // namespace
+
+
+void
+WorkView::MessageReceived(BMessage* message)
+{
+	switch (message->what) {
+		case B_COPY_TARGET:
+			WriteDraggedView(message);
+			break;
+		case B_TRASH_TARGET:
+			// The view was taken away when its drag began.
+			break;
+		default:
+			BView::MessageReceived(message);
+	}
+}
+
+
+void
+WorkView::HandleFilteredDrop(BMessage* message, BView* target)
+{
+	DumpMessage(message, 0);
+
+	BArchivable* object = ObjectFromDrop(message);
+	BView* view = dynamic_cast<BView*>(object);
+	if (view == nullptr) {
+		delete object;
+		beep();
+		return;
+	}
+
+	if (target == fContainer)
+		_ReplaceTree(view);
+	else
+		_AddDropped(message, target, view);
+}
+
+
+// Puts the view where the drag image's left top was.
+void
+WorkView::_AddDropped(BMessage* message, BView* target, BView* view)
+{
+	BPoint where, offset;
+	message->FindPoint("_drop_point_", &where);
+	message->FindPoint("_drop_offset_", &offset);
+	view->MoveTo(target->ConvertFromScreen(where) - offset);
+
+	if (message->what == kDroppedView)
+		ColorfulAddChild(target, view);
+	else {
+		target->AddChild(view);
+		if (dynamic_cast<BMenuBar*>(view) != nullptr)
+			view->MoveTo(0, 0);
+	}
+	SetSelectedView(view);
+	Window()->Activate();
+}
+
+
+void
+WorkView::_ReplaceTree(BView* view)
+{
+	if (!AskToReplace()) {
+		delete view;
+		return;
+	}
+	view->MoveTo(0, 0);
+	SetEditView(view);
+}
