@@ -1,8 +1,23 @@
 #include "addon/PanelTable.h"
 
-#include <vector>
-
-#include "editors/EditorInterface.h"
+#include "editors/EditBox.h"
+#include "editors/EditButton.h"
+#include "editors/EditCheckBox.h"
+#include "editors/EditColorControl.h"
+#include "editors/EditControl.h"
+#include "editors/EditInherited.h"
+#include "editors/EditListView.h"
+#include "editors/EditMenuBar.h"
+#include "editors/EditMenuField.h"
+#include "editors/EditOutlineListView.h"
+#include "editors/EditRadioButton.h"
+#include "editors/EditScrollView.h"
+#include "editors/EditSlider.h"
+#include "editors/EditStatusBar.h"
+#include "editors/EditStringView.h"
+#include "editors/EditTabView.h"
+#include "editors/EditTextControl.h"
+#include "editors/EditTextView.h"
 
 namespace {
 
@@ -18,7 +33,11 @@ Make()
 
 
 // From the top of the stack to its bottom.
-const std::vector<PanelMaker> kPanelMakers = {};
+constexpr PanelMaker kPanelMakers[] = { Make<EditControl>, Make<EditButton>, Make<EditStringView>,
+	Make<EditBox>, Make<EditCheckBox>, Make<EditRadioButton>, Make<EditStatusBar>,
+	Make<EditTextControl>, Make<EditTextView>, Make<EditSlider>, Make<EditScrollView>,
+	Make<EditColorControl>, Make<EditTabView>, Make<EditListView>, Make<EditOutlineListView>,
+	Make<EditMenuField>, Make<EditMenuBar>, Make<EditInherited> };
 
 
 } // namespace

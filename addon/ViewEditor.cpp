@@ -143,6 +143,13 @@ ViewEditor::ExecDataChanged(
 }
 
 
+void
+ViewEditor::SelectView(BView* view)
+{
+	fWorkView->SetSelectedView(view);
+}
+
+
 // #pragma mark - the view's side
 
 

@@ -29,6 +29,9 @@ public:
 	virtual void ExecDataChanged(const BResEditor::BResourceCollection* collection,
 		BResEditor::BResourceHandle& item, uint32 changes);
 
+	// Selects a view of the edited tree.
+	void SelectView(BView* view);
+
 	// The view's side.
 	void AllAttached() override;
 	void AttachedToWindow() override;

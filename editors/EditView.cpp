@@ -2,17 +2,16 @@
 
 #include <cfloat>
 
-#include <Button.h>
 #include <Menu.h>
 #include <MenuField.h>
 #include <MenuItem.h>
 #include <Message.h>
 #include <ScrollBar.h>
 #include <String.h>
-#include <StringView.h>
 #include <TextControl.h>
 
 #include "editors/FloatControl.h"
+#include "editors/PanelRows.h"
 #include "editors/TargetLock.h"
 
 namespace {
@@ -27,7 +26,7 @@ constexpr uint32 kVerticalChosen = 'yyyy';
 constexpr uint32 kFlagChosen = 'flag';
 
 constexpr float kPanelHeight = 330;
-constexpr uint32 kControlFlags = B_WILL_DRAW | B_NAVIGABLE;
+constexpr float kWideRowStep = 32;
 
 constexpr uint32 kHorizontalMask = 0x0f0f;
 constexpr uint32 kVerticalMask = 0xf0f0;
@@ -146,7 +145,7 @@ RangeMaximum(const BScrollBar* bar)
 } // namespace
 
 
-EditView::EditView() : EditorInterface("EditView", "BView", kPanelHeight)
+EditView::EditView() : EditorInterface("EditView", "Properties from BView", kPanelHeight)
 {
 	BRect area = RowArea();
 	_AddNameRow(area);
@@ -156,6 +155,12 @@ EditView::EditView() : EditorInterface("EditView", "BView", kPanelHeight)
 	_AddResizingRow(area);
 	area.top += kRowStep;
 	_AddFlagsRow(area);
+	area.top += kRowStep;
+	_AddFontRows(area);
+	area.top += 2 * kWideRowStep;
+	_AddDrawingRow(area);
+	area.top += kWideRowStep;
+	_AddColorSection(area);
 }
 
 
@@ -172,14 +177,6 @@ EditView::FrameChanged()
 }
 
 
-void
-EditView::MessageReceived(BMessage* message)
-{
-	if (!_ApplyEdit(message))
-		EditorInterface::MessageReceived(message);
-}
-
-
 bool
 EditView::UseView(BView* view)
 {
@@ -190,7 +187,16 @@ EditView::UseView(BView* view)
 	LoadFrameValues();
 	_LoadResizingMode();
 	_LoadFlags();
+	_LoadFontAndDrawing();
+	_LoadColors();
 	return true;
+}
+
+
+bool
+EditView::ApplyEdit(BMessage* message)
+{
+	return _ApplyViewEdit(message) || _ApplyFontEdit(message) || _ApplyColorEdit(message);
 }
 
 
@@ -201,18 +207,14 @@ void
 EditView::_AddNameRow(BRect area)
 {
 	area.bottom = area.top + kRowHeight;
-	fNameControl = new BTextControl(
-		area, NULL, "Name: ", "", new BMessage(kNameChanged), B_FOLLOW_ALL_SIDES, kControlFlags);
-	fNameControl->SetDivider(80);
-	AddChild(fNameControl);
+	fNameControl = AddTextControl(this, area, "Name: ", kNameChanged, 80, B_FOLLOW_ALL_SIDES);
 }
 
 
 void
 EditView::_AddFrameRow(BRect area)
 {
-	AddChild(new BStringView(BRect(area.left, area.top, area.left + 30, area.top + 16), NULL,
-		"Frame:", B_FOLLOW_LEFT | B_FOLLOW_TOP, B_WILL_DRAW));
+	AddSentence(this, FrameAt(area.left, area.top, 30, 16), "Frame:");
 
 	BRect frame(area.left + 40, area.top, area.left + 88, area.top + 16);
 	fLeftControl = _AddFrameControl(frame, "L:");
@@ -222,11 +224,9 @@ EditView::_AddFrameRow(BRect area)
 	fBottomControl = _AddFrameControl(frame, "B:");
 
 	frame.OffsetBy(54, -3);
-	AddChild(new BButton(frame, NULL, "preferred", new BMessage(kPreferredPressed),
-		B_FOLLOW_LEFT | B_FOLLOW_TOP, kControlFlags));
+	AddButton(this, frame, "preferred", kPreferredPressed);
 	frame.OffsetBy(77, 0);
-	AddChild(new BButton(frame, NULL, "zoom", new BMessage(kZoomPressed),
-		B_FOLLOW_LEFT_RIGHT | B_FOLLOW_TOP, kControlFlags));
+	AddButton(this, frame, "zoom", kZoomPressed, kFollowWidth);
 }
 
 
@@ -239,17 +239,11 @@ EditView::_AddResizingRow(BRect area)
 	area.bottom = area.top + 19;
 	BRect left = area;
 	left.right = left.left + 150;
-	BMenuField* field = new BMenuField(left, NULL, "Resizing:", fHorizontalMenu, true,
-		B_FOLLOW_LEFT | B_FOLLOW_TOP, kControlFlags);
-	field->SetDivider(50);
-	AddChild(field);
+	AddMenuField(this, left, "Resizing:", fHorizontalMenu, 50, kFollowLeftTop);
 
 	BRect right = area;
 	right.left = right.right - 150;
-	field = new BMenuField(
-		right, NULL, "Resizing:", fVerticalMenu, true, B_FOLLOW_RIGHT, kControlFlags);
-	field->SetDivider(50);
-	AddChild(field);
+	AddMenuField(this, right, "Resizing:", fVerticalMenu, 50, B_FOLLOW_RIGHT);
 }
 
 
@@ -271,11 +265,7 @@ EditView::_AddFlagsRow(BRect area)
 FloatControl*
 EditView::_AddFrameControl(BRect frame, const char* label)
 {
-	FloatControl* control = new FloatControl(frame, NULL, label, new BMessage(kFrameChanged), 0,
-		-FLT_MAX, FLT_MAX, B_FOLLOW_LEFT | B_FOLLOW_TOP, kControlFlags);
-	control->SetDivider(10);
-	AddChild(control);
-	return control;
+	return AddFloatControl(this, frame, label, kFrameChanged, 0, -FLT_MAX, FLT_MAX, 10);
 }
 
 
@@ -333,15 +323,9 @@ EditView::_ShowFlagTags()
 // #pragma mark - applying
 
 
-// Returns whether the code is one of ours. The lock ends before a foreign code is passed on.
 bool
-EditView::_ApplyEdit(BMessage* message)
+EditView::_ApplyViewEdit(BMessage* message)
 {
-	if (!TargetLives())
-		return false;
-
-	TargetLock lock(target);
-
 	switch (message->what) {
 		case kNameChanged:
 			target->SetName(fNameControl->Text());

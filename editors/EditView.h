@@ -1,12 +1,16 @@
-// EditView: the panel for what every view has: name, frame, resizing mode and flags.
+// EditView: the panel for what every view has: its place, flags, font, drawing and colours.
 #pragma once
 
 #include "editors/EditorInterface.h"
 
+class BButton;
+class BFont;
 class BMenu;
 class BMenuField;
+class BRadioButton;
 class BTextControl;
 class FloatControl;
+class LiveColorControl;
 
 
 class EditView : public EditorInterface {
@@ -15,16 +19,24 @@ public:
 	~EditView() override;
 
 	void FrameChanged() override;
-	void MessageReceived(BMessage* message) override;
 
 	// Accepts every view.
 	bool UseView(BView* view) override;
 
+protected:
+	bool ApplyEdit(BMessage* message) override;
+
 private:
+	// Which of the view's colours the colour section edits.
+	enum class ColorRole { kView, kHigh, kLow };
+
 	void _AddNameRow(BRect area);
 	void _AddFrameRow(BRect area);
 	void _AddResizingRow(BRect area);
 	void _AddFlagsRow(BRect area);
+	void _AddFontRows(BRect area);
+	void _AddDrawingRow(BRect area);
+	void _AddColorSection(BRect area);
 	FloatControl* _AddFrameControl(BRect frame, const char* label);
 
 	void LoadFrameValues();
@@ -32,12 +44,33 @@ private:
 	void _LoadFlags();
 	void _ShowFlagTags();
 
-	bool _ApplyEdit(BMessage* message);
+	bool _ApplyViewEdit(BMessage* message);
 	void _ApplyFrame();
 	void _ApplyPreferredSize();
 	void _ApplyZoom();
 	void _ApplyResizingMode();
 	void _ApplyFlag(const BMessage* message);
+
+	// EditViewFont.cpp
+	void FontChanged();
+	void _MarkStandardFont(const BFont& font);
+	void _LoadStyles(const char* family, const char* style);
+	void _LoadFontAndDrawing();
+	bool _ApplyFontEdit(BMessage* message);
+	void _ApplyFont(const BFont* font);
+	void _ApplyFamilyAndStyle();
+	void _ApplyShear();
+	void _ApplyRotation();
+
+	// EditViewColors.cpp
+	ColorRole _Role() const;
+	void _LoadColors();
+	bool _ApplyColorEdit(BMessage* message);
+	void _ShowRole();
+	void _UseDefaultColor();
+	void _UseParentColor();
+	void _ApplyColor();
+	void _SetChildrensColor();
 
 	BTextControl* fNameControl;
 	FloatControl* fLeftControl;
@@ -48,4 +81,19 @@ private:
 	BMenu* fVerticalMenu;
 	BMenu* fFlagsMenu;
 	BMenuField* fFlagsField;
+	BMenu* fFontMenu;
+	BMenu* fStyleMenu;
+	FloatControl* fSizeControl;
+	FloatControl* fShearControl;
+	FloatControl* fRotationControl;
+	BMenu* fModeMenu;
+	FloatControl* fPenSizeControl;
+	LiveColorControl* fColorControl;
+	BBox* fViewSwatch;
+	BBox* fHighSwatch;
+	BBox* fLowSwatch;
+	BButton* fDefaultButton;
+	BRadioButton* fViewRadio;
+	BRadioButton* fHighRadio;
+	BRadioButton* fLowRadio;
 };

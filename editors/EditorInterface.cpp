@@ -1,8 +1,7 @@
 #include "editors/EditorInterface.h"
 
-#include <String.h>
-
 #include "archive/ViewTree.h"
+#include "editors/TargetLock.h"
 
 namespace {
 
@@ -30,14 +29,25 @@ EditorInterface::AllAttached()
 }
 
 
-EditorInterface::EditorInterface(const char* name, const char* platformClass, float height) :
+void
+EditorInterface::MessageReceived(BMessage* message)
+{
+	bool applied = false;
+	if (TargetLives()) {
+		TargetLock lock(target);
+		applied = ApplyEdit(message);
+	}
+	if (!applied)
+		BBox::MessageReceived(message);
+}
+
+
+EditorInterface::EditorInterface(const char* name, const char* label, float height) :
 	BBox(BRect(0, 0, kPanelWidth, height), name, B_FOLLOW_LEFT_RIGHT | B_FOLLOW_TOP,
 		B_WILL_DRAW | B_NAVIGABLE_JUMP | B_FRAME_EVENTS, B_FANCY_BORDER),
 	target(nullptr)
 {
-	BString label("Properties from ");
-	label << platformClass;
-	SetLabel(label.String());
+	SetLabel(label);
 }
 
 
@@ -57,8 +67,31 @@ EditorInterface::TargetLives() const
 }
 
 
+bool
+EditorInterface::ApplyEdit(BMessage* message)
+{
+	return false;
+}
+
+
 BRect
 EditorInterface::RowArea() const
 {
 	return Bounds().InsetByCopy(kRowInsetX, kRowInsetY);
+}
+
+
+BRect
+EditorInterface::TextBesideMenuFrame() const
+{
+	const BRect area = RowArea();
+	return BRect(area.left, area.top, area.right - 120, area.top + 20);
+}
+
+
+BRect
+EditorInterface::MenuBesideTextFrame() const
+{
+	const BRect area = RowArea();
+	return BRect(area.right - 110, area.top - 2, area.right, area.top + 18);
 }

@@ -5,8 +5,6 @@
 
 #include "archive/ViewWatch.h"
 
-class BMenu;
-
 
 // A panel shows and edits the properties that one platform class gives to a view. It changes the
 // live view directly, under the lock of the view's window, and tells nobody. The editor makes each
@@ -22,10 +20,13 @@ public:
 
 	void AllAttached() override;
 
+	// Has ApplyEdit() carry the message out with the target's window locked, and passes on what
+	// is none of the panel's codes after the lock was released.
+	void MessageReceived(BMessage* message) override;
+
 protected:
-	// The platform class is the one whose properties are edited ("BButton"); the height in pixels
-	// less one.
-	EditorInterface(const char* name, const char* platformClass, float height);
+	// The label is "Properties from BButton" and the like; the height is in pixels less one.
+	EditorInterface(const char* name, const char* label, float height);
 
 	// Sets the target, which a panel has tested to be of its class. Returns whether there is one.
 	bool TakeTarget(BView* view);
@@ -33,8 +34,16 @@ protected:
 	// Whether there is a target and it still exists: messages may come after it was deleted.
 	bool TargetLives() const;
 
+	// Carries out an edit on the target, which exists and whose window is locked. Returns false,
+	// and changes nothing, for a code that is none of the panel's.
+	virtual bool ApplyEdit(BMessage* message);
+
 	// The place of the rows: margins at the left and right, the top of the first row.
 	BRect RowArea() const;
+
+	// The two halves of a row that has a text at the left and a menu at the right.
+	BRect TextBesideMenuFrame() const;
+	BRect MenuBesideTextFrame() const;
 
 	BView* target; // borrowed; NULL when the panel has no view
 
@@ -44,6 +53,9 @@ private:
 
 
 // The layout that the panels share, in pixels.
+constexpr float kSentencePanelHeight = 38;
+constexpr float kOneRowPanelHeight = 42;
+constexpr float kTwoRowPanelHeight = 70;
 constexpr float kRowStep = 28;
 constexpr float kRowHeight = 12;
 constexpr float kColumnWidth = 100;

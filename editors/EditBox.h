@@ -1,0 +1,26 @@
+// EditBox: the panel for a box's label and border.
+#pragma once
+
+#include "editors/EditorInterface.h"
+
+class BMenu;
+class BTextControl;
+class BBox;
+
+
+class EditBox : public EditorInterface {
+public:
+	EditBox();
+	~EditBox() override;
+
+	bool UseView(BView* view) override;
+
+protected:
+	bool ApplyEdit(BMessage* message) override;
+
+private:
+	BBox* _Target() const; // of the class that UseView() has tested
+
+	BTextControl* fLabelControl;
+	BMenu* fBorderMenu;
+};

@@ -1,0 +1,59 @@
+#include "editors/EditButton.h"
+
+#include <Button.h>
+#include <CheckBox.h>
+#include <Message.h>
+
+#include "editors/PanelRows.h"
+
+namespace {
+
+
+constexpr uint32 kDefaultChanged = 'dflt';
+
+
+} // namespace
+
+
+EditButton::EditButton() :
+	EditorInterface("EditButton", "Properties from BButton", kOneRowPanelHeight)
+{
+	const BRect area = RowArea();
+	fDefaultBox = AddCheckBox(
+		this, FrameAt(area.left, area.top, kColumnWidth, kRowHeight), "Default", kDefaultChanged);
+}
+
+
+EditButton::~EditButton()
+{
+}
+
+
+bool
+EditButton::UseView(BView* view)
+{
+	if (!TakeTarget(dynamic_cast<BButton*>(view)))
+		return false;
+
+	fDefaultBox->SetValue(_Target()->IsDefault() ? B_CONTROL_ON : B_CONTROL_OFF);
+	return true;
+}
+
+
+bool
+EditButton::ApplyEdit(BMessage* message)
+{
+	if (message->what != kDefaultChanged)
+		return false;
+
+	_Target()->MakeDefault(IsOn(fDefaultBox));
+	target->Invalidate();
+	return true;
+}
+
+
+BButton*
+EditButton::_Target() const
+{
+	return static_cast<BButton*>(target);
+}

@@ -1,0 +1,101 @@
+#include "editors/EditControl.h"
+
+#include <cstdio>
+#include <cstdlib>
+
+#include <CheckBox.h>
+#include <Control.h>
+#include <Message.h>
+#include <TextControl.h>
+
+#include "editors/PanelRows.h"
+
+namespace {
+
+
+constexpr uint32 kLabelChanged = 'labl';
+constexpr uint32 kEnabledChanged = 'enbl';
+constexpr uint32 kMessageChanged = 'mssg';
+constexpr uint32 kValueChanged = 'valu';
+
+
+} // namespace
+
+
+EditControl::EditControl() :
+	EditorInterface("EditControl", "Properties from BControl", kTwoRowPanelHeight)
+{
+	BRect row = RowArea();
+	row.bottom = row.top + kRowHeight;
+	fLabelControl = AddTextControl(this, row, "Label: ", kLabelChanged, 60, B_FOLLOW_LEFT_RIGHT);
+
+	row.OffsetBy(0, kRowStep);
+	row.right = row.left + kColumnWidth;
+	fEnabledBox = AddCheckBox(this, row, "Enabled", kEnabledChanged);
+	row.OffsetBy(kColumnStep, 0);
+	fMessageControl = AddTextControl(this, row, "Message: ", kMessageChanged, 50);
+	row.OffsetBy(kColumnStep, 0);
+	fValueControl = AddTextControl(this, row, "Value: ", kValueChanged, 50);
+}
+
+
+EditControl::~EditControl()
+{
+}
+
+
+bool
+EditControl::UseView(BView* view)
+{
+	if (!TakeTarget(dynamic_cast<BControl*>(view)))
+		return false;
+
+	ShowMessageCode(fMessageControl, _Target()->Message());
+	fLabelControl->SetText(_Target()->Label());
+	char value[16];
+	snprintf(value, sizeof(value), "%ld", static_cast<long>(_Target()->Value()));
+	fValueControl->SetText(value);
+	fEnabledBox->SetValue(_Target()->IsEnabled() ? B_CONTROL_ON : B_CONTROL_OFF);
+	return true;
+}
+
+
+bool
+EditControl::ApplyEdit(BMessage* message)
+{
+	switch (message->what) {
+		case kLabelChanged:
+			_Target()->SetLabel(fLabelControl->Text());
+			break;
+		case kEnabledChanged:
+			_Target()->SetEnabled(IsOn(fEnabledBox));
+			break;
+		case kValueChanged:
+			_Target()->SetValue(static_cast<int32>(strtol(fValueControl->Text(), nullptr, 10)));
+			break;
+		case kMessageChanged:
+			_ApplyMessageCode();
+			break;
+		default:
+			return false;
+	}
+	target->Invalidate();
+	return true;
+}
+
+
+BControl*
+EditControl::_Target() const
+{
+	return static_cast<BControl*>(target);
+}
+
+
+// Only the code changes: the message keeps its fields.
+void
+EditControl::_ApplyMessageCode()
+{
+	if (_Target()->Message() == NULL)
+		_Target()->SetMessage(new BMessage(kNewMessage));
+	_Target()->Message()->what = CodeFromText(fMessageControl->Text());
+}

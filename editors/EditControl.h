@@ -1,0 +1,29 @@
+// EditControl: the panel for what every control has: label, message, value, enabled.
+#pragma once
+
+#include "editors/EditorInterface.h"
+
+class BCheckBox;
+class BTextControl;
+class BControl;
+
+
+class EditControl : public EditorInterface {
+public:
+	EditControl();
+	~EditControl() override;
+
+	bool UseView(BView* view) override;
+
+protected:
+	bool ApplyEdit(BMessage* message) override;
+
+private:
+	BControl* _Target() const; // of the class that UseView() has tested
+	void _ApplyMessageCode();
+
+	BTextControl* fMessageControl;
+	BTextControl* fLabelControl;
+	BTextControl* fValueControl;
+	BCheckBox* fEnabledBox;
+};

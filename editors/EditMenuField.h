@@ -1,0 +1,30 @@
+// EditMenuField: the panel for a menu field's label, divider and state.
+#pragma once
+
+#include "editors/EditorInterface.h"
+
+class BCheckBox;
+class BMenu;
+class BMenuField;
+class BTextControl;
+class FloatControl;
+
+
+class EditMenuField : public EditorInterface {
+public:
+	EditMenuField();
+	~EditMenuField() override;
+
+	bool UseView(BView* view) override;
+
+protected:
+	bool ApplyEdit(BMessage* message) override;
+
+private:
+	BMenuField* _Target() const; // of the class that UseView() has tested
+
+	BTextControl* labelControl;
+	BMenu* alignmentMenu;
+	BCheckBox* enabledCheckBox;
+	FloatControl* dividerControl;
+};

@@ -1,0 +1,51 @@
+// EditSlider: the panel for a slider's range, labels, marks, thumb and bar colour.
+#pragma once
+
+#include <functional>
+
+#include "editors/EditorInterface.h"
+
+class BMenu;
+class BSlider;
+class BTextControl;
+class IntControl;
+class LiveColorControl;
+
+
+// What a slider cannot change once it is made is changed in its archive, and a new slider takes the
+// old one's place.
+class EditSlider : public EditorInterface {
+public:
+	EditSlider();
+	~EditSlider() override;
+
+	bool UseView(BView* view) override;
+
+protected:
+	bool ApplyEdit(BMessage* message) override;
+
+private:
+	BSlider* _Target() const; // of the class that UseView() has tested
+
+	void _AddLimitRow(BRect row, const char* label, uint32 labelCode, BTextControl*& labelControl,
+		const char* value, uint32 valueCode, IntControl*& valueControl);
+	void _AddMenuRow(BRect row);
+	void _AddMarksRow(BRect row);
+	bool _ApplyMarks(uint32 code);
+	void _ApplyBarColor();
+	void _ApplyLimitLabels();
+	void _ApplyLimits();
+	void _Rebuild(const std::function<void(BMessage& archive)>& change);
+
+	IntControl* snoozeControl;
+	LiveColorControl* barColorControl;
+	BBox* barColorSwatch;
+	BTextControl* minLabelControl;
+	IntControl* minValueControl;
+	BTextControl* maxLabelControl;
+	IntControl* maxValueControl;
+	IntControl* keyIncrementControl;
+	IntControl* hashMarkCountControl;
+	BMenu* thumbMenu;
+	BMenu* hashMarksMenu;
+};

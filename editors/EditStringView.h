@@ -1,0 +1,26 @@
+// EditStringView: the panel for a string view's text and alignment.
+#pragma once
+
+#include "editors/EditorInterface.h"
+
+class BMenu;
+class BTextControl;
+class BStringView;
+
+
+class EditStringView : public EditorInterface {
+public:
+	EditStringView();
+	~EditStringView() override;
+
+	bool UseView(BView* view) override;
+
+protected:
+	bool ApplyEdit(BMessage* message) override;
+
+private:
+	BStringView* _Target() const; // of the class that UseView() has tested
+
+	BTextControl* fTextControl;
+	BMenu* fAlignmentMenu;
+};

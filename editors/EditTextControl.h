@@ -1,0 +1,29 @@
+// EditTextControl: the panel for a text control's alignments, divider and message.
+#pragma once
+
+#include "editors/EditorInterface.h"
+
+class BMenu;
+class FloatControl;
+class BTextControl;
+
+
+class EditTextControl : public EditorInterface {
+public:
+	EditTextControl();
+	~EditTextControl() override;
+
+	bool UseView(BView* view) override;
+
+protected:
+	bool ApplyEdit(BMessage* message) override;
+
+private:
+	BTextControl* _Target() const; // of the class that UseView() has tested
+	void _ApplyMessageCode();
+
+	BMenu* fLabelAlignMenu;
+	BMenu* fTextAlignMenu;
+	FloatControl* fDividerControl;
+	BTextControl* fMessageControl;
+};

@@ -1,0 +1,74 @@
+// What the rows of the panels are made of.
+#pragma once
+
+#include <initializer_list>
+
+#include <Box.h>
+#include <Rect.h>
+#include <SupportDefs.h>
+#include <View.h>
+
+class BButton;
+class BCheckBox;
+class BInvoker;
+class BMenu;
+class BMenuField;
+class BMessage;
+class BTextControl;
+class FloatControl;
+class IntControl;
+class LiveColorControl;
+
+constexpr uint32 kFollowLeftTop = B_FOLLOW_LEFT | B_FOLLOW_TOP;
+constexpr uint32 kFollowRightTop = B_FOLLOW_RIGHT | B_FOLLOW_TOP;
+constexpr uint32 kFollowWidth = B_FOLLOW_LEFT_RIGHT | B_FOLLOW_TOP;
+constexpr uint32 kControlFlags = B_WILL_DRAW | B_NAVIGABLE;
+constexpr uint32 kGroupFlags = B_WILL_DRAW | B_NAVIGABLE_JUMP | B_FRAME_EVENTS;
+
+// A rectangle by its left top and its size (right - left, bottom - top).
+BRect FrameAt(float left, float top, float width, float height);
+
+// Make a control without a name and add it to the panel, which owns it.
+BTextControl* AddTextControl(BView* panel, BRect frame, const char* label, uint32 code,
+	float divider, uint32 resizingMode = kFollowLeftTop);
+IntControl* AddIntControl(BView* panel, BRect frame, const char* label, uint32 code, int value,
+	int min, int max, float divider, uint32 resizingMode = kFollowLeftTop);
+FloatControl* AddFloatControl(BView* panel, BRect frame, const char* label, uint32 code,
+	float value, float min, float max, float divider, uint32 resizingMode = kFollowLeftTop);
+BCheckBox* AddCheckBox(BView* panel, BRect frame, const char* label, uint32 code);
+BButton* AddButton(BView* panel, BRect frame, const char* label, uint32 code,
+	uint32 resizingMode = kFollowLeftTop);
+void AddSentence(BView* panel, BRect frame, const char* text, uint32 resizingMode = kFollowLeftTop);
+void AddSeparator(BView* panel, BRect frame);
+BMenuField* AddMenuField(
+	BView* panel, BRect frame, const char* label, BMenu* menu, float divider, uint32 resizingMode);
+
+// A menu that shows the chosen item. An item's index is the platform's value that it stands for.
+BMenu* MakeChoiceMenu(std::initializer_list<const char*> labels, uint32 code);
+BMenu* MakeAlignmentMenu(uint32 code);
+BMenu* MakeBorderMenu(uint32 code);
+void MarkChoice(BMenu* menu, int32 index); // nothing is marked for an index that no item has
+int32 Choice(const BMenu* menu); // -1 when nothing is marked
+
+// A check box's value as a switch.
+bool IsOn(const BCheckBox* box);
+
+// The code of a message that is made because a code was typed: four question marks.
+constexpr uint32 kNewMessage = 0x3f3f3f3f;
+
+// Four-character codes as text, the most significant byte first.
+uint32 CodeFromText(const char* text);
+void ShowCode(BTextControl* control, uint32 code);
+void ShowMessageCode(BTextControl* control, const BMessage* message); // "----" for NULL
+
+bool SameRGB(rgb_color a, rgb_color b);
+
+// The group with which a bar's colour is chosen: the control, a swatch that shows the colour, and a
+// button for the default.
+struct BarColorGroup {
+	LiveColorControl* control;
+	BBox* swatch;
+};
+BarColorGroup AddBarColorGroup(BView* panel, BRect frame, uint32 colorCode, uint32 defaultCode);
+void ShowSwatch(BBox* swatch, rgb_color color);
+BBox* AddSwatch(BView* panel, BRect frame);
