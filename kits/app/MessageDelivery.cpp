@@ -25,14 +25,6 @@ constexpr const char* kPrevious = "_previous_";
 // again from the moment the answer is given, which is part of the receiver's own work.
 class ReplyPort final : public Port {
 public:
-	ReplyPort()
-	{
-		if (LooperCore* loop = LooperCore::OfThisThread())
-			fSender = &loop->Activity();
-		if (fSender != nullptr)
-			fSender->BeginWaiting();
-	}
-
 	status_t Receive(std::unique_ptr<BMessage> message, bigtime_t) override
 	{
 		std::lock_guard lock(fLock);
@@ -45,11 +37,16 @@ public:
 		return B_OK;
 	}
 
-	// Ends the waiting, also when there was no answer in time.
+	// After the message was delivered, so that somebody has work when the sender has none.
 	std::unique_ptr<BMessage> Wait(bigtime_t timeout)
 	{
 		std::unique_lock lock(fLock);
 		const auto arrived = [&] { return fReply != nullptr; };
+		LooperCore* loop = LooperCore::OfThisThread();
+		if (loop != nullptr && !arrived()) {
+			fSender = &loop->Activity();
+			fSender->BeginWaiting();
+		}
 		if (timeout > bigtime_t(1) << 51) // would overflow the clock
 			fArrived.wait(lock, arrived);
 		else

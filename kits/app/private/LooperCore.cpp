@@ -386,7 +386,7 @@ LooperCore::WaitUntilDead()
 		return;
 
 	Worker* self = sLoop != nullptr ? &sLoop->fWorker : nullptr;
-	if (self != nullptr) {
+	if (self != nullptr && !fDying) {
 		self->BeginWaiting();
 		fMourners.push_back(self);
 	}
@@ -402,6 +402,7 @@ void
 LooperCore::_EndMourning()
 {
 	std::unique_lock lock(fMutex);
+	fDying = true;
 	for (Worker* worker : fMourners)
 		worker->EndWaiting();
 	fMourners.clear();

@@ -92,6 +92,7 @@ private:
 	std::vector<Worker*> fMourners; // loopers that wait for the death of this one
 	std::atomic<thread_id> fOwner { -1 };
 	std::atomic<int32> fLockCount { 0 };
+	bool fDying = false;
 	bool fGone = false;
 
 	// The queue; its own lock protects the rest.

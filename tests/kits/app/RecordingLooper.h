@@ -4,6 +4,7 @@
 #include <string>
 #include <vector>
 
+#include <AppDefs.h>
 #include <Looper.h>
 #include <Message.h>
 #include <Messenger.h>
