@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <string.h>
+#include <wchar.h>
 
 namespace BPrivate {
 
@@ -21,14 +22,32 @@ struct RowFunctions {
 };
 
 
+// The C library writes more than a word at a time.
+void
+FillWords(uint32* row, int32 count, uint32 pixel)
+{
+	static_assert(sizeof(wchar_t) == sizeof(uint32));
+	if (count > 4) {
+		wmemset(reinterpret_cast<wchar_t*>(row), pixel, count);
+		return;
+	}
+	for (int32 i = 0; i < count; i++)
+		row[i] = pixel;
+}
+
+
+// The modes whose result does not depend on what is there.
+bool
+IsConstant(drawing_mode mode)
+{
+	return mode == B_OP_COPY || mode == B_OP_OVER || mode == B_OP_ERASE;
+}
+
+
 template<drawing_mode kMode>
 void
 FillRow(uint32* row, int32 count, bool bit, const Ink& ink)
 {
-	if (kMode == B_OP_COPY || kMode == B_OP_OVER || kMode == B_OP_ERASE) {
-		std::fill_n(row, count, BlendBit<kMode>(0, bit, ink));
-		return;
-	}
 	for (int32 i = 0; i < count; i++)
 		row[i] = BlendBit<kMode>(row[i], bit, ink);
 }
@@ -47,6 +66,8 @@ template<drawing_mode kMode>
 void
 MaskRow(uint32* row, const uint8* coverage, int32 count, bool bit, const Ink& ink)
 {
+	if (!bit && LeavesClearBits(kMode))
+		return;
 	for (int32 i = 0; i < count; i++) {
 		if (coverage[i] != 0)
 			row[i] = Cover(row[i], BlendBit<kMode>(row[i], bit, ink), coverage[i], ink);
@@ -214,6 +235,12 @@ Compositor::_FillPart(const clipping_rect& part)
 		const bool bit = fKind == PatternKind::kHigh;
 		if (!bit && LeavesClearBits(fInk.mode))
 			return;
+		if (IsConstant(fInk.mode)) {
+			const bool high = fInk.mode != B_OP_ERASE && bit;
+			for (int32 y = part.top; y <= part.bottom; y++)
+				FillWords(fSurface.Row(y) + part.left, count, high ? fInk.high : fInk.low);
+			return;
+		}
 		for (int32 y = part.top; y <= part.bottom; y++)
 			functions.fill(fSurface.Row(y) + part.left, count, bit, fInk);
 		return;

@@ -131,19 +131,23 @@ PaintTask::_TraceSlanted(BPoint from, BPoint to, int32 penSize, bool steep, Sink
 		std::min(Target().DeviceEdge((int32)to.x + 1) - 1, steep ? bounds.bottom : bounds.right);
 	const double slope = (to.y - from.y) / (double)(to.x - from.x);
 	const double middle = ((double)from.x + 0.5) * scale;
-	const double startY = ((double)from.y - (penSize - 1) / 2) * scale;
-	const double rise = fabs(to.y - from.y) * scale;
+	const double startY = ((double)from.y - (penSize - 1) / 2) * scale + 0.5;
+	const double endY = startY + (to.y - from.y) * scale;
 
-	auto heightAt = [&](int32 x) {
-		const double up = std::clamp((x + 0.5 - middle) * slope, -rise, rise);
-		const double limited = slope > 0 ? std::max(up, 0.0) : std::min(up, 0.0);
-		return (int32)floor(startY + limited + 0.5);
-	};
+	// Heights with 32 binary places, so that a step is one addition.
+	constexpr double kUnit = 4294967296.0;
+	const int64 lowest = llround(std::min(startY, endY) * kUnit);
+	const int64 highest = llround(std::max(startY, endY) * kUnit);
+	const int64 step = llround(slope * kUnit);
+	int64 height = llround((startY + (first + 0.5 - middle) * slope) * kUnit);
+	auto heightAt = [&]() { return (int32)(std::clamp(height, lowest, highest) >> 32); };
 	for (int32 x = first; x <= last;) {
-		const int32 y = heightAt(x);
+		const int32 y = heightAt();
 		const int32 start = x;
-		while (++x <= last && heightAt(x) == y) {
-		}
+		do {
+			x++;
+			height += step;
+		} while (x <= last && heightAt() == y);
 		if (steep)
 			sink(clipping_rect { y, start, y + thickness - 1, x - 1 });
 		else

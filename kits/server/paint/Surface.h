@@ -57,13 +57,22 @@ public:
 
 	// round(logical * scale); halves go up.
 	static int32 DeviceEdge(int32 logical, float scale);
-	int32 DeviceEdge(int32 logical) const { return DeviceEdge(logical, fScale); }
+	int32 DeviceEdge(int32 logical) const
+	{
+		return fScale == 1 ? logical : DeviceEdge(logical, fScale);
+	}
 	// The logical pixel whose device pixels include this one.
 	static int32 LogicalAt(int32 device, float scale);
-	int32 LogicalAt(int32 device) const { return LogicalAt(device, fScale); }
+	int32 LogicalAt(int32 device) const
+	{
+		return fScale == 1 ? device : LogicalAt(device, fScale);
+	}
 	// Right and bottom are inside in both; not cut to the surface.
 	static clipping_rect ToDevice(const clipping_rect& logical, float scale);
-	clipping_rect ToDevice(const clipping_rect& logical) const { return ToDevice(logical, fScale); }
+	clipping_rect ToDevice(const clipping_rect& logical) const
+	{
+		return fScale == 1 ? logical : ToDevice(logical, fScale);
+	}
 
 	// Copies the rectangles, logical ones, from the same place of a surface of the same scale;
 	// what lies outside either surface is left out.
