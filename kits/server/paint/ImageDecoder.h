@@ -1,8 +1,9 @@
-// ImageDecoder: turns the bytes of an image file into a surface.
+// ImageDecoder: between the bytes of an image file and a surface.
 #pragma once
 
 #include <memory>
 #include <string>
+#include <vector>
 
 #include "server/paint/Surface.h"
 #include "support/private/Result.h"
@@ -19,12 +20,19 @@ struct DecodedImage {
 	std::string format; // "png", "jpeg" and so on
 };
 
-// The bytes may be anything. B_NO_TRANSLATOR: no known format; B_BAD_DATA: damaged or over the
+// The bytes may be anything. B_BAD_TYPE: no known format; B_BAD_DATA: damaged or over the
 // limits; B_NO_MEMORY. Any thread.
 Result<DecodedImage> DecodeImage(const void* data, size_t size);
 
-// The surface as a file of the format ("png", "jpeg", "bmp"); B_NO_TRANSLATOR if unknown.
-Result<std::string> EncodeImage(const Surface& surface, const char* format);
+// The format by the first bytes alone; B_BAD_TYPE if none is known.
+Result<std::string> IdentifyImage(const void* data, size_t size);
+
+// The surface as a file of the format ("png", "jpeg", "bmp", ...), or B_BAD_TYPE.
+Result<std::string> EncodeImage(const Surface& surface, const std::string& format);
+
+// What can be read and what can be written here, sorted by name.
+std::vector<std::string> ReadableImageFormats();
+std::vector<std::string> WritableImageFormats();
 
 
 } // namespace BPrivate

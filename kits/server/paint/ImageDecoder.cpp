@@ -1,0 +1,147 @@
+#include "server/paint/ImageDecoder.h"
+
+#include <QBuffer>
+#include <QGuiApplication>
+#include <QImageReader>
+#include <QImageWriter>
+#include <mutex>
+#include <string.h>
+
+#include <Errors.h>
+
+namespace BPrivate {
+
+namespace {
+
+// Readers whose headers do not tell the size are stopped by this many megabytes.
+constexpr int kMaxMegabytes = kMaxImagePixels * 4 / (1024 * 1024);
+
+
+// A picture of outlines may hold texts, whose fonts Qt has only within an application.
+bool
+IsUsable(const QByteArray& format)
+{
+	const bool isVector = format.startsWith("svg");
+	return !isVector || qobject_cast<QGuiApplication*>(QCoreApplication::instance()) != nullptr;
+}
+
+
+std::vector<std::string>
+ToNames(const QList<QByteArray>& formats)
+{
+	std::vector<std::string> names;
+	for (const QByteArray& format : formats) {
+		if (IsUsable(format))
+			names.push_back(format.toStdString());
+	}
+	return names;
+}
+
+
+// Reads from memory that it does not copy.
+class MemoryReader {
+public:
+	MemoryReader(const void* data, size_t size) :
+		fBytes(QByteArray::fromRawData(static_cast<const char*>(data), size))
+	{
+		static std::once_flag sOnce;
+		std::call_once(sOnce, [] { QImageReader::setAllocationLimit(kMaxMegabytes); });
+
+		fBuffer.setData(fBytes);
+		fBuffer.open(QIODevice::ReadOnly);
+		fReader.setDecideFormatFromContent(true);
+		fReader.setAutoTransform(true);
+		fReader.setDevice(&fBuffer);
+	}
+
+	// Empty if there is no reader for the bytes.
+	QByteArray Format()
+	{
+		const QByteArray format = QImageReader::imageFormat(&fBuffer);
+		return IsUsable(format) ? format : QByteArray();
+	}
+	bool IsWithinLimits() const
+	{
+		const QSize size = fReader.size();
+		return !size.isValid()
+			|| (size.width() <= kMaxImageSide && size.height() <= kMaxImageSide
+				&& (int64)size.width() * size.height() <= kMaxImagePixels);
+	}
+	QImage Read() { return fReader.read(); }
+
+private:
+	QByteArray fBytes;
+	QBuffer fBuffer;
+	QImageReader fReader;
+};
+
+} // namespace
+
+
+Result<DecodedImage>
+DecodeImage(const void* data, size_t size)
+{
+	MemoryReader reader(data, size);
+	const QByteArray format = reader.Format();
+	if (format.isEmpty())
+		return B_BAD_TYPE;
+	if (!reader.IsWithinLimits())
+		return B_BAD_DATA;
+	const QImage image = reader.Read().convertToFormat(QImage::Format_ARGB32);
+	if (image.isNull() || image.width() > kMaxImageSide || image.height() > kMaxImageSide)
+		return B_BAD_DATA;
+
+	DecodedImage result;
+	result.format = format.toStdString();
+	result.surface = std::make_unique<Surface>();
+	const status_t status = result.surface->SetTo(image.width(), image.height());
+	if (status != B_OK)
+		return status;
+	for (int32 y = 0; y < image.height(); y++)
+		memcpy(result.surface->Row(y), image.constScanLine(y), (size_t)image.width() * 4);
+	return result;
+}
+
+
+Result<std::string>
+IdentifyImage(const void* data, size_t size)
+{
+	const QByteArray format = MemoryReader(data, size).Format();
+	if (format.isEmpty())
+		return B_BAD_TYPE;
+	return format.toStdString();
+}
+
+
+Result<std::string>
+EncodeImage(const Surface& surface, const std::string& format)
+{
+	if (!surface.IsValid())
+		return B_BAD_VALUE;
+	const QImage image(reinterpret_cast<const uchar*>(surface.Row(0)), surface.DeviceWidth(),
+		surface.DeviceHeight(), surface.BytesPerRow(),
+		surface.Format() == SurfaceFormat::kAlpha ? QImage::Format_ARGB32 : QImage::Format_RGB32);
+	QBuffer buffer;
+	buffer.open(QIODevice::WriteOnly);
+	QImageWriter writer(&buffer, QByteArray::fromStdString(format));
+	if (!writer.canWrite() || !writer.write(image))
+		return B_BAD_TYPE;
+	return buffer.data().toStdString();
+}
+
+
+std::vector<std::string>
+ReadableImageFormats()
+{
+	return ToNames(QImageReader::supportedImageFormats());
+}
+
+
+std::vector<std::string>
+WritableImageFormats()
+{
+	return ToNames(QImageWriter::supportedImageFormats());
+}
+
+
+} // namespace BPrivate
