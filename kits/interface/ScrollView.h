@@ -65,4 +65,5 @@ private:
 	BScrollBar* fVertical; // child
 	border_style fBorder;
 	bool fHighlighted;
+	bool fHadTarget; // when it was read from an archive
 };
