@@ -13,6 +13,7 @@
 #include "app/private/MessagePrivate.h"
 #include "app/private/MessageReader.h"
 #include "app/private/MessageWriter.h"
+#include "app/private/WriteBack.h"
 
 using BPrivate::MessageData;
 using BPrivate::MessageField;
@@ -44,6 +45,7 @@ BMessage::BMessage(BMessage&& message) :
 	what(message.what), fData(std::exchange(message.fData, nullptr)),
 	fDelivery(std::exchange(message.fDelivery, nullptr)),
 	fLookUps(std::exchange(message.fLookUps, nullptr)),
+	fWriteBack(std::exchange(message.fWriteBack, nullptr)),
 	fCurrentSpecifier(std::exchange(message.fCurrentSpecifier, -1))
 {
 }
@@ -74,6 +76,7 @@ BMessage::operator=(BMessage&& message)
 	fData = std::exchange(message.fData, nullptr);
 	fDelivery = std::exchange(message.fDelivery, nullptr);
 	fLookUps = std::exchange(message.fLookUps, nullptr);
+	fWriteBack = std::exchange(message.fWriteBack, nullptr);
 	fCurrentSpecifier = std::exchange(message.fCurrentSpecifier, -1);
 	return *this;
 }
@@ -318,11 +321,17 @@ BMessage::AddData(
 		return B_NO_MEMORY;
 	const size_t length = strlen(name);
 	const uint32 hash = BPrivate::hash_name(name, length);
-	const int32 number = owned->Find(name, length, hash);
+	int32 number = owned->Find(name, length, hash);
+	if (number >= 0 && fWriteBack != nullptr)
+		number = fWriteBack->MakeRoom(*owned, number);
 	if (number < 0) {
 		if (length > B_FIELD_NAME_LENGTH)
 			return B_BAD_VALUE;
-		return owned->AddField(name, length, type, isFixedSize, data, size_t(numBytes));
+		const status_t status =
+			owned->AddField(name, length, type, isFixedSize, data, size_t(numBytes));
+		if (status == B_OK && fWriteBack != nullptr)
+			fWriteBack->PlaceLast(*owned);
+		return status;
 	}
 
 	const MessageField& field = owned->FieldAt(uint32(number));
@@ -438,6 +447,7 @@ BMessage::MakeEmpty()
 	fData = nullptr;
 	fDelivery = nullptr;
 	fLookUps = nullptr;
+	fWriteBack = nullptr;
 	fCurrentSpecifier = -1;
 	return B_OK;
 }
@@ -752,7 +762,9 @@ status_t
 BMessage::_AddNested(const char* name, MessageData* nested)
 {
 	const size_t length = strlen(name);
-	const int32 number = fData->Find(name, length, BPrivate::hash_name(name, length));
+	int32 number = fData->Find(name, length, BPrivate::hash_name(name, length));
+	if (number >= 0 && fWriteBack != nullptr)
+		number = fWriteBack->MakeRoom(*fData, number);
 	const bool fixed = number >= 0 && fData->FieldAt(uint32(number)).Has(MessageField::kFixed);
 	// Messages that lie deep in each other are kept as bytes from some depth on, so that no walk
 	// over them has to go deeper than that.
@@ -768,7 +780,10 @@ BMessage::_AddNested(const char* name, MessageData* nested)
 	if (number < 0) {
 		if (length > B_FIELD_NAME_LENGTH)
 			return B_BAD_VALUE;
-		return fData->AddMessageField(name, length, B_MESSAGE_TYPE, nested);
+		const status_t status = fData->AddMessageField(name, length, B_MESSAGE_TYPE, nested);
+		if (status == B_OK && fWriteBack != nullptr)
+			fWriteBack->PlaceLast(*fData);
+		return status;
 	}
 	if (fData->FieldAt(uint32(number)).type != B_MESSAGE_TYPE)
 		return B_BAD_TYPE;
@@ -891,6 +906,7 @@ BMessage::_Release()
 	if (fData != nullptr)
 		fData->Release();
 	delete fDelivery;
+	delete fWriteBack;
 	if (fLookUps != nullptr)
 		fLookUps->Release();
 }
@@ -923,6 +939,21 @@ MessagePrivate::SetData(MessageData* data)
 	if (fMessage->fData != nullptr)
 		fMessage->fData->Release();
 	fMessage->fData = data;
+}
+
+
+void
+MessagePrivate::SetWriteBack(std::unique_ptr<WriteBack> writeBack)
+{
+	delete fMessage->fWriteBack;
+	fMessage->fWriteBack = writeBack.release();
+}
+
+
+MessageData*
+MessagePrivate::OwnData() const
+{
+	return fMessage->_Own();
 }
 
 

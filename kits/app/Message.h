@@ -21,6 +21,7 @@ class DeliveryState;
 class LookUps;
 class MessageData;
 class MessagePrivate;
+class WriteBack;
 } // namespace BPrivate
 
 enum {
@@ -351,5 +352,6 @@ private:
 	BPrivate::MessageData* fData = nullptr; // shared; NULL when there are no fields
 	BPrivate::DeliveryState* fDelivery = nullptr; // owned
 	BPrivate::LookUps* fLookUps = nullptr; // shared; see ArchiveSource
+	BPrivate::WriteBack* fWriteBack = nullptr; // owned; while an archive is written again
 	int32 fCurrentSpecifier = -1;
 };

@@ -15,7 +15,14 @@
 
 using namespace BPrivate;
 
-enum class BScrollBar::Part : uint8 { kNone, kBackArrow, kForthArrow, kBackArea, kForthArea, kThumb };
+enum class BScrollBar::Part : uint8 {
+	kNone,
+	kBackArrow,
+	kForthArrow,
+	kBackArea,
+	kForthArea,
+	kThumb
+};
 
 namespace {
 
@@ -37,20 +44,12 @@ mode_for(orientation direction)
 } // namespace
 
 
-BScrollBar::BScrollBar(BRect frame, const char* name, BView* target, float min, float max,
-	orientation direction) :
+BScrollBar::BScrollBar(
+	BRect frame, const char* name, BView* target, float min, float max, orientation direction) :
 	BView(frame, name, mode_for(direction), kFlags),
-	fMin(std::min(min, max) == min ? min : 0),
-	fMax(std::min(min, max) == min ? max : 0),
-	fSmallStep(1),
-	fLargeStep(10),
-	fValue(0),
-	fProportion(0),
-	fTarget(nullptr),
-	fOrientation(direction),
-	fPressed(Part::kNone),
-	fRepeats(false),
-	fGrabOffset(0),
+	fMin(std::min(min, max) == min ? min : 0), fMax(std::min(min, max) == min ? max : 0),
+	fSmallStep(1), fLargeStep(10), fValue(0), fProportion(0), fTarget(nullptr),
+	fOrientation(direction), fPressed(Part::kNone), fRepeats(false), fGrabOffset(0),
 	fRepeater(nullptr)
 {
 	SetViewColor(B_TRANSPARENT_COLOR);
@@ -60,11 +59,7 @@ BScrollBar::BScrollBar(BRect frame, const char* name, BView* target, float min, 
 
 
 BScrollBar::BScrollBar(BMessage* archive) :
-	BView(archive),
-	fTarget(nullptr),
-	fPressed(Part::kNone),
-	fRepeats(false),
-	fGrabOffset(0),
+	BView(archive), fTarget(nullptr), fPressed(Part::kNone), fRepeats(false), fGrabOffset(0),
 	fRepeater(nullptr)
 {
 	fMin = archive->GetFloat("_range", 0, 0);
@@ -72,8 +67,8 @@ BScrollBar::BScrollBar(BMessage* archive) :
 	fSmallStep = archive->GetFloat("_steps", 0, 1);
 	fLargeStep = archive->GetFloat("_steps", 1, 10);
 	fValue = archive->GetFloat("_val", 0);
-	fOrientation = archive->GetInt32("_orient", B_VERTICAL) == B_HORIZONTAL ? B_HORIZONTAL
-																			: B_VERTICAL;
+	fOrientation =
+		archive->GetInt32("_orient", B_VERTICAL) == B_HORIZONTAL ? B_HORIZONTAL : B_VERTICAL;
 	fProportion = archive->GetFloat("_prop", 0);
 }
 
@@ -498,8 +493,7 @@ BScrollBar::_ThumbRect() const
 	if (!_IsUsable() || length < kMinThumb)
 		return BRect();
 	const float size = std::max(kMinThumb, std::floor(length * fProportion));
-	const float start
-		= std::round((fValue - fMin) / (fMax - fMin) * (length - size));
+	const float start = std::round((fValue - fMin) / (fMax - fMin) * (length - size));
 	BRect thumb = track;
 	if (vertical) {
 		thumb.top = track.top + start;
@@ -540,8 +534,7 @@ BScrollBar::_ValueAtThumb(float position) const
 	const BRect thumb = _ThumbRect();
 	const bool vertical = fOrientation == B_VERTICAL;
 	const float start = vertical ? track.top : track.left;
-	const float room
-		= vertical ? track.Height() - thumb.Height() : track.Width() - thumb.Width();
+	const float room = vertical ? track.Height() - thumb.Height() : track.Width() - thumb.Width();
 	if (room <= 0)
 		return fValue;
 	return fMin + (position - start) / room * (fMax - fMin);
@@ -557,10 +550,9 @@ BScrollBar::MouseDown(BPoint where)
 	if (!_IsUsable())
 		return;
 	const BMessage* message = Window() != nullptr ? Window()->CurrentMessage() : nullptr;
-	const uint32 buttons
-		= message != nullptr ? message->GetInt32("buttons", B_PRIMARY_MOUSE_BUTTON) : 0;
-	const bool large
-		= message != nullptr && (message->GetInt32("modifiers", 0) & B_SHIFT_KEY) != 0;
+	const uint32 buttons =
+		message != nullptr ? message->GetInt32("buttons", B_PRIMARY_MOUSE_BUTTON) : 0;
+	const bool large = message != nullptr && (message->GetInt32("modifiers", 0) & B_SHIFT_KEY) != 0;
 
 	_Release();
 	SetMouseEventMask(B_POINTER_EVENTS, B_LOCK_WINDOW_FOCUS | B_NO_POINTER_HISTORY);
@@ -569,8 +561,8 @@ BScrollBar::MouseDown(BPoint where)
 	const bool vertical = fOrientation == B_VERTICAL;
 	const float at = vertical ? where.y : where.x;
 	BRect thumb = _ThumbRect();
-	if ((buttons & B_SECONDARY_MOUSE_BUTTON) != 0 && thumb.IsValid()
-		&& fPressed != Part::kBackArrow && fPressed != Part::kForthArrow) {
+	if ((buttons & B_SECONDARY_MOUSE_BUTTON) != 0 && thumb.IsValid() && fPressed != Part::kBackArrow
+		&& fPressed != Part::kForthArrow) {
 		fPressed = Part::kThumb;
 		fGrabOffset = std::floor((vertical ? thumb.Height() : thumb.Width()) / 2);
 		SetValue(_ValueAtThumb(at - fGrabOffset));

@@ -36,12 +36,8 @@ BScrollView::BScrollView(const char* name, BView* target, uint32 resizingMode, u
 	bool horizontal, bool vertical, border_style border) :
 	BView(_FrameFor(target, horizontal, vertical, border), name, resizingMode,
 		_FlagsFor(flags, border)),
-	fTarget(nullptr),
-	fHorizontal(nullptr),
-	fVertical(nullptr),
-	fBorder(border),
-	fHighlighted(false),
-	fHadTarget(target != nullptr)
+	fTarget(nullptr), fHorizontal(nullptr), fVertical(nullptr), fBorder(border),
+	fHighlighted(false), fHadTarget(target != nullptr)
 {
 	SetViewColor(Look::PanelColor());
 	if (target != nullptr) {
@@ -57,11 +53,7 @@ BScrollView::BScrollView(const char* name, BView* target, uint32 resizingMode, u
 
 
 BScrollView::BScrollView(BMessage* archive) :
-	BView(archive),
-	fTarget(nullptr),
-	fHorizontal(nullptr),
-	fVertical(nullptr),
-	fHighlighted(false),
+	BView(archive), fTarget(nullptr), fHorizontal(nullptr), fVertical(nullptr), fHighlighted(false),
 	fHadTarget(false)
 {
 	fBorder = static_cast<border_style>(archive->GetInt32("_style", B_FANCY_BORDER));
@@ -166,11 +158,11 @@ void
 BScrollView::_AddBars(bool horizontal, bool vertical)
 {
 	if (horizontal)
-		fHorizontal = new BScrollBar(BRect(0, 0, 14, B_H_SCROLL_BAR_HEIGHT), kHorizontalName, fTarget,
-			0, 1000, B_HORIZONTAL);
+		fHorizontal = new BScrollBar(BRect(0, 0, 14, B_H_SCROLL_BAR_HEIGHT), kHorizontalName,
+			fTarget, 0, 1000, B_HORIZONTAL);
 	if (vertical)
-		fVertical = new BScrollBar(BRect(0, 0, B_V_SCROLL_BAR_WIDTH, 14), kVerticalName, fTarget, 0,
-			1000, B_VERTICAL);
+		fVertical = new BScrollBar(
+			BRect(0, 0, B_V_SCROLL_BAR_WIDTH, 14), kVerticalName, fTarget, 0, 1000, B_VERTICAL);
 	_PlaceParts();
 	if (fHorizontal != nullptr)
 		AddChild(fHorizontal);
@@ -410,7 +402,7 @@ BView*
 BScrollView::Target() const
 {
 	for (BView* child = ChildAt(0); fTarget != nullptr && child != nullptr;
-		child = child->NextSibling()) {
+		 child = child->NextSibling()) {
 		if (child == fTarget)
 			return fTarget;
 	}

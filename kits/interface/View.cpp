@@ -49,7 +49,7 @@ owner_of(const ServerView* node)
 
 BView::BView(BRect frame, const char* name, uint32 resizingMode, uint32 flags) :
 	BHandler(name), fNode(new ServerView(this, whole_frame(frame), resizingMode | flags)),
-	fOwner(nullptr), fState(nullptr), fExtras(nullptr), fSource(nullptr), fTouched(0)
+	fOwner(nullptr), fState(nullptr), fExtras(nullptr), fSource(nullptr), fTouched(0), fRevivedWord(0)
 {
 }
 
@@ -603,14 +603,6 @@ ViewPrivate::ScrollByWheel(BView* view, float dx, float dy)
 			return true;
 	}
 	return false;
-}
-
-
-void
-ViewPrivate::SetSource(BMessage* archive)
-{
-	delete fView->fSource;
-	fView->fSource = archive != nullptr ? new ArchiveSource(archive) : nullptr;
 }
 
 

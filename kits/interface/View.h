@@ -95,6 +95,7 @@ class BWindow;
 
 namespace BPrivate {
 class ArchiveSource;
+struct DrawState;
 class Painter;
 class ServerView;
 class ViewPrivate;
@@ -378,7 +379,11 @@ private:
 
 	void _InitFromArchive(BMessage* archive);
 	status_t _ArchiveOwnFields(BMessage* archive) const;
+	void _ArchiveColors(BMessage* archive, const rgb_color now[], const rgb_color read[]) const;
+	void _ArchiveModes(
+		BMessage* archive, const BPrivate::DrawState& now, const BPrivate::DrawState& read) const;
 	status_t _ArchiveChildren(BMessage* archive) const;
+	const BPrivate::DrawState& _BottomState() const;
 	BPrivate::ViewState* _State();
 	const BPrivate::ViewState& _StateToRead() const;
 	BPrivate::ViewExtras* _Extras();
@@ -395,6 +400,7 @@ private:
 	BPrivate::ViewExtras* fExtras; // owned; scroll bars, event mask and other rare things
 	BPrivate::ArchiveSource* fSource; // owned; what an archived view was read from
 	uint32 fTouched; // which settings were ever changed, for the archive
+	uint32 fRevivedWord; // flags and mode that an unchanged archived view has
 };
 
 

@@ -101,6 +101,17 @@ BView::_StateToRead() const
 }
 
 
+// The lowest level: what the view has when no state is pushed.
+const DrawState&
+BView::_BottomState() const
+{
+	const ViewState* level = &_StateToRead();
+	while (level->below != nullptr)
+		level = level->below.get();
+	return level->draw;
+}
+
+
 // #pragma mark - stack
 
 

@@ -29,6 +29,10 @@ public:
 	bool IsKnown(const char* name) const;
 	void SetKnown(const char* name);
 
+	// The shared fields, NULL if there are none, and whether one of them is known.
+	MessageData* Data() const { return fData; }
+	bool IsKnownField(uint32 number) const;
+
 	// Whether the archive was part of a managed one; see ManagedArchive.h.
 	bool WasManaged() const;
 

@@ -687,6 +687,30 @@ MessageData::CopyFieldOver(uint32 target, const MessageData& from, uint32 number
 
 
 void
+MessageData::MoveField(uint32 from, uint32 to)
+{
+	if (from <= to)
+		return;
+	const MessageField moved = fFields[from];
+	memmove(fFields + to + 1, fFields + to, (from - to) * sizeof(MessageField));
+	fFields[to] = moved;
+	_Changed();
+	if (fIndex != nullptr)
+		_BuildIndex();
+}
+
+
+void
+MessageData::SetCarried(uint32 number, bool carried)
+{
+	if (carried)
+		fFields[number].flags |= MessageField::kCarried;
+	else
+		fFields[number].flags &= uint16(~MessageField::kCarried);
+}
+
+
+void
 MessageData::SetNote(ManagedNote* note)
 {
 	if (note != nullptr)

@@ -26,6 +26,7 @@ struct MessageField {
 		kCompact = 0x10, // what lies from start on is this field in the compact R5 form
 		kWide = 0x20, // the same for the wide R5 form
 		kScattered = 0x40, // only the table tells where the items are
+		kCarried = 0x80, // put in by a WriteBack; the first item that is added replaces it
 	};
 
 	uint32 name; // offset
@@ -114,6 +115,9 @@ public:
 	// Copies a field of another message to the end, or in the place of one.
 	status_t CopyField(const MessageData& from, uint32 field);
 	status_t CopyFieldOver(uint32 target, const MessageData& from, uint32 field);
+	// Brings a field to an earlier place.
+	void MoveField(uint32 from, uint32 to);
+	void SetCarried(uint32 field, bool carried);
 
 	// How deep it lies in the message that was read, and how deep messages lie in it.
 	int32 Level() const { return fLevel; }

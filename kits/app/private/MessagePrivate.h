@@ -8,6 +8,9 @@
 namespace BPrivate {
 
 
+class WriteBack;
+
+
 // How a message was delivered and whom it answers. Made by the looper; a message that was never
 // delivered has none. The message owns it and deletes it with itself or in MakeEmpty().
 class DeliveryState {
@@ -37,6 +40,13 @@ public:
 	void SetData(MessageData* data); // takes a reference of its own
 	// The contents for changing, shared with nobody; NULL without memory.
 	MessageData* OwnData() const { return fMessage->_Own(); }
+
+	// Ours alone, made when there is none; NULL without memory.
+	MessageData* OwnData() const;
+
+	// Present while the archive of an object that was read is written again.
+	WriteBack* GetWriteBack() const { return fMessage->fWriteBack; }
+	void SetWriteBack(std::unique_ptr<WriteBack> writeBack);
 
 	LookUps* GetLookUps() const { return fMessage->fLookUps; }
 	void SetLookUps(LookUps* lookUps); // takes a reference of its own

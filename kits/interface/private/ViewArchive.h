@@ -64,6 +64,12 @@ namespace BPrivate {
 _EXPORT bool is_revived(const BView* view);
 
 
+// What a constructor from an archive does to flags or mode that its class needs: it does not count
+// as a change of what was read. SetFlags() would.
+_EXPORT void force_flags(BView* view, uint32 add, uint32 remove = 0);
+_EXPORT void force_resizing_mode(BView* view, uint32 mode);
+
+
 // Lets every field that is written into the archive from now on take the place that it had in the
 // source, and puts the fields in that no constructor looked up. Call it before anything is written;
 // BView::Archive() does. Nothing happens without a source.
@@ -101,6 +107,9 @@ public:
 	// Writes the field as it was read, or leaves it out as it was, if the object has a source and
 	// says that its value is unchanged. Otherwise false: the caller adds the field, or not.
 	bool Keep(const char* name, bool unchanged);
+	// For the field that BArchivable wrote: further names of the source stay, until somebody adds
+	// names of his own. `always`: whatever the object's class is.
+	void KeepClass(bool always);
 	// What the object was read from; empty for a new object. A look leaves no marks.
 	const BMessage& Source() const { return fSource; }
 

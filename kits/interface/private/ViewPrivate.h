@@ -31,7 +31,8 @@ public:
 
 	// The state that a hook sets is undone afterwards.
 	void CallDraw(BRect updateRect, bool afterChildren);
-	void SetSource(BMessage* archive);
+	// Flags and mode that an archive constructor sets.
+	void ForceWord(uint32 flags, uint32 mode);
 
 private:
 	BView* fView; // borrowed
