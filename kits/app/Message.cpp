@@ -950,13 +950,6 @@ MessagePrivate::SetWriteBack(std::unique_ptr<WriteBack> writeBack)
 }
 
 
-MessageData*
-MessagePrivate::OwnData() const
-{
-	return fMessage->_Own();
-}
-
-
 void
 MessagePrivate::SetLookUps(LookUps* lookUps)
 {

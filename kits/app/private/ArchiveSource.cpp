@@ -90,6 +90,13 @@ ArchiveSource::IsKnown(const char* name) const
 }
 
 
+bool
+ArchiveSource::IsKnownField(uint32 number) const
+{
+	return fLookUps->IsMarked(number);
+}
+
+
 void
 ArchiveSource::SetKnown(const char* name)
 {

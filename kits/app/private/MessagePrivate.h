@@ -41,9 +41,6 @@ public:
 	// The contents for changing, shared with nobody; NULL without memory.
 	MessageData* OwnData() const { return fMessage->_Own(); }
 
-	// Ours alone, made when there is none; NULL without memory.
-	MessageData* OwnData() const;
-
 	// Present while the archive of an object that was read is written again.
 	WriteBack* GetWriteBack() const { return fMessage->fWriteBack; }
 	void SetWriteBack(std::unique_ptr<WriteBack> writeBack);
