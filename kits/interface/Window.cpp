@@ -15,7 +15,9 @@
 #include "interface/private/MenuTracker.h"
 #include "interface/private/OffscreenWindow.h"
 #include "interface/private/ViewPrivate.h"
+#include "interface/private/WindowInspector.h"
 #include "interface/private/WindowInternals.h"
+#include "server/Desktop.h"
 
 using namespace BPrivate;
 
@@ -117,6 +119,7 @@ BWindow::_Init(BRect frame, const char* title, window_look look, window_feel fee
 	fInternals->server = std::make_unique<ServerWindow>(
 		fInternals, frame, fInternals->title.c_str(), look, feel, flags);
 	LooperPrivate(this).MarkAsWindow();
+	Desktop::Get()->SetInspector(&WindowInspector::Get());
 }
 
 

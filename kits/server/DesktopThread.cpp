@@ -193,6 +193,8 @@ DesktopThread::PostToApplication(std::unique_ptr<BMessage> message)
 void
 DesktopThread::SetInspector(Inspector* inspector)
 {
+	if (fInspector == inspector)
+		return;
 	std::lock_guard lock(fInspectorLock);
 	fInspector = inspector;
 }
@@ -204,7 +206,7 @@ DesktopThread::Inspect(const std::function<void(Inspector&)>& use)
 	std::lock_guard lock(fInspectorLock);
 	if (fInspector == nullptr)
 		return false;
-	use(*fInspector);
+	use(*fInspector.load());
 	return true;
 }
 

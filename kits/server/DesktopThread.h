@@ -104,7 +104,7 @@ private:
 	mutable std::mutex fLock; // of the screen's frame
 	BRect fScreenFrame;
 	std::mutex fInspectorLock; // held while it is used
-	Inspector* fInspector = nullptr; // borrowed
+	std::atomic<Inspector*> fInspector { nullptr }; // borrowed
 	std::atomic<uint32> fNextId { 1 };
 	std::mutex fPostLock; // of fBackend for posting, while it comes and goes
 

@@ -55,11 +55,10 @@ struct WindowNode {
 	bool isAlert = false;
 	bool isMenu = false; // a window that a menu has opened
 	BRect frame;
-	std::string defaultButton; // its label
 };
 
 
-// Implemented by the interface kit. Called by threads that hold no lock.
+// Implemented by the interface kit. Called by threads that hold no lock, one at a time.
 class Inspector {
 public:
 	virtual ~Inspector() = default;
