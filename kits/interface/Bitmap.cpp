@@ -101,7 +101,8 @@ BBitmap::BBitmap(BMessage* data) : BArchivable(data)
 	int32 bytesPerRow = B_ANY_BYTES_PER_ROW;
 	const bool complete =
 		data->FindRect("_frame", &bounds) == B_OK && data->FindInt32("_cspace", &space) == B_OK;
-	data->FindInt32("_rowbytes", &bytesPerRow);
+	if (data->FindInt32("_rowbytes", &bytesPerRow) != B_OK)
+		bytesPerRow = B_ANY_BYTES_PER_ROW;
 	const void* bits = NULL;
 	ssize_t size = 0;
 	const bool hasBits = data->FindData("_data", B_RAW_TYPE, &bits, &size) == B_OK;

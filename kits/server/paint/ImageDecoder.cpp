@@ -4,6 +4,7 @@
 #include <QGuiApplication>
 #include <QImageReader>
 #include <QImageWriter>
+#include <QLoggingCategory>
 #include <mutex>
 #include <string.h>
 
@@ -45,7 +46,11 @@ public:
 		fBytes(QByteArray::fromRawData(static_cast<const char*>(data), size))
 	{
 		static std::once_flag sOnce;
-		std::call_once(sOnce, [] { QImageReader::setAllocationLimit(kMaxMegabytes); });
+		std::call_once(sOnce, [] {
+			QImageReader::setAllocationLimit(kMaxMegabytes);
+			// Damage is reported by our own results.
+			QLoggingCategory::setFilterRules("qt.gui.imageio*=false");
+		});
 
 		fBuffer.setData(fBytes);
 		fBuffer.open(QIODevice::ReadOnly);
