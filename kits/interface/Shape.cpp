@@ -295,8 +295,8 @@ BShape::ArcTo(
 	double factor = sqrt(std::max(0.0, (product - divisor) / divisor));
 	if (largeArc != counterClockwise)
 		factor = -factor;
-	const double centerX = -factor * radiusX * y / radiusY;
-	const double centerY = factor * radiusY * x / radiusX;
+	const double centerX = factor * radiusX * y / radiusY;
+	const double centerY = -factor * radiusY * x / radiusX;
 
 	const double first = atan2((y - centerY) / radiusY, (x - centerX) / radiusX);
 	double sweep = atan2((-y - centerY) / radiusY, (-x - centerX) / radiusX) - first;
