@@ -1,11 +1,18 @@
 // BListItem: what a list view holds, abstract.
 #pragma once
 
+#include <memory>
+
 #include <Archivable.h>
 #include <Font.h>
 #include <Rect.h>
 
+class BListView;
 class BView;
+
+namespace BPrivate {
+class ArchiveSource;
+}
 
 
 // An item belongs to the program; a list only refers to it. While it is in an attached list, use
@@ -15,6 +22,8 @@ public:
 	BListItem(uint32 outlineLevel = 0, bool expanded = true);
 	BListItem(BMessage* archive);
 	virtual ~BListItem();
+	BListItem(const BListItem&) = delete;
+	BListItem& operator=(const BListItem&) = delete;
 
 	virtual status_t Archive(BMessage* archive, bool deep = true) const;
 
@@ -51,12 +60,15 @@ private:
 	float fHeight;
 	float fTop; // place in the list, kept by it
 	int32 fIndex; // where the list saw it last: a first guess, checked before use
+	int32 fFullIndex; // the same in an outline's full list
 	uint32 fLevel;
 	bool fSelected;
 	bool fEnabled;
 	bool fExpanded;
 	bool fHasSubitems;
 	bool fVisible;
+	BListView* fReviver; // the list that made it from its own archive and still has it, or NULL
+	std::unique_ptr<BPrivate::ArchiveSource> fSource; // what it was revived from
 };
 
 #include <StringItem.h>

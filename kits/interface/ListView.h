@@ -2,6 +2,7 @@
 #pragma once
 
 #include <memory>
+#include <unordered_set>
 #include <vector>
 
 #include <Invoker.h>
@@ -13,7 +14,8 @@ class BList;
 enum list_view_type { B_SINGLE_SELECTION_LIST, B_MULTIPLE_SELECTION_LIST };
 
 
-// The items stay the program's: neither removal nor the destructor deletes them.
+// The items stay the program's: neither removal nor the destructor deletes them. Only those that
+// the list made from its own archive, and that were not removed, go with it.
 class BListView : public BView, public BInvoker {
 public:
 	BListView(BRect frame, const char* name, list_view_type type = B_SINGLE_SELECTION_LIST,
@@ -133,49 +135,52 @@ protected:
 	virtual void DrawItem(BListItem* item, BRect itemFrame, bool complete = false);
 
 private:
+	friend class BListItem;
 	friend class BOutlineListView;
 	struct Tracking;
 	struct TypeAhead;
 
-	bool _InsertItems(int32 index, BListItem* const* items, int32 count);
-	void _TakeItems(int32 index, int32 count);
+	void _Init(list_view_type type);
+	void _ReadItems(BMessage* archive, const char* field, std::vector<BListItem*>& items);
+	status_t _ArchiveOwn(BMessage* archive, bool deep, const char* field,
+		const std::vector<BListItem*>& items) const;
+	bool _Insert(int32 index, BListItem* const* items, int32 count);
+	void _Take(int32 index, int32 count);
+	void _Leave(BListItem* item);
 	void _UpdateItem(BListItem* item);
 	void _UpdateItems();
-	void _EnsurePlaces(int32 index) const;
-	void _PlacesChanged(int32 fromIndex);
-	void _InvalidateFrom(int32 index, float oldBottom);
+	void _EnsurePlaces() const;
+	void _PlacesChanged(int32 fromIndex, float oldBottom);
 	float _Bottom() const;
+	float _WidestItem() const;
 	int32 _IndexAt(float y) const;
 	void _UpdateScrollBars();
 	void _RescanSelection();
+	bool _SetSelected(int32 index, bool selected);
 	bool _SelectRange(int32 from, int32 to, bool extend);
 	bool _DeselectOutside(int32 from, int32 to);
-	bool _SetSelected(int32 index, bool selected);
-	void _SelectionMayHaveChanged(bool changed);
-	void _SendSelection();
-	status_t _Send(BMessage* message, uint32 kind);
-	void _PressItem(int32 index, uint32 modifiers);
+	void _SelectionDone(bool changed);
+	void _Press(int32 index, uint32 modifiers);
 	void _TrackTo(BPoint where);
-	void _StopTracking();
-	void _MoveSelection(int32 index, uint32 modifiers);
+	void _AutoScroll();
+	uint32 _CurrentModifiers() const;
+	void _MoveByKey(int32 to, bool extend);
 	int32 _NextEnabled(int32 from, int32 step) const;
 	int32 _PageStep(int32 from, bool down) const;
-	void _TypeAhead(const char* bytes, int32 numBytes);
+	bool _HandleTypeAhead(const char* bytes, int32 numBytes);
 	void _ScrollToItem(int32 index);
-	void _Focused(bool focus);
-	int32 _IndexInArchiveOrder() const;
+	void _ShowFocus();
 
 	std::vector<BListItem*> fItems; // borrowed
-	mutable int32 fPlaced; // so many items from the start have a valid place
+	std::unordered_set<BListItem*> fRevived; // made from the list's archive, and still in it
+	mutable int32 fPlaced; // so many items from the start know their place and index
 	list_view_type fType;
 	int32 fFirstSelected; // bounds of the selection; -1 without one
 	int32 fLastSelected;
 	int32 fAnchor; // where Shift extends from
-	int32 fFocusItem;
+	int32 fFocusItem; // where the keys are
 	std::unique_ptr<BMessage> fSelectionMessage;
 	std::unique_ptr<Tracking> fTracking; // the press that is being followed
 	std::unique_ptr<TypeAhead> fTypeAhead;
 	BScrollView* fScrollView; // borrowed
-	float fKnownWidth;
-	bool fRevived;
 };

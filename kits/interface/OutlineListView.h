@@ -85,18 +85,24 @@ protected:
 	virtual void DrawItem(BListItem* item, BRect itemFrame, bool complete = false);
 
 private:
-	int32 _FullIndex(const BListItem* item) const;
 	int32 _VisibleIndexFor(int32 fullIndex) const;
 	int32 _SubtreeEnd(int32 fullIndex) const;
 	int32 _SuperitemIndex(int32 fullIndex) const;
-	bool _IsShownUnder(int32 superIndex) const;
-	void _UpdateSubitemFlag(int32 fullIndex);
-	void _Rebuild(BListItem* keepFocus);
-	void _SortRange(int32 from, int32 to, uint32 level, bool oneLevelOnly,
+	bool _ShowsSubitems(int32 superIndex) const;
+	void _CollectVisible(int32 from, int32 to, std::vector<BListItem*>& visible);
+	void _RemoveFull(int32 from, int32 to);
+	void _TakeHidden(int32 index, int32 count);
+	bool _RangeUnder(BListItem* superitem, int32* _from, int32* _to) const;
+	void _SubitemsChanged(int32 superIndex);
+	void _RebuildVisible();
+	void _SortBlock(int32 from, int32 to, bool oneLevelOnly,
 		int (*compare)(const BListItem*, const BListItem*));
-	float _Indent(uint32 level) const;
+	bool _SwapBlocks(int32 a, int32 b);
+	float _Indent(int32 level) const;
+	bool _HitsLatch(BPoint where, int32 index) const;
 
 	std::vector<BListItem*> fFullItems; // borrowed
+	mutable bool fFullIndicesValid;
 	BListItem* fLatchItem; // the item whose latch is held down, borrowed
 	bool fLatchInside;
 };
