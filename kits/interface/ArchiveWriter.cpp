@@ -28,6 +28,22 @@ same_string(const char* a, const char* b)
 	return std::strcmp(a, b) == 0;
 }
 
+// The private classes' names came into a name space at some time; both are meant.
+bool
+same_class(const char* a, const char* b)
+{
+	constexpr std::string_view kSpace = "BPrivate::";
+	if (a == nullptr || b == nullptr)
+		return a == b;
+	std::string_view first(a);
+	std::string_view second(b);
+	for (std::string_view* name : { &first, &second }) {
+		if (name->starts_with(kSpace) && name->substr(kSpace.size()).starts_with('_'))
+			name->remove_prefix(kSpace.size());
+	}
+	return first == second;
+}
+
 } // namespace
 
 
@@ -107,7 +123,7 @@ ArchiveWriter::KeepClass(bool always)
 	const char* read = nullptr;
 	fArchive->FindString("class", &written);
 	fSource.FindString("class", &read);
-	const bool same = same_string(written, read);
+	const bool same = same_class(written, read);
 	if (!Keep("class", always || same) || always)
 		return;
 	// Further names are carried along until somebody adds names of his own.

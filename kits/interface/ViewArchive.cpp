@@ -18,8 +18,9 @@ using namespace BPrivate;
 
 namespace {
 
-// How many views of this thread are archiving their children.
-thread_local int32 sArchiving = 0;
+// The view whose archive goes into its parent's. A view that is archived in any other way (a
+// submenu by its item) is a root by itself, wherever that happens.
+thread_local const BView* sArchivedAsChild = nullptr;
 
 constexpr int32 kColors = 3; // high, low, view
 
@@ -272,6 +273,8 @@ BView::_InitFromArchive(BMessage* archive)
 status_t
 BView::Archive(BMessage* archive, bool deep) const
 {
+	const bool isRoot = sArchivedAsChild != this;
+	sArchivedAsChild = nullptr;
 	begin_archive(fSource, archive);
 	status_t status = BHandler::Archive(archive, deep);
 	if (status != B_OK)
@@ -288,7 +291,7 @@ BView::Archive(BMessage* archive, bool deep) const
 		return status;
 
 	// A child of a managed archive that is archived by itself is nested like any other.
-	if (sArchiving > 0)
+	if (!isRoot)
 		return B_OK;
 	if (!is_managed_root(*archive)) {
 		clear_managed_note(archive);
@@ -428,10 +431,10 @@ BView::_ArchiveChildren(BMessage* archive) const
 	status_t status = B_OK;
 	std::vector<BMessage> children;
 	children.reserve(CountChildren());
-	sArchiving++;
 	for (const ServerView* node = fNode->FirstChild(); node != nullptr && status == B_OK;
 		 node = node->Next()) {
 		BMessage child;
+		sArchivedAsChild = node->Owner();
 		status = node->Owner()->Archive(&child, true);
 		BMessage read;
 		while (entry < count && source.FindMessage("_views", entry, &read) != B_OK)
@@ -443,7 +446,6 @@ BView::_ArchiveChildren(BMessage* archive) const
 		entry++;
 		children.push_back(std::move(child));
 	}
-	sArchiving--;
 	if (status != B_OK)
 		return status;
 	// Entries that are no messages count for nothing, but stay while the rest does.
