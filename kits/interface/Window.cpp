@@ -119,6 +119,7 @@ BWindow::_Init(BRect frame, const char* title, window_look look, window_feel fee
 	fInternals->server = std::make_unique<ServerWindow>(
 		fInternals, frame, fInternals->title.c_str(), look, feel, flags);
 	LooperPrivate(this).MarkAsWindow();
+	WindowInspector::Get().Add(fInternals->server->Id(), this);
 	Desktop::Get()->SetInspector(&WindowInspector::Get());
 }
 

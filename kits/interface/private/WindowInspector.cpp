@@ -1,9 +1,6 @@
 #include "interface/private/WindowInspector.h"
 
-#include <algorithm>
-
 #include <Alert.h>
-#include <Application.h>
 #include <ListView.h>
 #include <Window.h>
 
@@ -16,30 +13,23 @@ namespace {
 
 constexpr bigtime_t kClassPatience = 50000;
 
+} // namespace
 
-// Holds the lock of the window with that number; NULL when there is none, or no lock in time.
-class LockedWindow {
+
+// Holds the lock of a window; NULL when it is gone, or when there was no lock in time.
+class WindowInspector::LockedWindow {
 public:
-	LockedWindow(uint32 id, bigtime_t timeout)
+	LockedWindow(BWindow* window, uint32 id, bigtime_t timeout)
 	{
-		const bigtime_t end = system_time() + timeout;
-		// A window that has gone meanwhile is not locked: the address alone is looked at.
-		for (int32 i = 0; be_app != nullptr && i < be_app->CountWindows(); i++) {
-			BWindow* window = be_app->WindowAt(i);
-			if (window == nullptr)
-				continue;
-			const bigtime_t left = std::max<bigtime_t>(1, end - system_time());
-			const status_t status = window->LockWithTimeout(left);
-			fTimedOut = fTimedOut || status == B_TIMED_OUT;
-			if (status != B_OK)
-				continue;
-			const auto& server = WindowInternals::Of(window).server;
-			if (server != nullptr && server->Id() == id) {
-				fWindow = window;
-				return;
-			}
+		// A looper that is gone is not locked: the address alone is looked at.
+		fStatus = window != nullptr ? window->LockWithTimeout(timeout) : B_BAD_VALUE;
+		if (fStatus != B_OK)
+			return;
+		const auto& server = WindowInternals::Of(window).server;
+		if (server != nullptr && server->Id() == id)
+			fWindow = window;
+		else
 			window->Unlock();
-		}
 	}
 
 	~LockedWindow()
@@ -49,14 +39,12 @@ public:
 	}
 
 	BWindow* Get() const { return fWindow; }
-	status_t Error() const { return fTimedOut ? B_TIMED_OUT : B_BAD_VALUE; }
+	status_t Error() const { return fStatus == B_TIMED_OUT ? B_TIMED_OUT : B_BAD_VALUE; }
 
 private:
 	BWindow* fWindow = nullptr; // borrowed
-	bool fTimedOut = false;
+	status_t fStatus;
 };
-
-} // namespace
 
 
 WindowInspector&
@@ -81,27 +69,56 @@ WindowInspector::Windows()
 
 
 void
-WindowInspector::_AddClass(WindowNode& node)
+WindowInspector::Add(uint32 id, BWindow* window)
 {
 	std::lock_guard lock(fLock);
-	auto known = fClasses.find(node.id);
-	if (known == fClasses.end()) {
-		const LockedWindow window(node.id, kClassPatience);
-		if (window.Get() == nullptr)
+	// Whatever was at that address before is gone.
+	std::erase_if(fWindows, [window](const auto& known) { return known.second.window == window; });
+	fWindows[id].window = window;
+}
+
+
+BWindow*
+WindowInspector::_Find(uint32 id)
+{
+	std::lock_guard lock(fLock);
+	const auto known = fWindows.find(id);
+	return known != fWindows.end() ? known->second.window : nullptr;
+}
+
+
+void
+WindowInspector::_AddClass(WindowNode& node)
+{
+	BWindow* address = nullptr;
+	{
+		std::lock_guard lock(fLock);
+		const auto known = fWindows.find(node.id);
+		if (known == fWindows.end())
 			return;
-		const bool isAlert = dynamic_cast<BAlert*>(window.Get()) != nullptr;
-		const KnownClass found { class_name_of(typeid(*window.Get())), isAlert };
-		known = fClasses.emplace(node.id, found).first;
+		address = known->second.window;
+		node.className = known->second.className;
+		node.isAlert = known->second.isAlert;
 	}
-	node.className = known->second.name;
-	node.isAlert = known->second.isAlert;
+	if (!node.className.empty())
+		return;
+
+	const LockedWindow window(address, node.id, kClassPatience);
+	if (window.Get() == nullptr)
+		return;
+	node.className = class_name_of(typeid(*window.Get()));
+	node.isAlert = dynamic_cast<BAlert*>(window.Get()) != nullptr;
+	std::lock_guard lock(fLock);
+	const auto known = fWindows.find(node.id);
+	if (known != fWindows.end())
+		known->second = { address, node.className, node.isAlert };
 }
 
 
 status_t
 WindowInspector::Describe(uint32 id, bigtime_t timeout, ViewNode* _root)
 {
-	const LockedWindow window(id, timeout);
+	const LockedWindow window(_Find(id), id, timeout);
 	if (window.Get() == nullptr)
 		return window.Error();
 	*_root = describe_window(*window.Get());
@@ -112,7 +129,7 @@ WindowInspector::Describe(uint32 id, bigtime_t timeout, ViewNode* _root)
 status_t
 WindowInspector::RevealItem(uint32 id, const void* view, const void* item)
 {
-	const LockedWindow window(id, kClassPatience);
+	const LockedWindow window(_Find(id), id, kClassPatience);
 	if (window.Get() == nullptr)
 		return window.Error();
 	auto* list = dynamic_cast<BListView*>(find_view(*window.Get(), view));

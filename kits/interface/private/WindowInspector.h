@@ -18,21 +18,28 @@ class WindowInspector final : public Inspector {
 public:
 	static WindowInspector& Get();
 
+	// Of a window that has just been made. Nobody says when it goes: its number is never given
+	// again, and its address is locked only if it is a window's.
+	void Add(uint32 id, BWindow* window);
+
 	std::vector<WindowNode> Windows() override;
 	status_t Describe(uint32 window, bigtime_t timeout, ViewNode* _root) override;
 	status_t RevealItem(uint32 window, const void* view, const void* item) override;
 
 private:
-	struct KnownClass {
-		std::string name;
-		bool isAlert;
+	class LockedWindow;
+
+	struct KnownWindow {
+		BWindow* window; // borrowed; may be gone
+		std::string className; // empty until it was looked at, which is done once
+		bool isAlert = false;
 	};
 
-	// What stays the same for a window's life, so that a busy window is waited for once at most.
 	void _AddClass(WindowNode& node);
+	BWindow* _Find(uint32 id);
 
-	std::mutex fLock;
-	std::map<uint32, KnownClass> fClasses; // by window
+	std::mutex fLock; // never held while a window's is waited for
+	std::map<uint32, KnownWindow> fWindows; // by id
 };
 
 
