@@ -251,6 +251,8 @@ Desktop::Inject(const BackendEvent& event, uint32 window)
 			if (record == nullptr)
 				return;
 			entered.window = record->native.get();
+			if (event.type == BackendEvent::Type::WindowChanged && event.frame != record->Frame())
+				fThread->Expect(window, event.type);
 		}
 		fThread->GetBackend().Inject(entered);
 	});

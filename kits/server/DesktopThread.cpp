@@ -297,11 +297,15 @@ DesktopThread::Show(const WindowReference& window, bool show)
 	if (show) {
 		window->shownSerial = fNextSerial++;
 		UpdateOwners();
-		Expect(window, BackendEvent::Type::WindowShown);
+		Expect(window->Id(), BackendEvent::Type::WindowShown);
 	} else {
-		Settle(window, BackendEvent::Type::WindowShown);
-		Settle(window, BackendEvent::Type::WindowActivated);
+		for (const auto event : { BackendEvent::Type::WindowShown,
+				 BackendEvent::Type::WindowActivated, BackendEvent::Type::WindowChanged })
+			Settle(window->Id(), event);
 		fPointer->WindowHidden(window);
+		// The desktop will choose another of our windows, or one of another program.
+		if (window == fPolicy->Active())
+			Expect(kAnyWindow, BackendEvent::Type::WindowActivated);
 	}
 	window->native->SetShown(show);
 	if (!show)
@@ -331,7 +335,7 @@ DesktopThread::Activate(const WindowReference& window)
 		return;
 	}
 	if (!window->active)
-		Expect(window, BackendEvent::Type::WindowActivated);
+		Expect(window->Id(), BackendEvent::Type::WindowActivated);
 	window->native->Activate();
 	fPointer->WindowsRearranged();
 }
@@ -410,7 +414,7 @@ DesktopThread::HandleEvent(const BackendEvent& event)
 
 		case Type::WindowShown:
 			if (WindowReference window = Find(event.window))
-				Settle(window, Type::WindowShown);
+				Settle(window->Id(), Type::WindowShown);
 			break;
 
 		case Type::CloseRequested:
@@ -446,7 +450,10 @@ void
 DesktopThread::_WindowChanged(const BackendEvent& event)
 {
 	WindowReference window = Find(event.window);
-	if (window == nullptr || !window->ReportFrame(event.frame))
+	if (window == nullptr)
+		return;
+	Settle(window->Id(), BackendEvent::Type::WindowChanged);
+	if (!window->ReportFrame(event.frame))
 		return;
 
 	const BRect before = window->reportedFrame;
@@ -489,14 +496,14 @@ DesktopThread::_ScreenChanged()
 
 
 void
-DesktopThread::Expect(const WindowReference& window, BackendEvent::Type event)
+DesktopThread::Expect(uint32 window, BackendEvent::Type event)
 {
 	if (fBackend->IsImmediate())
 		return;
 
 	const int64 serial = fNextSerial++;
 	fActivity.AddWork();
-	fExpectations.push_back({ window->Id(), event, serial });
+	fExpectations.push_back({ window, event, serial });
 	fBackend->PostLater(kExpectationTimeout, [this, serial] {
 		const auto expired = [serial](const Expectation& other) { return other.serial == serial; };
 		if (std::erase_if(fExpectations, expired) > 0)
@@ -506,10 +513,10 @@ DesktopThread::Expect(const WindowReference& window, BackendEvent::Type event)
 
 
 void
-DesktopThread::Settle(const WindowReference& window, BackendEvent::Type event)
+DesktopThread::Settle(uint32 window, BackendEvent::Type event)
 {
 	const size_t settled = std::erase_if(fExpectations, [&](const Expectation& expectation) {
-		return expectation.window == window->Id() && expectation.event == event;
+		return expectation.window == window && expectation.event == event;
 	});
 	if (settled > 0)
 		fActivity.WorkDone(static_cast<int32>(settled));

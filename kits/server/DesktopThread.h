@@ -79,9 +79,10 @@ public:
 	void HandleEvent(const BackendEvent& event) override;
 
 	// Counts as work until Settle() of the same window and event, or a second has gone: a desktop
-	// answers such requests in its own time.
-	void Expect(const WindowReference& window, BackendEvent::Type event);
-	void Settle(const WindowReference& window, BackendEvent::Type event);
+	// answers such requests in its own time. A window is given by its id, or kAnyWindow.
+	static constexpr uint32 kAnyWindow = 0;
+	void Expect(uint32 window, BackendEvent::Type event);
+	void Settle(uint32 window, BackendEvent::Type event);
 
 private:
 	struct Expectation {

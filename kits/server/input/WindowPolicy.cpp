@@ -34,8 +34,10 @@ WindowPolicy::WindowPolicy(DesktopThread& desktop) : fDesktop(desktop)
 void
 WindowPolicy::Activated(const WindowReference& window)
 {
-	if (window != nullptr)
-		fDesktop.Settle(window, BackendEvent::Type::WindowActivated);
+	if (window != nullptr) {
+		fDesktop.Settle(window->Id(), BackendEvent::Type::WindowActivated);
+		fDesktop.Settle(DesktopThread::kAnyWindow, BackendEvent::Type::WindowActivated);
+	}
 	if (window == fActive)
 		return;
 
