@@ -101,9 +101,9 @@ TEST(BResources, EmptyResourceFileHas1984Bytes)
 	const std::string path = EmptyFile(folder);
 	BResources resources;
 	ASSERT_EQ(B_OK, resources.SetTo(path.c_str()));
-	EXPECT_EQ(0u, ReadFile(path).size());
+	EXPECT_TRUE(0u == ReadFile(path).size());
 	ASSERT_EQ(B_OK, resources.Sync());
-	EXPECT_EQ(1984u, ReadFile(path).size());
+	EXPECT_TRUE(1984u == ReadFile(path).size());
 	EXPECT_EQ(1u, folder.Count());
 }
 
@@ -273,7 +273,7 @@ TEST(BResources, SetToAnswersWhatIsWrong)
 	for (const auto& [bytes, status] : cases) {
 		WriteFile(folder / "bad", bytes);
 		EXPECT_EQ(status, resources.SetTo((folder / "bad").c_str())) << bytes;
-		EXPECT_EQ(bytes, ReadFile(folder / "bad"));
+		EXPECT_TRUE(bytes == ReadFile(folder / "bad"));
 	}
 	WriteFile(folder / "bad", std::string("RS\0\0", 4));
 	EXPECT_EQ(B_ERROR, resources.SetTo((folder / "bad").c_str()));
@@ -288,10 +288,10 @@ TEST(BResources, ClobberEmptiesAnyFileAtOnce)
 	WriteFile(folder / "text", "this is text");
 	BResources resources;
 	ASSERT_EQ(B_OK, resources.SetTo((folder / "text").c_str(), true));
-	EXPECT_EQ(1984u, ReadFile(folder / "text").size());
+	EXPECT_TRUE(1984u == ReadFile(folder / "text").size());
 	const std::string path = SmallFile(folder);
 	ASSERT_EQ(B_OK, resources.SetTo(path.c_str(), true));
-	EXPECT_EQ(1984u, ReadFile(path).size());
+	EXPECT_TRUE(1984u == ReadFile(path).size());
 	EXPECT_FALSE(resources.HasResource('ARCV', 1));
 }
 
@@ -309,7 +309,7 @@ TEST(BResources, ClobberSparesAReadOnlyFile)
 	EXPECT_EQ(B_NOT_ALLOWED, resources.RemoveResource('ARCV', 1));
 	EXPECT_EQ(B_NOT_ALLOWED, resources.WriteResource('ARCV', 1, "x", 0, 1));
 	EXPECT_EQ(B_NOT_ALLOWED, resources.Sync());
-	EXPECT_EQ(before, ReadFile(path));
+	EXPECT_TRUE(before == ReadFile(path));
 }
 
 
@@ -359,7 +359,7 @@ TEST(BResources, PpcFileKeepsItsByteOrder)
 		EXPECT_EQ(3u, RowsOf(resources).size());
 		Add(resources, 'SHRT', 1, std::string("\x05\0", 2));
 	}
-	EXPECT_EQ(ppc, ReadFile(folder / "ppc").substr(0, 40));
+	EXPECT_TRUE(ppc == ReadFile(folder / "ppc").substr(0, 40));
 
 	// An empty big-endian section.
 	const std::string little = ReadFile(EmptyFile(folder, "empty"));
@@ -406,7 +406,7 @@ TEST(BResources, UnknownPartsOfAFileAreKept)
 		Add(resources, 'AAAA', 1, "data");
 		ASSERT_EQ(B_OK, resources.RemoveResource('AAAA', 1));
 	}
-	EXPECT_EQ(bytes, ReadFile(path));
+	EXPECT_TRUE(bytes == ReadFile(path));
 }
 
 
@@ -422,7 +422,7 @@ TEST(BResources, EmptyNameAndNoNameStayApart)
 	const std::string bytes = ReadFile(path);
 	BResources resources(path.c_str());
 	ASSERT_EQ(B_OK, resources.Sync());
-	EXPECT_EQ(bytes, ReadFile(path));
+	EXPECT_TRUE(bytes == ReadFile(path));
 }
 
 
@@ -605,10 +605,10 @@ TEST(BResources, WriteToMovesToTheOtherFile)
 	ASSERT_EQ(B_OK, resources.RemoveResource('CSTR', 2));
 	EXPECT_EQ(B_BAD_VALUE, resources.WriteTo(NULL));
 	ASSERT_EQ(B_OK, resources.WriteTo(&file));
-	EXPECT_EQ(before, ReadFile(path));
+	EXPECT_TRUE(before == ReadFile(path));
 	Add(resources, 'MORE', 1, "more");
 	ASSERT_EQ(B_OK, resources.Sync());
-	EXPECT_EQ(before, ReadFile(path));
+	EXPECT_TRUE(before == ReadFile(path));
 	BResources again(other.c_str());
 	EXPECT_EQ(RowsOf(resources), RowsOf(again));
 	EXPECT_EQ(4u, RowsOf(again).size());
