@@ -17,6 +17,14 @@ struct Ink {
 	int32 constantAlpha = -1;
 	// The destination's alpha means something (SurfaceFormat::kAlpha).
 	bool keepsAlpha = false;
+
+	void SetHigh(rgb_color color)
+	{
+		high = (uint32)color.alpha << 24 | (uint32)color.red << 16 | (uint32)color.green << 8
+			| color.blue;
+		if (constantAlpha >= 0)
+			constantAlpha = color.alpha;
+	}
 };
 
 inline uint32

@@ -66,9 +66,9 @@ PaintTask::InkOf(const Painter& painter)
 	Ink ink;
 	ink.mode = state.mode;
 	ink.alphaFunction = state.alphaFunction;
-	ink.high = ToPixel(state.highColor);
 	ink.low = ToPixel(state.lowColor);
-	ink.constantAlpha = state.sourceAlpha == B_CONSTANT_ALPHA ? state.highColor.alpha : -1;
+	ink.constantAlpha = state.sourceAlpha == B_CONSTANT_ALPHA ? 0 : -1;
+	ink.SetHigh(state.highColor);
 	ink.keepsAlpha = painter.fSurface.Format() == SurfaceFormat::kAlpha;
 	return ink;
 }

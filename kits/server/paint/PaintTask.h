@@ -40,6 +40,7 @@ public:
 	static Ink InkOf(const Painter& painter);
 
 	const DrawState& State() const { return fState; }
+	drawing_mode Mode() const { return fInk.mode; }
 	Compositor& Output() { return fOutput; }
 	const Surface& Target() const { return fPainter.fSurface; }
 	double Scale() const { return fPainter.fSurface.Scale(); }

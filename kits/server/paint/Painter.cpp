@@ -116,6 +116,30 @@ FillInterior(PaintTask& task, CoverageMask& mask, const std::vector<BPoint>& poi
 	}
 }
 
+
+void
+StrokeOneLine(PaintTask& task, BPoint from, BPoint to)
+{
+	const BPoint start = task.ToSurface(from);
+	const BPoint end = task.ToSurface(to);
+	const int32 width = abs(PaintTask::Round(start.x) - PaintTask::Round(end.x));
+	const int32 height = abs(PaintTask::Round(start.y) - PaintTask::Round(end.y));
+	if (task.PenSize() > kMaxSolidPen && width > 0 && height > 0) {
+		PathPainter path(task);
+		path.MoveTo(start);
+		path.LineTo(end);
+		path.Stroke();
+		return;
+	}
+
+	clipping_rect damage = { INT32_MAX, INT32_MAX, INT32_MIN, INT32_MIN };
+	task.TraceLine(start, end, task.PenSize(), [&](const clipping_rect& rect) {
+		task.Output().FillRect(rect);
+		damage = Union(damage, rect);
+	});
+	task.AddDamage(Intersect(damage, task.Output().Bounds()));
+}
+
 } // namespace
 
 
@@ -156,38 +180,19 @@ void
 Painter::StrokeLine(BPoint from, BPoint to, const pattern& pattern)
 {
 	PaintTask task(*this, pattern);
-	const BPoint start = task.ToSurface(from);
-	const BPoint end = task.ToSurface(to);
-	const int32 width = abs(PaintTask::Round(start.x) - PaintTask::Round(end.x));
-	const int32 height = abs(PaintTask::Round(start.y) - PaintTask::Round(end.y));
-	if (task.PenSize() > kMaxSolidPen && width > 0 && height > 0) {
-		PathPainter path(task);
-		path.MoveTo(start);
-		path.LineTo(end);
-		path.Stroke();
-		return;
-	}
-
-	clipping_rect damage = { INT32_MAX, INT32_MAX, INT32_MIN, INT32_MIN };
-	task.TraceLine(start, end, task.PenSize(), [&](const clipping_rect& rect) {
-		task.Output().FillRect(rect);
-		damage = Union(damage, rect);
-	});
-	task.AddDamage(Intersect(damage, task.Output().Bounds()));
+	StrokeOneLine(task, from, to);
 }
 
 
 void
 Painter::StrokeLines(const PaintedLine* lines, int32 count)
 {
-	const DrawState* state = fState;
-	DrawState own = state != nullptr ? *state : DrawState();
-	fState = &own;
+	Ink ink = PaintTask::InkOf(*this);
 	for (int32 i = 0; i < count; i++) {
-		own.highColor = lines[i].color;
-		StrokeLine(lines[i].start, lines[i].end);
+		ink.SetHigh(lines[i].color);
+		PaintTask task(*this, B_SOLID_HIGH, ink);
+		StrokeOneLine(task, lines[i].start, lines[i].end);
 	}
-	fState = state;
 }
 
 

@@ -97,7 +97,7 @@ BitmapTask::_Pixel(uint32 pixel) const
 {
 	if (fBitmap.Format() == SurfaceFormat::kAlpha)
 		return pixel;
-	if (pixel == kTransparentOpaque && fTask.State().mode != B_OP_COPY)
+	if (pixel == kTransparentOpaque && fTask.Mode() != B_OP_COPY)
 		return 0;
 	return pixel | 0xff000000;
 }
@@ -230,13 +230,9 @@ void
 Painter::DrawTiled(const Surface& bitmap, BRect source, BRect destination, BRect area,
 	uint32 tiling, uint32 options)
 {
-	DrawState copy = fState != nullptr ? *fState : DrawState();
-	copy.mode = B_OP_COPY;
-	const DrawState* state = fState;
-	fState = &copy;
-	PaintTask task(*this, B_SOLID_HIGH);
-	fState = state;
-
+	Ink ink = PaintTask::InkOf(*this);
+	ink.mode = B_OP_COPY;
+	PaintTask task(*this, B_SOLID_HIGH, ink);
 	const clipping_rect from = ToPixels(source);
 	const clipping_rect tile = task.ToSurface(destination);
 	const clipping_rect visible =

@@ -63,10 +63,7 @@ public:
 	}
 	// The logical pixel whose device pixels include this one.
 	static int32 LogicalAt(int32 device, float scale);
-	int32 LogicalAt(int32 device) const
-	{
-		return fScale == 1 ? device : LogicalAt(device, fScale);
-	}
+	int32 LogicalAt(int32 device) const { return fScale == 1 ? device : LogicalAt(device, fScale); }
 	// Right and bottom are inside in both; not cut to the surface.
 	static clipping_rect ToDevice(const clipping_rect& logical, float scale);
 	clipping_rect ToDevice(const clipping_rect& logical) const
