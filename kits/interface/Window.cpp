@@ -14,6 +14,7 @@
 #include "app/private/LooperPrivate.h"
 #include "interface/private/MenuTracker.h"
 #include "interface/private/OffscreenWindow.h"
+#include "interface/private/ViewInspector.h"
 #include "interface/private/ViewPrivate.h"
 #include "interface/private/WindowInspector.h"
 #include "interface/private/WindowInternals.h"
@@ -98,6 +99,7 @@ BWindow::~BWindow()
 {
 	if (fInternals == nullptr)
 		return;
+	WindowList::Remove(this);
 	_DeleteViews();
 	delete fInternals;
 	fInternals = nullptr;
@@ -119,6 +121,10 @@ BWindow::_Init(BRect frame, const char* title, window_look look, window_feel fee
 	fInternals->server = std::make_unique<ServerWindow>(
 		fInternals, frame, fInternals->title.c_str(), look, feel, flags);
 	LooperPrivate(this).MarkAsWindow();
+	ViewInspector::Install();
+	WindowList::Add(this, fInternals->server->Id());
+	WindowList::SetTitle(this, fInternals->title.c_str());
+	WindowList::SetFrame(this, frame);
 	WindowInspector::Get().Add(fInternals->server->Id(), this);
 	Desktop::Get()->SetInspector(&WindowInspector::Get());
 }
@@ -265,6 +271,7 @@ BWindow::Show()
 		internals.PrepareSurface();
 		internals.tree.Invalidate(internals.tree.Root(), internals.tree.Root().Bounds());
 		internals.server->Show();
+		WindowList::SetShown(this, true);
 		internals.UpdateNeeded();
 	}
 	const bool starts = !internals.shownOnce;
@@ -286,8 +293,10 @@ BWindow::Hide()
 	const bool wasLocked = IsLocked();
 	if (!wasLocked && !Lock())
 		return;
-	if (fInternals->hideCount++ == 0)
+	if (fInternals->hideCount++ == 0) {
 		fInternals->server->Hide();
+		WindowList::SetShown(this, false);
+	}
 	if (!wasLocked)
 		Unlock();
 }

@@ -11,6 +11,7 @@
 #include "app/private/CursorPrivate.h"
 #include "app/private/LooperPrivate.h"
 #include "interface/private/BitmapAccess.h"
+#include "interface/private/ViewInspector.h"
 #include "interface/private/ViewPrivate.h"
 #include "interface/private/ViewState.h"
 #include "interface/private/ViewWalk.h"
@@ -143,6 +144,7 @@ void
 WindowInternals::CallWindowActivated(bool isActive)
 {
 	active = isActive;
+	WindowList::SetActive(&window, isActive);
 	window.WindowActivated(isActive);
 	ViewWalk walk(tree.Root(), walks, ViewWalk::kNotice);
 	walk.ParentsFirst([isActive](BView& view) { view.WindowActivated(isActive); });

@@ -10,6 +10,7 @@
 #include <Screen.h>
 
 #include "interface/private/ViewArchive.h"
+#include "interface/private/ViewInspector.h"
 #include "interface/private/ViewPrivate.h"
 #include "interface/private/WindowInternals.h"
 
@@ -205,6 +206,7 @@ BWindow::SetTitle(const char* title)
 	SetName(fInternals->title.c_str());
 	if (fInternals->server != nullptr)
 		fInternals->server->SetTitle(fInternals->title.c_str());
+	WindowList::SetTitle(this, fInternals->title.c_str());
 }
 
 
