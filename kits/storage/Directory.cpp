@@ -41,42 +41,41 @@ HasFlavor(const struct stat& stat, int32 nodeFlags)
 } // namespace
 
 
-BDirectory::BDirectory() : fIterator(NULL)
+BDirectory::BDirectory()
 {
 }
 
 
-BDirectory::BDirectory(const BDirectory& directory) :
-	BNode(directory), BEntryList(), fIterator(NULL)
+BDirectory::BDirectory(const BDirectory& directory) : BNode(directory), BEntryList()
 {
 }
 
 
-BDirectory::BDirectory(const entry_ref* ref) : fIterator(NULL)
-{
-	SetTo(ref);
-}
-
-
-BDirectory::BDirectory(const node_ref* ref) : fIterator(NULL)
+BDirectory::BDirectory(const entry_ref* ref)
 {
 	SetTo(ref);
 }
 
 
-BDirectory::BDirectory(const BEntry* entry) : fIterator(NULL)
+BDirectory::BDirectory(const node_ref* ref)
+{
+	SetTo(ref);
+}
+
+
+BDirectory::BDirectory(const BEntry* entry)
 {
 	SetTo(entry);
 }
 
 
-BDirectory::BDirectory(const char* path) : fIterator(NULL)
+BDirectory::BDirectory(const char* path)
 {
 	SetTo(path);
 }
 
 
-BDirectory::BDirectory(const BDirectory* directory, const char* path) : fIterator(NULL)
+BDirectory::BDirectory(const BDirectory* directory, const char* path)
 {
 	SetTo(directory, path);
 }
@@ -248,13 +247,13 @@ BDirectory::GetNextRef(entry_ref* ref)
 {
 	if (ref == NULL)
 		return B_BAD_VALUE;
-	const bool first = fIterator == NULL;
 	const char* name;
 	status_t status = _NextName(&name);
 	if (status != B_OK)
 		return status;
-	if (first)
+	if (!fNamed)
 		RememberDirectory(_Fd());
+	fNamed = true;
 	struct stat stat;
 	status = GetStat(&stat);
 	if (status != B_OK)
@@ -394,6 +393,7 @@ BDirectory::close_fd()
 		closedir(fIterator);
 		fIterator = NULL;
 	}
+	fNamed = false;
 	BNode::close_fd();
 }
 

@@ -61,7 +61,8 @@ private:
 	// The next name that is neither "." nor "..".
 	status_t _NextName(const char** _name);
 
-	DIR* fIterator; // an own stream on the directory; NULL before the first step
+	DIR* fIterator = NULL; // an own stream on the directory; NULL before the first step
+	bool fNamed = false; // refs into it were given out
 };
 
 

@@ -1,0 +1,222 @@
+#include <stdlib.h>
+#include <unistd.h>
+
+#include <AppFileInfo.h>
+#include <Entry.h>
+#include <File.h>
+#include <Message.h>
+#include <Mime.h>
+#include <NodeInfo.h>
+#include <ResourceStrings.h>
+#include <Resources.h>
+#include <String.h>
+
+#include "TemporaryFolder.h"
+
+namespace {
+
+// A user of their own, whose shared database knows a few types.
+class MimeDatabaseTest : public testing::Test {
+protected:
+	void SetUp() override
+	{
+		setenv("XDG_CONFIG_HOME", (fFolder / "config").c_str(), 1);
+		setenv("XDG_DATA_HOME", (fFolder / "data").c_str(), 1);
+		setenv("XDG_DATA_DIRS", sShared.Path().c_str(), 1);
+		setenv("LANG", "de_DE.UTF-8", 1);
+		unsetenv("LC_ALL");
+		unsetenv("LC_MESSAGES");
+		std::filesystem::create_directories(sShared / "mime/image");
+		WriteFile(sShared / "mime/types", "image/png\ntext/plain\ntext/x-c\nimage/x-bad\n");
+		WriteFile(sShared / "mime/globs2",
+			"# a comment\n50:text/plain:*.txt\n60:text/x-c:*.C:cs\n50:text/x-c++:*.c\n"
+			"50:image/png:*.png\n50:image/png:*.apng\n50:application/x-tar-gz:*.tar.gz\n"
+			"50:application/gzip:*.gz\n50:text/x-make:makefile\n");
+		WriteFile(sShared / "mime/image/png.xml",
+			"<mime-type><comment>PNG image</comment>"
+			"<comment xml:lang=\"de\">PNG-Bild &amp; mehr</comment></mime-type>");
+		const std::string magic = std::string("MIME-Magic\0\n", 12) + "[50:image/png]\n>0="
+			+ std::string("\0\4", 2) + "\x89PNG\n[40:image/x-nested]\n>0=" + std::string("\0\1", 2)
+			+ "N\n1>4=" + std::string("\0\2", 2)
+			+ "ok+10\n[30:image/x-masked]\n>0=" + std::string("\0\1", 2) + "\xf0&\xf0\n";
+		WriteFile(sShared / "mime/magic", magic);
+	}
+
+	std::string Guess(const std::string& bytes)
+	{
+		BMimeType type;
+		EXPECT_EQ(B_OK, BMimeType::GuessMimeType(bytes.data(), bytes.size(), &type));
+		return type.Type();
+	}
+
+	TemporaryFolder fFolder;
+	// The database is read once in a program.
+	static inline TemporaryFolder sShared;
+};
+
+using BMimeTypeTest = MimeDatabaseTest;
+using BAppFileInfoTest = MimeDatabaseTest;
+
+} // namespace
+
+
+TEST_F(BMimeTypeTest, KnowsWhatATypeIs)
+{
+	EXPECT_TRUE(BMimeType::IsValid("text/plain"));
+	EXPECT_TRUE(BMimeType::IsValid("text"));
+	for (const char* bad : { "", "text/", "/plain", "a/b/c", "te xt/plain", "text/pl@in" })
+		EXPECT_FALSE(BMimeType::IsValid(bad)) << bad;
+	EXPECT_FALSE(BMimeType::IsValid(NULL));
+	BMimeType type("TEXT/Plain");
+	EXPECT_TRUE(type == "text/plain");
+	EXPECT_FALSE(type.IsSupertypeOnly());
+	BMimeType super;
+	ASSERT_EQ(B_OK, type.GetSupertype(&super));
+	EXPECT_STREQ("TEXT", super.Type());
+	EXPECT_TRUE(super.Contains(&type));
+	EXPECT_FALSE(type.Contains(&super));
+	EXPECT_EQ(B_BAD_VALUE, super.GetSupertype(&type));
+	EXPECT_EQ(B_BAD_VALUE, type.SetTo("no type/"));
+	EXPECT_EQ(NULL, type.Type());
+}
+
+
+TEST_F(BMimeTypeTest, GuessesByNames)
+{
+	const std::pair<const char*, const char*> cases[] = { { "a.txt", "text/plain" },
+		{ "A.TXT", "text/plain" }, { "a.C", "text/x-c" }, { "a.c", "text/x-c++" },
+		{ "a.tar.gz", "application/x-tar-gz" }, { "/some/where/a.gz", "application/gzip" },
+		{ "makefile", "text/x-make" }, { "nothing", "application/octet-stream" } };
+	for (const auto& [name, expected] : cases) {
+		BMimeType type;
+		ASSERT_EQ(B_OK, BMimeType::GuessMimeType(name, &type));
+		EXPECT_STREQ(expected, type.Type()) << name;
+	}
+}
+
+
+TEST_F(BMimeTypeTest, GuessesByBytes)
+{
+	EXPECT_EQ("image/png", Guess("\x89PNG and more"));
+	EXPECT_EQ("application/octet-stream", Guess("\x89PN"));
+	EXPECT_EQ("image/x-nested", Guess("N.......ok"));
+	EXPECT_EQ("application/octet-stream", Guess("N......."));
+	EXPECT_EQ("image/x-masked", Guess("\xf7"));
+	EXPECT_EQ("application/octet-stream", Guess(""));
+}
+
+
+TEST_F(BMimeTypeTest, AFileWithoutAttributeHasAGuessedType)
+{
+	WriteFile(fFolder / "picture", "\x89PNG and more");
+	BNode node((fFolder / "picture").c_str());
+	char type[B_MIME_TYPE_LENGTH + 1];
+	ASSERT_EQ(B_OK, BNodeInfo(&node).GetType(type));
+	EXPECT_STREQ("image/png", type);
+	BNode directory(fFolder.Path().c_str());
+	ASSERT_EQ(B_OK, BNodeInfo(&directory).GetType(type));
+	EXPECT_STREQ("application/x-vnd.Be-directory", type);
+	ASSERT_EQ(B_OK, update_mime_info((fFolder / "picture").c_str(), 0, 1, 0));
+	attr_info info;
+	EXPECT_EQ(B_OK, node.GetAttrInfo("BEOS:TYPE", &info));
+}
+
+
+TEST_F(BMimeTypeTest, DescribesInTheUsersLanguage)
+{
+	char text[B_MIME_TYPE_LENGTH + 1];
+	BMimeType type("image/png");
+	ASSERT_EQ(B_OK, type.GetShortDescription(text));
+	EXPECT_STREQ("PNG-Bild & mehr", text);
+	BMessage extensions;
+	ASSERT_EQ(B_OK, type.GetFileExtensions(&extensions));
+	EXPECT_STREQ("png", extensions.FindString("extensions", (int32)0));
+	EXPECT_STREQ("apng", extensions.FindString("extensions", (int32)1));
+	EXPECT_EQ(B_ENTRY_NOT_FOUND, BMimeType("image/none").GetShortDescription(text));
+}
+
+
+TEST_F(BMimeTypeTest, WhatIsSetStays)
+{
+	BMimeType type("application/x-test");
+	EXPECT_FALSE(type.IsInstalled());
+	ASSERT_EQ(B_OK, type.Install());
+	EXPECT_TRUE(type.IsInstalled());
+	ASSERT_EQ(B_OK, type.SetShortDescription("A test"));
+	ASSERT_EQ(B_OK, type.SetPreferredApp("application/x-vnd.Test"));
+	char text[B_MIME_TYPE_LENGTH + 1];
+	ASSERT_EQ(B_OK, BMimeType("Application/X-Test").GetShortDescription(text));
+	EXPECT_STREQ("A test", text);
+	BMessage types;
+	ASSERT_EQ(B_OK, BMimeType::GetInstalledTypes("application", &types));
+	bool found = false;
+	const char* name;
+	for (int32 i = 0; types.FindString("types", i, &name) == B_OK; i++)
+		found = found || strcmp(name, "application/x-test") == 0;
+	EXPECT_TRUE(found);
+	ASSERT_EQ(B_OK, type.SetShortDescription(NULL));
+	EXPECT_EQ(B_ENTRY_NOT_FOUND, type.GetShortDescription(text));
+	ASSERT_EQ(B_OK, type.Delete());
+	EXPECT_FALSE(type.IsInstalled());
+	EXPECT_EQ(B_ENTRY_NOT_FOUND, type.Delete());
+}
+
+
+TEST_F(BAppFileInfoTest, WritesAttributesAndResources)
+{
+	const std::string path = fFolder / "program";
+	WriteFile(path, "");
+	{
+		BFile file(path.c_str(), B_READ_WRITE);
+		BAppFileInfo info(&file);
+		ASSERT_EQ(B_OK, info.SetSignature("application/x-vnd.Test"));
+		ASSERT_EQ(B_OK, info.SetAppFlags(5));
+		BMessage types;
+		types.AddString("types", "text");
+		ASSERT_EQ(B_OK, info.SetSupportedTypes(&types));
+		version_info version = { 1, 2, 3, 4, 5, "short", "long" };
+		ASSERT_EQ(B_OK, info.SetVersionInfo(&version, B_SYSTEM_VERSION_KIND));
+		EXPECT_TRUE(info.IsSupportedType("text/plain"));
+		EXPECT_FALSE(info.IsSupportedType("image/png"));
+	}
+	BFile file(path.c_str(), B_READ_ONLY);
+	for (const info_location where : { B_USE_ATTRIBUTES, B_USE_RESOURCES }) {
+		BAppFileInfo info(&file);
+		info.SetInfoLocation(where);
+		char signature[B_MIME_TYPE_LENGTH + 1];
+		ASSERT_EQ(B_OK, info.GetSignature(signature));
+		EXPECT_STREQ("application/x-vnd.Test", signature);
+		uint32 flags = 0;
+		ASSERT_EQ(B_OK, info.GetAppFlags(&flags));
+		EXPECT_EQ(5u, flags);
+		version_info version;
+		ASSERT_EQ(B_OK, info.GetVersionInfo(&version, B_SYSTEM_VERSION_KIND));
+		EXPECT_EQ(3u, version.minor);
+		EXPECT_STREQ("short", version.short_info);
+		BMessage types;
+		ASSERT_EQ(B_OK, info.GetSupportedTypes(&types));
+		EXPECT_STREQ("text", types.FindString("types", (int32)0));
+	}
+}
+
+
+TEST_F(BAppFileInfoTest, StringsComeFromResources)
+{
+	const std::string path = fFolder / "strings";
+	WriteFile(path, "");
+	{
+		BResources resources(path.c_str());
+		resources.AddResource('CSTR', 1, "hello", 6);
+		resources.AddResource('CSTR', 2, "endless", 7);
+	}
+	entry_ref ref;
+	ASSERT_EQ(B_OK, get_ref_for_path(path.c_str(), &ref));
+	BResourceStrings strings(ref);
+	ASSERT_EQ(B_OK, strings.InitCheck());
+	EXPECT_STREQ("hello", strings.FindString(1));
+	EXPECT_EQ(NULL, strings.FindString(2));
+	EXPECT_EQ(NULL, strings.FindString(3));
+	std::unique_ptr<BString> copy(strings.NewString(1));
+	ASSERT_NE(nullptr, copy);
+	EXPECT_STREQ("hello", copy->String());
+}
