@@ -219,9 +219,10 @@ ItemWindow::_AddEditor()
 	float width, height;
 	view->GetPreferredSize(&width, &height);
 	ResizeTo(std::max(width, Bounds().Width()), std::max(height + top, Bounds().Height()));
+	// Only what is attached has its children follow.
+	AddChild(view);
 	view->MoveTo(0, top);
 	view->ResizeTo(Bounds().Width(), Bounds().Height() - top);
-	AddChild(view);
 	SetKeyMenuBar(fMenuBar);
 }
 
