@@ -213,7 +213,9 @@ BTextView::ScrollToOffset(int32 offset)
 	if (Window() == NULL)
 		return;
 	const BRect bounds = Bounds();
-	const BRect extent = _ExtentOf(_Clamp(offset));
+	BRect extent = _ExtentOf(_Clamp(offset));
+	if (extent.bottom >= fTextRect.bottom - 1)
+		extent.bottom = _ContentHeight();
 	BPoint where = bounds.LeftTop();
 	if (extent.left < bounds.left)
 		where.x = std::max(0.0f, extent.left - fTextRect.left - std::floor(bounds.Width() / 4));
@@ -382,10 +384,11 @@ BTextView::_ContentWidth() const
 }
 
 
+// With the space above once more below; bottom - top.
 float
 BTextView::_ContentHeight() const
 {
-	return fLayout->TotalHeight() + fTextRect.top * 2;
+	return fLayout->TotalHeight() + fTextRect.top * 2 - 1;
 }
 
 

@@ -176,16 +176,19 @@ TextLayout::Change(int32 offset, int32 removed, int32 inserted)
 	int32 old = first + 1;
 	while (true) {
 		if (!lines.empty()) {
-			while (old < oldCount
-				&& (LineStart(old) < offset + removed || LineStart(old) + delta < position))
-				old++;
-			if (old < oldCount && LineStart(old) + delta == position)
-				break;
-			if (position >= length
-				&& (lines.back().offset == length || fModel.Buffer().ByteAt(length - 1) != '\n')) {
+			// At the end there is one more line only behind a line break.
+			const bool atEnd = position >= length
+				&& (lines.back().offset == length || fModel.Buffer().ByteAt(length - 1) != '\n');
+			if (atEnd) {
 				old = oldCount;
 				break;
 			}
+			while (old < oldCount
+				&& (LineStart(old) < offset + removed || LineStart(old) + delta < position))
+				old++;
+			// The empty line at the end looks like what stands before it, so it is made anew.
+			if (old < oldCount && LineStart(old) + delta == position && position < length)
+				break;
 		}
 		float width;
 		const int32 end = _FindEnd(position, &width);
