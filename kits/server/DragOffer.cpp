@@ -112,7 +112,8 @@ make_foreign_drag(const BMessage& data)
 				message->AddRef("refs", &ref);
 		}
 	}
-	if (data.FindData(kPlainText, B_MIME_TYPE, &bytes, &size) == B_OK)
+	// Files are not text, though many programs offer their addresses as such.
+	if (message->what == B_MIME_DATA && data.FindData(kPlainText, B_MIME_TYPE, &bytes, &size) == B_OK)
 		message->AddData(kPlainText, B_MIME_TYPE, bytes, size, false);
 	return message;
 }

@@ -222,6 +222,18 @@ MenuTracker::Abort()
 	fFirstMessenger.SendMessage(kMenuAbort);
 	std::unique_lock lock(fDoneLock);
 	fDoneCondition.wait(lock, [this] { return fDone.load(); });
+	_CloseBar();
+}
+
+
+// With the lock of the bar's window.
+void
+MenuTracker::_CloseBar()
+{
+	if (fBar == NULL || fBar->fTracker != this)
+		return;
+	fBar->_Closed();
+	BMessenger(fBar).SendMessage(kMenusEnded);
 }
 
 
@@ -244,10 +256,9 @@ MenuTracker::_Finish(BMenuItem* item)
 	{
 		Step step(*this);
 		chosen = chosen && step.IsLocked();
-		if (fBar != NULL) {
-			fBar->_Closed();
-			BMessenger(fBar).SendMessage(kMenusEnded);
-		}
+		// Who ends it by Abort() holds the lock, and closes the bar himself.
+		if (step.IsLocked())
+			_CloseBar();
 		if (chosen && fRequest.deliver && fSharing != Sharing::kLoan) {
 			BInvoker* invoker = item;
 			invoker->Invoke();

@@ -32,15 +32,28 @@ IsItem(const ViewNode& node, const std::string& text)
 }
 
 
+// Name spaces may be left out.
+bool
+IsClassName(const std::string& name, const std::string& wanted)
+{
+	if (name == wanted)
+		return true;
+	const size_t length = wanted.size() + 2;
+	return name.size() > length && name.compare(name.size() - length, 2, "::") == 0
+		&& name.compare(name.size() - wanted.size(), wanted.size(), wanted) == 0;
+}
+
+
 bool
 IsOfClass(const ViewNode& node, const PathStep& step)
 {
 	if (node.isItem)
 		return false;
-	if (node.className == step.text)
+	if (IsClassName(node.className, step.text))
 		return true;
+	const auto isWanted = [&](const std::string& base) { return IsClassName(base, step.text); };
 	const std::vector<std::string>& bases = node.baseClasses;
-	return step.orDerived && std::find(bases.begin(), bases.end(), step.text) != bases.end();
+	return step.orDerived && std::any_of(bases.begin(), bases.end(), isWanted);
 }
 
 
