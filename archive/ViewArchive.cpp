@@ -2,6 +2,7 @@
 
 #include <cstdio>
 #include <cstring>
+#include <memory>
 #include <string>
 #include <vector>
 
@@ -174,6 +175,23 @@ ViewFromResource(const char* name)
 	if (!sResources->GetResourceInfo(kArchiveType, name, &id, &size))
 		return nullptr;
 	return ViewFromResource(id);
+}
+
+
+BArchivable*
+InstantiateAsChild(BMessage* archive)
+{
+	if (BArchivable* object = instantiate_object(archive))
+		return object;
+
+	BMessage parentArchive;
+	parentArchive.AddString(kClassField, "BView");
+	parentArchive.AddMessage("_views", archive);
+	const std::unique_ptr<BView> parent(ViewFromArchive(&parentArchive));
+	BView* child = parent != nullptr ? parent->ChildAt(0) : nullptr;
+	if (child != nullptr)
+		child->RemoveSelf();
+	return child;
 }
 
 

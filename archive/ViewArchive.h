@@ -3,6 +3,7 @@
 
 #include <SupportDefs.h>
 
+class BArchivable;
 class BMessage;
 class BView;
 
@@ -10,6 +11,11 @@ class BView;
 // such resource, its bytes are no message, or the object is no view. The caller owns the view.
 BView* ViewFromResource(int32 id);
 BView* ViewFromResource(const char* name);
+
+// Revives an archived object as it would be revived as a child of another view: a platform that
+// puts stand-ins in the place of children of unknown classes gives one for it. NULL when the
+// archive cannot be revived. The caller owns the object.
+BArchivable* InstantiateAsChild(BMessage* archive);
 
 // Whether two archives have the same code and the same fields: same types, same entries in the
 // same order, byte for byte, nested archives by the same rule. The order of fields does not matter.

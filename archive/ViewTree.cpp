@@ -37,7 +37,8 @@ struct ColorPair {
 
 
 // The page of the selected tab is a child of the container only while the tab view is attached, so
-// it is saved in the container's place: where the restoring walk will meet it.
+// it is saved in the container's place: where the restoring walk will meet it. A tab view that has
+// no selection takes its first tab when it is attached.
 void
 SaveColors(BView* view, std::vector<ColorPair>& colors)
 {
@@ -51,7 +52,7 @@ SaveColors(BView* view, std::vector<ColorPair>& colors)
 			continue;
 		}
 		colors.push_back({ container->ViewColor(), container->LowColor() });
-		if (BView* page = tabView->ViewForTab(tabView->Selection()))
+		if (BView* page = tabView->ViewForTab(std::max<int32>(tabView->Selection(), 0)))
 			SaveColors(page, colors);
 	}
 }

@@ -71,7 +71,7 @@ ObjectFromDrop(BMessage* message)
 
 	BMessage archive;
 	if (message->FindMessage(kDroppedViewField, &archive) == B_OK)
-		return instantiate_object(&archive);
+		return InstantiateAsChild(&archive); // a view that was dragged out of a design is not lost
 
 	entry_ref ref;
 	return message->FindRef("refs", &ref) == B_OK ? ObjectFromFile(ref) : NULL;

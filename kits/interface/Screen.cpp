@@ -4,8 +4,6 @@
 
 #include <Bitmap.h>
 #include <Window.h>
-
-#include "backend/Backend.h"
 #include "server/Desktop.h"
 
 using namespace BPrivate;

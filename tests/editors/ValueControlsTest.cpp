@@ -110,10 +110,12 @@ TEST(IntControl, ReadsANumberAtTheStartOfItsText)
 {
 	Fixture fixture;
 	IntControl* control = fixture.Add(MakeInt(0, -1000, 1000));
-	control->SetText("  -12xyz");
-	EXPECT_EQ(-12, control->Value());
-	control->SetText("99999999999999999999");
-	EXPECT_EQ(2147483647, control->Value());
+	fixture.window.Locked([&] {
+		control->SetText("  -12xyz");
+		EXPECT_EQ(-12, control->Value());
+		control->SetText("99999999999999999999");
+		EXPECT_EQ(2147483647, control->Value());
+	});
 }
 
 
@@ -121,13 +123,15 @@ TEST(IntControl, LimitsDoNotPassEachOther)
 {
 	Fixture fixture;
 	IntControl* control = fixture.Add(MakeInt(50, 10, 100));
-	control->SetMax(5);
-	EXPECT_STREQ("10", control->Text());
-	control->SetValue(50);
-	EXPECT_STREQ("10", control->Text());
-	control->SetMax(20);
-	control->SetMin(30);
-	EXPECT_STREQ("20", control->Text());
+	fixture.window.Locked([&] {
+		control->SetMax(5);
+		EXPECT_STREQ("10", control->Text());
+		control->SetValue(50);
+		EXPECT_STREQ("10", control->Text());
+		control->SetMax(20);
+		control->SetMin(30);
+		EXPECT_STREQ("20", control->Text());
+	});
 }
 
 
@@ -142,13 +146,15 @@ TEST(FloatControl, ShowsShortNumbers)
 {
 	Fixture fixture;
 	FloatControl* control = fixture.Add(MakeFloat(12, -100, 100));
-	EXPECT_STREQ("12", control->Text());
-	control->SetFloatValue(0.5f);
-	EXPECT_STREQ("0.5", control->Text());
-	control->SetFloatValue(1000);
-	EXPECT_STREQ("100", control->Text());
-	control->SetFloatValue(NAN);
-	EXPECT_STREQ("-100", control->Text());
+	fixture.window.Locked([&] {
+		EXPECT_STREQ("12", control->Text());
+		control->SetFloatValue(0.5f);
+		EXPECT_STREQ("0.5", control->Text());
+		control->SetFloatValue(1000);
+		EXPECT_STREQ("100", control->Text());
+		control->SetFloatValue(NAN);
+		EXPECT_STREQ("-100", control->Text());
+	});
 }
 
 
@@ -170,11 +176,13 @@ TEST(FloatControl, LimitsDoNotPassEachOther)
 {
 	Fixture fixture;
 	FloatControl* control = fixture.Add(MakeFloat(50, 10, 100));
-	control->SetMax(NAN);
-	EXPECT_STREQ("10", control->Text());
-	control->SetMax(40);
-	control->SetMin(60);
-	EXPECT_STREQ("40", control->Text());
+	fixture.window.Locked([&] {
+		control->SetMax(NAN);
+		EXPECT_STREQ("10", control->Text());
+		control->SetMax(40);
+		control->SetMin(60);
+		EXPECT_STREQ("40", control->Text());
+	});
 }
 
 

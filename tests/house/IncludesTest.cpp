@@ -128,7 +128,9 @@ bool
 IsAllowed(const std::string& path, const Rule& rule, const Include& include,
 	const std::set<std::string>& platform)
 {
-	if (include.quoted)
+	const bool isOwnHeader =
+		include.name.find('/') == std::string::npos && platform.count(include.name) != 0;
+	if (include.quoted && !(rule.folder == "kits" && isOwnHeader))
 		return StartsWithAny(include.name, rule.project);
 
 	const bool isQt =

@@ -215,12 +215,17 @@ TEST_F(WorkViewTest, TheCornerResizes)
 TEST_F(WorkViewTest, TheResizeZoneEndsAtTwelve)
 {
 	window.driver.Click(plain);
-	window.driver.Drag(plain, FromCorner(plain, 6, 6), plain, FromCorner(plain, -4, -4));
-	EXPECT_EQ(BRect(20, 20, 119, 79), plain->Frame());
-
-	window.driver.Click(plain, BPoint(5, 5));
 	window.driver.Drag(plain, FromCorner(plain, 6, 5), plain, FromCorner(plain, 5, 5));
 	EXPECT_EQ(BRect(20, 20, 120, 79), plain->Frame());
+
+	// One pixel further away the press takes the view along instead.
+	window.driver.Click(button);
+	window.driver.Drag(button, FromCorner(button, 6, 6), root, BPoint(200, 180));
+	BView* moved = root->FindView("button");
+	ASSERT_NE(nullptr, moved);
+	EXPECT_EQ(99, moved->Bounds().Width());
+	EXPECT_EQ(206, moved->Frame().right);
+	EXPECT_EQ(186, moved->Frame().bottom);
 }
 
 
