@@ -348,8 +348,9 @@ BMessage::AddMessage(const char* name, const BMessage* message)
 {
 	if (name == nullptr || message == nullptr)
 		return B_BAD_VALUE;
-	MessageData* owned = _Own();
+	// Shared first, so that a message added to itself is added as it was.
 	MessageData* nested = _Nested(*message);
+	MessageData* owned = _Own();
 	if (owned == nullptr || nested == nullptr) {
 		if (nested != nullptr)
 			nested->Release();

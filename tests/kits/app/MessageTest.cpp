@@ -655,3 +655,19 @@ TEST(Message, RefsComeBackAndBadOnesDoNot)
 	EXPECT_EQ(B_BAD_VALUE, message.FindRef("bad", &found));
 	EXPECT_EQ(nullptr, found.name);
 }
+
+
+TEST(Message, AddedToItselfItIsAddedAsItWas)
+{
+	BMessage message('self');
+	message.AddInt32("number", 5);
+	ASSERT_EQ(B_OK, message.AddMessage("own", &message));
+	ASSERT_EQ(B_OK, message.AddMessage("own", &message));
+	BMessage nested;
+	ASSERT_EQ(B_OK, message.FindMessage("own", 1, &nested));
+	EXPECT_EQ(5, nested.FindInt32("number"));
+	BMessage first;
+	ASSERT_EQ(B_OK, nested.FindMessage("own", &first));
+	EXPECT_FALSE(first.HasMessage("own"));
+	EXPECT_GT(message.FlattenedSize(), 0);
+}
