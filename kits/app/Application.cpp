@@ -18,12 +18,13 @@
 #include <MessageRunner.h>
 #include <Resources.h>
 #include <Roster.h>
+#include <Window.h>
 
 #include "app/private/ApplicationLink.h"
 #include "app/private/CursorPrivate.h"
+#include "app/private/Delivery.h"
 #include "app/private/LooperCore.h"
 #include "app/private/LooperPrivate.h"
-#include "app/private/MessengerPrivate.h"
 #include "app/private/QuitSignals.h"
 #include "server/Desktop.h"
 
@@ -209,8 +210,7 @@ BApplication::_AskWindows()
 			break;
 		asked.push_back(core);
 
-		const BMessenger window =
-			BPrivate::MessengerPrivate::Make(core->PortId(), core->OwnToken(), getpid());
+		const BMessenger window = core->OwnMessenger();
 		BMessage reply;
 		if (window.SendMessage(B_QUIT_REQUESTED, &reply) != B_OK)
 			continue; // it has just gone
@@ -361,7 +361,48 @@ BHandler*
 BApplication::ResolveSpecifier(
 	BMessage* message, int32 index, BMessage* specifier, int32 form, const char* property)
 {
-	return BLooper::ResolveSpecifier(message, index, specifier, form, property);
+	const bool namesWindow = property != nullptr && specifier != nullptr
+		&& strcmp(property, "Window") == 0
+		&& (form == B_INDEX_SPECIFIER || form == B_NAME_SPECIFIER);
+	if (!namesWindow)
+		return BLooper::ResolveSpecifier(message, index, specifier, form, property);
+
+	// The rest of the specifiers is the window's, which answers in its own thread.
+	const BMessenger window = _WindowFor(*specifier, form);
+	if (window.IsValid()) {
+		message->PopSpecifier();
+		BPrivate::forward(*message, window);
+	} else {
+		BMessage reply(B_MESSAGE_NOT_UNDERSTOOD);
+		reply.AddInt32("error", B_BAD_INDEX);
+		reply.AddString("message", "There is no such window");
+		message->SendReply(&reply);
+	}
+	return nullptr;
+}
+
+
+// The window of an index or title; an invalid messenger when there is none.
+BMessenger
+BApplication::_WindowFor(const BMessage& specifier, int32 form) const
+{
+	if (form == B_INDEX_SPECIFIER)
+		return LooperTable::WindowMessenger(specifier.FindInt32("index"));
+
+	const char* title = specifier.FindString("name");
+	for (int32 i = 0; title != nullptr && i < CountWindows(); i++) {
+		const BMessenger candidate = LooperTable::WindowMessenger(i);
+		BLooper* looper = nullptr;
+		if (!candidate.LockTarget())
+			continue;
+		candidate.Target(&looper);
+		auto* window = dynamic_cast<BWindow*>(looper);
+		const bool found = window != nullptr && strcmp(window->Title(), title) == 0;
+		looper->Unlock();
+		if (found)
+			return candidate;
+	}
+	return BMessenger();
 }
 
 

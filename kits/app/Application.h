@@ -73,6 +73,7 @@ private:
 	void _Init(const char* signature, status_t* _error);
 	void _PostArguments();
 	void _HandleArguments(BMessage* message);
+	BMessenger _WindowFor(const BMessage& specifier, int32 form) const;
 	bool _AskWindows();
 	void _EndWindows();
 

@@ -168,6 +168,23 @@ deliver_and_wait(const BMessenger& target, const BMessage& message, bool isReply
 }
 
 
+status_t
+forward(BMessage& message, const BMessenger& target)
+{
+	Delivery& from = Delivery::Of(message);
+	auto copy = std::make_unique<BMessage>(message);
+	MessagePrivate(copy.get()).SetCurrentSpecifier(MessagePrivate(&message).CurrentSpecifier());
+	Delivery& to = Delivery::Of(*copy);
+	to.replyTo = from.replyTo;
+	to.replyRequired = from.replyRequired;
+	to.replyDone = from.replyDone;
+	to.isReply = from.isReply;
+	to.dropped = from.dropped;
+	from.replyDone = from.replyRequired;
+	return deliver(target, std::move(copy), B_INFINITE_TIMEOUT);
+}
+
+
 BMessenger
 reply_address(const BHandler* replyTo)
 {

@@ -42,6 +42,10 @@ status_t deliver(const BMessenger& target, std::unique_ptr<BMessage> message, bi
 status_t deliver_and_wait(const BMessenger& target, const BMessage& message, bool isReply,
 	BMessage* reply, bigtime_t deliveryTimeout, bigtime_t replyTimeout);
 
+// Passes a message that was delivered here on to another target, which answers its sender. The
+// message at hand can no longer be answered if its sender waits.
+status_t forward(BMessage& message, const BMessenger& target);
+
 // The reply address that a NULL handler stands for: the application.
 BMessenger reply_address(const BHandler* replyTo);
 

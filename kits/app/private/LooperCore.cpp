@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <chrono>
+#include <unistd.h>
 #include <unordered_map>
 #include <vector>
 
@@ -9,6 +10,7 @@
 #include <Message.h>
 
 #include "app/private/Delivery.h"
+#include "app/private/MessengerPrivate.h"
 
 namespace BPrivate {
 namespace {
@@ -67,6 +69,13 @@ LooperCore::SetAddress(int32 portId, int32 ownToken)
 {
 	fPortId = portId;
 	fOwnToken = ownToken;
+}
+
+
+BMessenger
+LooperCore::OwnMessenger() const
+{
+	return MessengerPrivate::Make(fPortId, fOwnToken, getpid());
 }
 
 
@@ -538,6 +547,17 @@ LooperTable::WindowAt(int32 index)
 	std::lock_guard lock(table.lock);
 	return index >= 0 && index < int32(table.windows.size()) ? table.windows[index].window
 															 : nullptr;
+}
+
+
+BMessenger
+LooperTable::WindowMessenger(int32 index)
+{
+	Table& table = TheLoopers();
+	std::lock_guard lock(table.lock);
+	if (index < 0 || index >= int32(table.windows.size()))
+		return BMessenger();
+	return table.cores[table.windows[index].looper]->OwnMessenger();
 }
 
 

@@ -10,6 +10,7 @@
 #include <vector>
 
 #include <MessageQueue.h>
+#include <Messenger.h>
 #include <OS.h>
 
 #include "app/private/Port.h"
@@ -71,6 +72,7 @@ public:
 	int32 Capacity() const { return fCapacity; }
 	int32 PortId() const { return fPortId; }
 	int32 OwnToken() const { return fOwnToken; }
+	BMessenger OwnMessenger() const; // to the looper itself
 	void SetAddress(int32 portId, int32 ownToken);
 	void MarkAsWindow() { fIsWindow = true; }
 	bool IsWindow() const { return fIsWindow; }
@@ -131,6 +133,7 @@ public:
 	static void AddWindow(BLooper* looper, BWindow* window);
 	static int32 CountWindows();
 	static BWindow* WindowAt(int32 index);
+	static BMessenger WindowMessenger(int32 index); // invalid when there is none
 	// The first window that is not among those; NULL when there is none.
 	static std::shared_ptr<LooperCore> NextWindow(
 		const std::vector<std::shared_ptr<LooperCore>>& known);

@@ -7,6 +7,7 @@
 
 #include <AppDefs.h>
 #include <Message.h>
+#include <Messenger.h>
 #include <Window.h>
 
 namespace {
@@ -147,4 +148,50 @@ TEST(ApplicationWindows, AWindowOpenedWhileTheyAreAskedIsAskedToo)
 	EXPECT_TRUE(app.QuitRequested());
 
 	EXPECT_EQ(0, living);
+}
+
+
+TEST(ApplicationWindows, AnswerScriptsByTheirIndexAndTitle)
+{
+	class Asker : public BLooper {
+	public:
+		void MessageReceived(BMessage* message) override
+		{
+			for (BMessage& script : scripts) {
+				BMessage reply;
+				be_app_messenger.SendMessage(&script, &reply);
+				answers.push_back(
+					reply.what == B_REPLY ? reply.FindString("result") : "not understood");
+			}
+			be_app_messenger.SendMessage(B_QUIT_REQUESTED);
+		}
+		std::vector<BMessage> scripts;
+		std::vector<std::string> answers;
+	};
+	BApplication app(kSignature);
+	std::atomic<int> living = 0;
+	for (const char* title : { "first", "second" }) {
+		auto* window = new TestWindow(title, &living);
+		window->SetName((std::string("name of ") + title).c_str());
+		window->Show();
+	}
+	auto* asker = new Asker;
+	for (int i = 0; i < 4; i++) {
+		asker->scripts.emplace_back(B_GET_PROPERTY);
+		asker->scripts[i].AddSpecifier("InternalName");
+	}
+	asker->scripts[0].AddSpecifier("Window", int32(1));
+	asker->scripts[1].AddSpecifier("Window", "first");
+	asker->scripts[2].AddSpecifier("Window", int32(2));
+	asker->scripts[3].AddSpecifier("Window", "third");
+	asker->Run();
+	asker->PostMessage('go  ');
+
+	app.Run();
+
+	asker->Lock();
+	EXPECT_EQ((std::vector<std::string> {
+				  "name of second", "name of first", "not understood", "not understood" }),
+		asker->answers);
+	asker->Quit();
 }
