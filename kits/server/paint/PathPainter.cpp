@@ -1,10 +1,12 @@
 #include "server/paint/PathPainter.h"
 
-#include <QImage>
-#include <QPainter>
 #include <QPainterPath>
 #include <QPainterPathStroker>
+#include <QPolygonF>
+#include <QTransform>
 #include <math.h>
+
+#include "server/paint/CoverageRaster.h"
 
 namespace BPrivate {
 
@@ -195,23 +197,25 @@ PathPainter::_FillPath(const QPainterPath& path)
 	const QRectF bounds = path.boundingRect();
 	const clipping_rect rect = { (int32)floor(bounds.left()), (int32)floor(bounds.top()),
 		(int32)ceil(bounds.right()), (int32)ceil(bounds.bottom()) };
-	CoverageMask mask(Intersect(rect, fTask.Output().Bounds()));
-	if (!IsValid(mask.Rect()))
+	const clipping_rect visible = Intersect(rect, fTask.Output().Bounds());
+	if (!IsValid(visible))
 		return;
 
-	// Rows of an image that QPainter uses begin at multiples of four bytes.
-	const int32 bytesPerRow = (mask.Width() + 3) & ~3;
-	static thread_local std::vector<uint8> sCoverage;
-	sCoverage.assign((size_t)bytesPerRow * mask.Height(), 0);
-	QImage image(sCoverage.data(), mask.Width(), mask.Height(), bytesPerRow, QImage::Format_Alpha8);
-	{
-		QPainter painter(&image);
-		painter.setRenderHint(QPainter::Antialiasing);
-		painter.translate(-mask.Rect().left, -mask.Rect().top);
-		painter.fillPath(path, Qt::black);
+	// Curves become lines that miss them by less than an eighth of what Qt allows for
+	// whole pixels.
+	constexpr double kFineness = 8;
+	CoverageRaster raster(visible);
+	for (const QPolygonF& polygon :
+		path.toSubpathPolygons(QTransform::fromScale(kFineness, kFineness))) {
+		for (qsizetype i = 0; i < polygon.size(); i++) {
+			const QPointF from = polygon[i] / kFineness;
+			const QPointF to = polygon[i + 1 < polygon.size() ? i + 1 : 0] / kFineness;
+			raster.AddLine(from.x(), from.y(), to.x(), to.y());
+		}
 	}
-	fTask.Output().FillMask(mask.Rect(), sCoverage.data(), bytesPerRow);
-	fTask.AddDamage(mask.Rect());
+	fTask.Output().FillMask(visible, raster.Finish(path.fillRule() == Qt::OddEvenFill),
+		visible.right - visible.left + 1);
+	fTask.AddDamage(visible);
 }
 
 
