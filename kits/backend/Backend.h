@@ -12,6 +12,7 @@
 #include <Region.h>
 
 #include "backend/BackendEvent.h"
+#include "server/ScreenPicture.h"
 
 namespace BPrivate {
 
@@ -69,13 +70,6 @@ public:
 struct DataOffer {
 	std::vector<std::string> types;
 	std::function<bool(const std::string& type, std::string* _data)> get;
-};
-
-
-// Bits of a picture of the screen: 32-bit BGRA rows without gaps.
-struct ScreenPicture {
-	int32 width = 0, height = 0; // device pixels
-	std::vector<uint8> bits;
 };
 
 

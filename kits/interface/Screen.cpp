@@ -2,9 +2,10 @@
 
 #include <memory>
 
+#include "server/Desktop.h"
+#include "server/ScreenPicture.h"
 #include <Bitmap.h>
 #include <Window.h>
-#include "server/Desktop.h"
 
 using namespace BPrivate;
 

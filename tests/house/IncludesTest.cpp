@@ -48,11 +48,11 @@ const std::vector<Rule> kRules = {
 		true },
 	{ "kits/backend",
 		{ "kernel/private/", "support/private/", "backend/", "server/FrontImage.h",
-			"server/CursorShape.h", "server/paint/" },
+			"server/CursorShape.h", "server/ScreenPicture.h", "server/paint/" },
 		true, true, false },
 	{ "kits/backend/qt",
 		{ "kernel/private/", "support/private/", "backend/", "server/FrontImage.h",
-			"server/CursorShape.h", "server/paint/" },
+			"server/CursorShape.h", "server/ScreenPicture.h", "server/paint/" },
 		true, true, true },
 };
 
