@@ -153,7 +153,7 @@ TEST(TabView, ATabsLabelIsTheNameOfItsPage)
 {
 	BApplication app("application/x-vnd.Archway-test");
 	BTabView view(BRect(0, 0, 299, 199), "tabs");
-	BTab* tab = new BTab(NULL);
+	BTab* tab = new BTab;
 	tab->SetLabel("ignored");
 	view.AddTab(NewPage(NULL), tab);
 	EXPECT_STREQ("", tab->Label());
