@@ -229,8 +229,7 @@ BSlider::DrawBar()
 		bar.right = place;
 	else
 		bar.top = place;
-	if (bar.Width() >= 4 && bar.Height() >= 4)
-		Look::DrawSliderBar(this, bar, base, fFillColor, _LookState());
+	Look::DrawSliderFill(this, bar, base, fFillColor, _LookState());
 }
 
 

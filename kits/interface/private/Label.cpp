@@ -35,7 +35,7 @@ centered_baseline(const LabelMetrics& metrics, float top, float bottom)
 {
 	// Capitals are about seven tenths of the font's size high.
 	const float capHeight = std::round(metrics.size * 0.7f);
-	return std::floor((top + bottom + capHeight) / 2);
+	return std::ceil((top + bottom + capHeight) / 2);
 }
 
 

@@ -518,6 +518,19 @@ DrawSliderBar(BView* view, BRect frame, rgb_color base, rgb_color barColor, uint
 
 
 void
+DrawSliderFill(BView* view, BRect part, rgb_color base, rgb_color fillColor, uint32 state)
+{
+	PlainPen pen(view);
+	fillColor.alpha = 255;
+	const rgb_color color = (state & kDisabled) != 0 ? Blend(fillColor, base) : fillColor;
+	part.InsetBy(1, 1);
+	Fill(view, part, color);
+	if (part.IsValid())
+		DrawLeftTop(view, part, tint_color(color, B_DARKEN_2_TINT));
+}
+
+
+void
 DrawSliderBlockThumb(BView* view, BRect frame, orientation direction, rgb_color base, uint32 state)
 {
 	PlainPen pen(view);

@@ -81,6 +81,8 @@ void DrawProgressBar(BView* view, BRect frame, rgb_color base, rgb_color barColo
 
 // The channel of a slider, one part of it, in the given colour.
 void DrawSliderBar(BView* view, BRect frame, rgb_color base, rgb_color barColor, uint32 state);
+// The inside of a part of the bar in another colour; `part` is cut out of the bar's frame.
+void DrawSliderFill(BView* view, BRect part, rgb_color base, rgb_color fillColor, uint32 state);
 void DrawSliderBlockThumb(
 	BView* view, BRect frame, orientation direction, rgb_color base, uint32 state);
 // Points up or left.
