@@ -20,22 +20,6 @@ NewAlert(button_width width = B_WIDTH_AS_USUAL, button_spacing spacing = B_EVEN_
 }
 
 
-// Runs Go() in a thread that has no window, as an application's main thread may.
-class Runner {
-public:
-	explicit Runner(BAlert* alert) : fThread([this, alert] { fResult = alert->Go(); }) {}
-	int32 Result()
-	{
-		fThread.join();
-		return fResult;
-	}
-
-private:
-	std::atomic<int32> fResult { -2 };
-	std::thread fThread;
-};
-
-
 // Waits until the alert's window is shown, which another thread does.
 void
 WaitUntilShown(BAlert* alert)
@@ -51,6 +35,37 @@ WaitUntilShown(BAlert* alert)
 	}
 	Driver::WaitUntilIdle();
 }
+
+
+// Makes an alert and runs it in a thread that has no window, as an application's main thread may.
+class Runner {
+public:
+	explicit Runner(char escapeOfFirst = 0) :
+		fThread([this, escapeOfFirst] {
+			BAlert* alert = NewAlert();
+			alert->SetShortcut(0, escapeOfFirst);
+			fAlert = alert;
+			fResult = alert->Go();
+		})
+	{
+		while (fAlert == nullptr)
+			std::this_thread::yield();
+		WaitUntilShown(fAlert);
+	}
+
+	BAlert* Alert() const { return fAlert; }
+
+	int32 Result()
+	{
+		fThread.join();
+		return fResult;
+	}
+
+private:
+	std::atomic<BAlert*> fAlert { nullptr };
+	std::atomic<int32> fResult { -2 };
+	std::thread fThread;
+};
 
 } // namespace
 
@@ -117,11 +132,8 @@ TEST(Alert, GoAnswersThePressedButton)
 {
 	BApplication app("application/x-vnd.Archway-test");
 	Driver driver;
-	BAlert* alert = NewAlert();
-	BButton* button = alert->ButtonAt(1);
-	Runner runner(alert);
-	WaitUntilShown(alert);
-	driver.Click(button);
+	Runner runner;
+	driver.Click(runner.Alert()->ButtonAt(1));
 	EXPECT_EQ(1, runner.Result());
 }
 
@@ -130,9 +142,7 @@ TEST(Alert, EnterPressesTheDefaultButton)
 {
 	BApplication app("application/x-vnd.Archway-test");
 	Driver driver;
-	BAlert* alert = NewAlert();
-	Runner runner(alert);
-	WaitUntilShown(alert);
+	Runner runner;
 	driver.Type("\n");
 	EXPECT_EQ(2, runner.Result());
 }
@@ -142,11 +152,8 @@ TEST(Alert, AShortcutPressesItsButton)
 {
 	BApplication app("application/x-vnd.Archway-test");
 	Driver driver;
-	BAlert* alert = NewAlert();
-	alert->SetShortcut(0, B_ESCAPE);
-	EXPECT_EQ(B_ESCAPE, alert->Shortcut(0));
-	Runner runner(alert);
-	WaitUntilShown(alert);
+	Runner runner(B_ESCAPE);
+	EXPECT_EQ(B_ESCAPE, runner.Alert()->Shortcut(0));
 	driver.Key("Escape");
 	EXPECT_EQ(0, runner.Result());
 }
@@ -155,10 +162,8 @@ TEST(Alert, AShortcutPressesItsButton)
 TEST(Alert, GoAnswersMinusOneWhenItIsAskedToQuit)
 {
 	BApplication app("application/x-vnd.Archway-test");
-	BAlert* alert = NewAlert();
-	Runner runner(alert);
-	WaitUntilShown(alert);
-	alert->PostMessage(B_QUIT_REQUESTED);
+	Runner runner;
+	runner.Alert()->PostMessage(B_QUIT_REQUESTED);
 	EXPECT_EQ(-1, runner.Result());
 }
 

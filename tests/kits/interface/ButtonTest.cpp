@@ -9,6 +9,7 @@
 namespace {
 
 constexpr uint32 kInvoked = 'invk';
+const rgb_color kFace = { 240, 240, 240, 255 };
 
 BButton*
 NewButton(BRect frame = BRect(20, 20, 119, 44), const char* label = "Press")
@@ -196,12 +197,12 @@ TEST(Button, ShowsThatItIsPressed)
 	ControlFixture fixture;
 	BButton* button = fixture.Add(NewButton());
 	const BPoint corner(6, 6);
-	EXPECT_EQ((rgb_color { 239, 239, 239, 255 }), fixture.driver.PixelAt(button, corner));
+	EXPECT_EQ(kFace, fixture.driver.PixelAt(button, corner));
 	fixture.driver.MoveTo(button);
 	fixture.driver.Press();
 	EXPECT_EQ((rgb_color { 0, 0, 0, 255 }), fixture.driver.PixelAt(button, corner));
 	fixture.driver.Release();
-	EXPECT_EQ((rgb_color { 239, 239, 239, 255 }), fixture.driver.PixelAt(button, corner));
+	EXPECT_EQ(kFace, fixture.driver.PixelAt(button, corner));
 }
 
 
