@@ -2,6 +2,7 @@
 #include <TabView.h>
 
 #include <cmath>
+#include <typeinfo>
 
 #include <Message.h>
 #include <String.h>
@@ -72,6 +73,8 @@ BTab::Archive(BMessage* archive, bool deep) const
 		return status;
 
 	BPrivate::ArchiveWriter writer(archive);
+	// A tab of a class that is not available is a plain one but stays what it was.
+	writer.KeepClass(typeid(*this) == typeid(BTab));
 	if (!writer.Keep("_disable", writer.Source().HasBool("_disable") == !fEnabled) && !fEnabled)
 		archive->AddBool("_disable", true);
 	return writer.Status();

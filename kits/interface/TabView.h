@@ -133,10 +133,13 @@ private:
 	BTabView(const BTabView&) = delete;
 	BTabView& operator=(const BTabView&) = delete;
 
+	// Where an archive has the pages.
+	enum class PagePlace { kList, kBesideContainer, kInContainer };
+
 	void _InitContainer();
 	void _ReadTabs(BMessage* archive);
-	BView* _TakeOldPage();
-	status_t _EmptyContainer(BMessage* archive) const;
+	status_t _ArchiveTabs(BMessage* archive, const BMessage& source) const;
+	void _RestoreContainer(BMessage* container, const BMessage& source) const;
 	void _Show(int32 index);
 	int32 _TabAt(BPoint where) const;
 	float _LabelWidth(int32 index) const;
@@ -148,4 +151,5 @@ private:
 	float fTabHeight;
 	int32 fSelection; // -1: none
 	int32 fFocus; // -1: no tab has the focus mark
+	PagePlace fPagePlace;
 };
