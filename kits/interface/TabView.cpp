@@ -195,7 +195,7 @@ BTabView::_ReadTabs(BMessage* archive)
 status_t
 BTabView::Archive(BMessage* archive, bool deep) const
 {
-	BPrivate::ArchiveScope scope(archive);
+	BPrivate::ArchiveScope scope(this, archive);
 	status_t status = BView::Archive(archive, deep);
 	if (status != B_OK)
 		return status;
@@ -224,7 +224,7 @@ BTabView::_ArchiveTabs(BMessage* archive, const BMessage& source) const
 		if (status == B_OK)
 			status = archive->AddMessage("_l_items", &tab);
 		if (status == B_OK && fTabs[i]->View() != NULL)
-			status = fTabs[i]->View()->Archive(&pages[i], true);
+			status = BPrivate::archive_as_child(fTabs[i]->View(), &pages[i]);
 		if (status == B_OK && fPagePlace == PagePlace::kList)
 			status = archive->AddMessage("_view_list", &pages[i]);
 	}

@@ -178,10 +178,48 @@ same_message(const BMessage& a, const BMessage& b)
 		&& (MessagePrivate(&a).SharesDataWith(b) || a.HasSameData(b, false, true));
 }
 
+
+
+// The last step of the outermost view. A child of a managed archive that is archived by itself is
+// nested like any other.
+status_t
+finish_archive(BMessage* archive)
+{
+	if (!is_managed_root(*archive)) {
+		clear_managed_note(archive);
+		return B_OK;
+	}
+	return manage_archive(archive);
+}
+
 } // namespace
 
 
 namespace BPrivate {
+
+
+ArchiveScope::ArchiveScope(const BView* view, BMessage* archive) :
+	fArchive(archive), fIsRoot(sArchivedAsChild != view)
+{
+	sArchivedAsChild = view;
+}
+
+
+status_t
+ArchiveScope::Finish()
+{
+	return fIsRoot ? finish_archive(fArchive) : B_OK;
+}
+
+
+status_t
+archive_as_child(const BView* view, BMessage* archive)
+{
+	sArchivedAsChild = view;
+	const status_t status = view->Archive(archive, true);
+	sArchivedAsChild = nullptr;
+	return status;
+}
 
 
 void
@@ -290,14 +328,7 @@ BView::Archive(BMessage* archive, bool deep) const
 	if (status != B_OK)
 		return status;
 
-	// A child of a managed archive that is archived by itself is nested like any other.
-	if (!isRoot)
-		return B_OK;
-	if (!is_managed_root(*archive)) {
-		clear_managed_note(archive);
-		return B_OK;
-	}
-	return manage_archive(archive);
+	return isRoot ? finish_archive(archive) : B_OK;
 }
 
 

@@ -76,6 +76,26 @@ _EXPORT void force_resizing_mode(BView* view, uint32 mode);
 _EXPORT void begin_archive(const ArchiveSource* source, BMessage* archive);
 
 
+// For a view's Archive() that writes views into fields of its own: made before the base class's
+// Archive() is called, it keeps that from taking the last step, which is Finish().
+class _EXPORT ArchiveScope {
+public:
+	ArchiveScope(const BView* view, BMessage* archive);
+	ArchiveScope(const ArchiveScope&) = delete;
+	ArchiveScope& operator=(const ArchiveScope&) = delete;
+
+	// Gives a tree that was read from the managed form that form again.
+	status_t Finish();
+
+private:
+	BMessage* fArchive; // borrowed
+	bool fIsRoot;
+};
+
+// Archives a view as a part of the view that is being archived, always deep.
+_EXPORT status_t archive_as_child(const BView* view, BMessage* archive);
+
+
 // Writes fields into an archive that begin_archive() was called for, or into one of a new object.
 class _EXPORT ArchiveWriter {
 public:

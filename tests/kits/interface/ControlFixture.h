@@ -150,9 +150,8 @@ Revive(BMessage archive)
 // What was read comes out again: unchanged, and after having been in a shown window.
 template<class View>
 void
-ExpectRoundTrip(ControlFixture& fixture, const View& view)
+ExpectArchiveRoundTrip(ControlFixture& fixture, const BMessage& archive)
 {
-	const BMessage archive = ArchiveOf(view);
 	std::unique_ptr<View> revived = Revive<View>(archive);
 	ASSERT_NE(nullptr, revived);
 	EXPECT_TRUE(archive.HasSameData(ArchiveOf(*revived), false, true));
@@ -162,6 +161,14 @@ ExpectRoundTrip(ControlFixture& fixture, const View& view)
 		revived->RemoveSelf();
 		EXPECT_TRUE(archive.HasSameData(ArchiveOf(*revived), false, true));
 	});
+}
+
+
+template<class View>
+void
+ExpectRoundTrip(ControlFixture& fixture, const View& view)
+{
+	ExpectArchiveRoundTrip<View>(fixture, ArchiveOf(view));
 }
 
 

@@ -255,10 +255,9 @@ TEST(TabView, RevivesWhatItWrote)
 	BMessage container;
 	ASSERT_EQ(B_OK, archive.FindMessage("_views", &container));
 	EXPECT_FALSE(container.HasMessage("_views"));
-	fixture.Locked([&] {
-		EXPECT_EQ(model->ContainerView(), model->ViewForTab(1)->Parent());
-		ExpectRoundTrip(fixture, *model);
-	});
+	fixture.Locked(
+		[&] { EXPECT_EQ(model->ContainerView(), model->ViewForTab(1)->Parent()); });
+	ExpectArchiveRoundTrip<BTabView>(fixture, archive);
 
 	std::unique_ptr<BTabView> revived = Revive<BTabView>(archive);
 	EXPECT_EQ("First Second Third", Labels(revived.get()));
@@ -297,4 +296,49 @@ TEST(TabView, TakesThePagesOfAnArchiveWithoutAList)
 	}
 	std::unique_ptr<BTabView> revived = Revive<BTabView>(archive);
 	EXPECT_EQ("First Second", Labels(revived.get()));
+	EXPECT_TRUE(archive.HasSameData(ArchiveOf(*revived), false, true));
+}
+
+
+TEST(TabView, TakesThePagesThatAnArchiveHasInTheContainer)
+{
+	BApplication app("application/x-vnd.Archway-test");
+	std::unique_ptr<BTabView> model(NewTabView(2));
+	BMessage archive = ArchiveOf(*model);
+	archive.RemoveName("_view_list");
+	BMessage container;
+	ASSERT_EQ(B_OK, archive.FindMessage("_views", &container));
+	for (int32 i = 0; i < 2; i++) {
+		const BMessage page = ArchiveOf(*model->ViewForTab(i));
+		container.AddMessage("_views", &page);
+	}
+	archive.ReplaceMessage("_views", &container);
+	archive.ReplaceInt32("_sel", 1);
+
+	std::unique_ptr<BTabView> revived = Revive<BTabView>(archive);
+	EXPECT_EQ("First Second", Labels(revived.get()));
+	EXPECT_EQ(revived->ContainerView(), revived->ViewForTab(1)->Parent());
+	EXPECT_TRUE(archive.HasSameData(ArchiveOf(*revived), false, true));
+}
+
+
+TEST(TabView, APageOfAnUnknownClassStaysWhatItIs)
+{
+	BApplication app("application/x-vnd.Archway-test");
+	std::unique_ptr<BTabView> model(NewTabView(2));
+	BMessage archive = ArchiveOf(*model);
+	BMessage page;
+	ASSERT_EQ(B_OK, archive.FindMessage("_view_list", 1, &page));
+	page.ReplaceString("class", "ThisClassDoesNotExist");
+	page.AddInt32("itsField", 17);
+	archive.ReplaceMessage("_view_list", 1, &page);
+	BMessage tab;
+	ASSERT_EQ(B_OK, archive.FindMessage("_l_items", 0, &tab));
+	tab.ReplaceString("class", "NoTabThatIsKnown");
+	archive.ReplaceMessage("_l_items", 0, &tab);
+
+	std::unique_ptr<BTabView> revived = Revive<BTabView>(archive);
+	ASSERT_EQ(2, revived->CountTabs());
+	EXPECT_STREQ("Second", revived->TabAt(1)->Label());
+	EXPECT_TRUE(archive.HasSameData(ArchiveOf(*revived), false, true));
 }
