@@ -151,5 +151,5 @@ private:
 	float fTabHeight;
 	int32 fSelection; // -1: none
 	int32 fFocus; // -1: no tab has the focus mark
-	PagePlace fPagePlace;
+	PagePlace fPagePlace = PagePlace::kList;
 };

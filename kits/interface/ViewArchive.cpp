@@ -179,7 +179,6 @@ same_message(const BMessage& a, const BMessage& b)
 }
 
 
-
 // The last step of the outermost view. A child of a managed archive that is archived by itself is
 // nested like any other.
 status_t
@@ -319,7 +318,9 @@ BView::Archive(BMessage* archive, bool deep) const
 		return status;
 	ArchiveWriter writer(archive);
 	writer.KeepClass(dynamic_cast<const StandInView*>(this) != nullptr);
-	writer.String("_name", Name(), nullptr);
+	// BHandler has written the name; that of an archive may have to stay as it was read.
+	if (fSource != nullptr)
+		writer.String("_name", Name(), nullptr);
 	status = writer.Status();
 	if (status == B_OK)
 		status = _ArchiveOwnFields(archive);
