@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <atomic>
 #include <cmath>
+#include <mutex>
 
 #include <Button.h>
 #include <Invoker.h>
@@ -45,13 +46,49 @@ constexpr bigtime_t kRedrawInterval = 50000;
 } // namespace
 
 
-// Outlives the alert, for the thread that waits for its end.
+// Outlives the alert, for the thread that waits for its end. That thread's looper, if it has one,
+// counts as idle while it waits, and as busy again from the moment on that the alert is answered.
 struct BAlert::Wait {
-	Wait() : done(create_sem(0, "alert")) {}
+	explicit Wait(BPrivate::Worker* worker) : done(create_sem(0, "alert")), worker(worker) {}
 	~Wait() { delete_sem(done); }
 
-	sem_id done;
+	// Whether the alert has ended; false when the time is over.
+	bool WaitForEnd(bigtime_t timeout)
+	{
+		_SetWaiting(true);
+		const status_t status = acquire_sem_etc(done, 1, B_RELATIVE_TIMEOUT, timeout);
+		_SetWaiting(false);
+		return status == B_OK || status == B_BAD_SEM_ID;
+	}
+
+	void End()
+	{
+		ended = true;
+		_SetWaiting(false);
+		release_sem(done);
+	}
+
 	std::atomic<int32> result { -1 };
+
+private:
+	void _SetWaiting(bool wait)
+	{
+		const std::lock_guard<std::mutex> guard(lock);
+		wait = wait && !ended;
+		if (worker == NULL || wait == waiting)
+			return;
+		waiting = wait;
+		if (wait)
+			worker->BeginWaiting();
+		else
+			worker->EndWaiting();
+	}
+
+	sem_id done;
+	BPrivate::Worker* worker; // borrowed; NULL for a thread without a looper
+	std::mutex lock; // for what follows
+	bool waiting = false;
+	std::atomic<bool> ended { false };
 };
 
 
@@ -262,26 +299,16 @@ BAlert::Go()
 {
 	// The alert may end by itself, as when the application quits, so that only what is held here
 	// is touched after it was shown.
-	const std::shared_ptr<Wait> wait = std::make_shared<Wait>();
+	BLooper* looper = BLooper::LooperForThread(find_thread(NULL));
+	BWindow* caller = dynamic_cast<BWindow*>(looper);
+	const std::shared_ptr<Wait> wait =
+		std::make_shared<Wait>(looper != NULL ? &BPrivate::LooperPrivate(looper).Activity() : NULL);
 	const BMessenger self(this);
 	fWait = wait;
 
-	BLooper* looper = BLooper::LooperForThread(find_thread(NULL));
-	BWindow* caller = dynamic_cast<BWindow*>(looper);
-	BPrivate::Worker* worker = looper != NULL ? &BPrivate::LooperPrivate(looper).Activity() : NULL;
 	MoveTo(AlertPosition(Frame().Width(), Frame().Height()));
 	Show();
-
-	for (;;) {
-		status_t status;
-		{
-			BPrivate::WaitingScope waiting(worker);
-			status = caller != NULL
-				? acquire_sem_etc(wait->done, 1, B_RELATIVE_TIMEOUT, kRedrawInterval)
-				: acquire_sem(wait->done);
-		}
-		if (status == B_OK || status == B_BAD_SEM_ID)
-			break;
+	while (!wait->WaitForEnd(caller != NULL ? kRedrawInterval : B_INFINITE_TIMEOUT)) {
 		if (caller != NULL)
 			caller->UpdateIfNeeded();
 	}
@@ -318,7 +345,7 @@ BAlert::_Answer(int32 which)
 {
 	if (fWait != NULL) {
 		fWait->result = which;
-		release_sem(fWait->done);
+		fWait->End();
 		return;
 	}
 	if (fInvoker != NULL && fInvoker->Message() != NULL) {
@@ -336,7 +363,7 @@ BAlert::QuitRequested()
 	if (fWait == NULL)
 		return true;
 	// The waiting thread ends the alert.
-	release_sem(fWait->done);
+	fWait->End();
 	return false;
 }
 
@@ -345,7 +372,7 @@ void
 BAlert::Quit()
 {
 	if (fWait != NULL)
-		release_sem(fWait->done);
+		fWait->End();
 	BWindow::Quit();
 }
 
