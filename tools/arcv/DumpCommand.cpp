@@ -17,6 +17,7 @@ namespace Arcv {
 namespace {
 
 constexpr size_t kHexLine = 32; // bytes
+constexpr int32 kDeepestIndent = 40; // levels
 
 struct DumpOptions {
 	std::string file;
@@ -27,7 +28,7 @@ struct DumpOptions {
 std::string
 Indent(int32 depth)
 {
-	return std::string(2 * depth, ' ');
+	return std::string(2 * std::min<int32>(depth, kDeepestIndent), ' ');
 }
 
 
@@ -124,7 +125,7 @@ WriteItem(JsonWriter& json, Input& input, const Item& item)
 int
 WriteJson(Input& input)
 {
-	JsonWriter json;
+	JsonWriter json(Print);
 	int status = kFine;
 	if (input.IsMessage())
 		WriteMessage(json, input.Message());
@@ -137,7 +138,7 @@ WriteJson(Input& input)
 		json.CloseArray();
 		json.CloseObject();
 	}
-	Print(json.Finish());
+	json.Finish();
 	return status;
 }
 

@@ -5,6 +5,7 @@
 #include <stdlib.h>
 #include <string.h>
 
+#include <algorithm>
 #include <charconv>
 
 #include "tools/arcv/TypeCode.h"
@@ -12,6 +13,10 @@
 namespace Arcv {
 
 namespace {
+
+constexpr size_t kPieceSize = 64 * 1024;
+constexpr size_t kDeepestIndent = 40;
+
 
 template<typename Number>
 std::string
@@ -134,6 +139,10 @@ std::string
 JsonWriter::Finish()
 {
 	fText += '\n';
+	if (fSink != nullptr) {
+		fSink(fText);
+		fText.clear();
+	}
 	return std::move(fText);
 }
 
@@ -154,7 +163,7 @@ JsonWriter::_Close(char bracket)
 	const Level level = fLevels.back();
 	fLevels.pop_back();
 	if (!level.row && !level.empty)
-		fText += "\n" + std::string(2 * fLevels.size(), ' ');
+		_NewLine();
 	fText += bracket;
 }
 
@@ -181,7 +190,20 @@ JsonWriter::_Separate()
 		fText += level.row ? ", " : ",";
 	level.empty = false;
 	if (!level.row)
-		fText += "\n" + std::string(2 * fLevels.size(), ' ');
+		_NewLine();
+}
+
+
+// Deep levels are indented alike: nobody could tell them apart, and the text would be mostly blanks.
+void
+JsonWriter::_NewLine()
+{
+	if (fSink != nullptr && fText.size() >= kPieceSize) {
+		fSink(fText);
+		fText.clear();
+	}
+	fText += '\n';
+	fText.append(2 * std::min(fLevels.size(), kDeepestIndent), ' ');
 }
 
 } // namespace Arcv

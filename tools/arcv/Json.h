@@ -10,6 +10,11 @@ namespace Arcv {
 // Objects and arrays are indented, one member a line; what is opened as a row stays on its line.
 class JsonWriter {
 public:
+	// What is written goes to the sink in large pieces, so that memory does not hold all of it;
+	// without one, Finish() returns the whole.
+	using Sink = void (*)(std::string_view text);
+	explicit JsonWriter(Sink sink = nullptr) : fSink(sink) {}
+
 	void OpenObject(bool row = false) { _Open('{', row); }
 	void CloseObject() { _Close('}'); }
 	void OpenArray(bool row = false) { _Open('[', row); }
@@ -32,7 +37,7 @@ public:
 	// A value that is JSON already.
 	void Verbatim(std::string_view json) { _Value(json); }
 
-	// Ends the line. The writer is empty afterwards.
+	// Ends the line, and returns what no sink got. The writer is empty afterwards.
 	std::string Finish();
 
 private:
@@ -46,6 +51,9 @@ private:
 	void _Value(std::string_view text);
 	void _Separate();
 
+	void _NewLine();
+
+	const Sink fSink;
 	std::string fText;
 	std::vector<Level> fLevels;
 	bool fNamed = false; // a name waits for its value
