@@ -16,9 +16,7 @@
 #include "interface/private/OffscreenWindow.h"
 #include "interface/private/ViewInspector.h"
 #include "interface/private/ViewPrivate.h"
-#include "interface/private/WindowInspector.h"
 #include "interface/private/WindowInternals.h"
-#include "server/Desktop.h"
 
 using namespace BPrivate;
 
@@ -125,8 +123,6 @@ BWindow::_Init(BRect frame, const char* title, window_look look, window_feel fee
 	WindowList::Add(this, fInternals->server->Id());
 	WindowList::SetTitle(this, fInternals->title.c_str());
 	WindowList::SetFrame(this, frame);
-	WindowInspector::Get().Add(fInternals->server->Id(), this);
-	Desktop::Get()->SetInspector(&WindowInspector::Get());
 }
 
 

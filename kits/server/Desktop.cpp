@@ -9,7 +9,6 @@
 #include "server/ClipboardBridge.h"
 #include "server/DesktopThread.h"
 #include "server/DragSession.h"
-#include "server/Inspector.h"
 #include "server/ServerWindow.h"
 #include "server/input/PointerInput.h"
 #include "server/input/WindowPolicy.h"
@@ -284,27 +283,6 @@ Desktop::OpenFile(const char* path)
 	auto message = std::make_unique<BMessage>(B_REFS_RECEIVED);
 	message->AddRef("refs", &ref);
 	fThread->PostToApplication(std::move(message));
-}
-
-
-std::vector<WindowNode>
-Desktop::ListWindows()
-{
-	std::vector<WindowNode> nodes;
-	RunOnDisplay([&] {
-		for (const WindowReference& window : fThread->Windows()) {
-			const WindowRecord::Properties properties = window->GetProperties();
-			WindowNode node;
-			node.id = window->Id();
-			node.title = properties.title;
-			node.frame = properties.frame;
-			node.shown = window->nativeShown;
-			node.active = window->active;
-			node.isMenu = window->IsMenu();
-			nodes.push_back(std::move(node));
-		}
-	});
-	return nodes;
 }
 
 

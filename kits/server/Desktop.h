@@ -4,11 +4,12 @@
 #include <functional>
 #include <memory>
 #include <string>
-#include <vector>
 
 #include <Message.h>
 #include <Point.h>
 #include <Rect.h>
+
+#include "server/ScreenPicture.h"
 
 namespace BPrivate {
 
@@ -19,8 +20,6 @@ class ServerWindow;
 class Worker;
 struct BackendEvent;
 struct CursorShape;
-struct ScreenPicture;
-struct WindowNode;
 
 
 constexpr uint32 kClipboardChanged = 'CLCH';
@@ -98,8 +97,6 @@ public:
 	ScreenPicture Picture(BRect screen);
 	status_t SavePicture(const char* path, BRect screen); // PNG
 	void OpenFile(const char* path); // what the desktop does when a file is opened
-	// What the desktop knows of them, in the order of their making; the rest is left empty.
-	std::vector<WindowNode> ListWindows();
 	// Borrowed; NULL before it goes, which waits until nobody is using it.
 	void SetInspector(Inspector* inspector);
 	std::string BackendName() const;
