@@ -30,13 +30,6 @@ namespace {
 constexpr bigtime_t kPollPause = 10000;
 
 
-bool
-is_pointer_message(const BMessage& message)
-{
-	return message.what == B_MOUSE_MOVED || message.what == B_MOUSE_UP;
-}
-
-
 // The bitmap's pixels, opaque unless the drag's mode looks at transparency.
 std::vector<uint32>
 drag_pixels(const Surface& image, drawing_mode mode)
@@ -112,23 +105,19 @@ BView::GetMouse(BPoint* location, uint32* buttons, bool checkMessageQueue)
 		return;
 	}
 
-	LooperPrivate looper(fOwner);
-	std::unique_ptr<BMessage> message;
-	if (checkMessageQueue)
-		message.reset(looper.TakeMessage(is_pointer_message));
-	if (message != nullptr) {
-		screen = message->FindPoint("screen_where");
-		held = message->what == B_MOUSE_UP ? 0 : message->FindInt32("buttons");
-		WindowInternals::Of(fOwner).NoteConsumedPointer(*message);
-	} else {
-		static thread_local uint32 sSeen = 0;
-		const uint32 serial = desktop->PointerSerial();
-		if (checkMessageQueue && serial == sSeen) {
-			WaitingScope waiting(&looper.Activity());
+	WindowInternals& internals = WindowInternals::Of(fOwner);
+	Worker& activity = LooperPrivate(fOwner).Activity();
+	const int32 knownWork = activity.CountWork();
+	const uint32 serial = desktop->PointerSerial();
+	if (!checkMessageQueue)
+		desktop->GetMouse(&screen, &held);
+	else if (!internals.TakePointer(&screen, &held)) {
+		{
+			WaitingScope waiting(&activity, knownWork);
 			desktop->WaitForPointer(serial, kPollPause);
 		}
-		sSeen = desktop->PointerSerial();
-		desktop->GetMouse(&screen, &held);
+		if (!internals.TakePointer(&screen, &held))
+			internals.GetPointer(&screen, &held);
 	}
 	if (location != nullptr)
 		*location = ConvertFromScreen(screen);

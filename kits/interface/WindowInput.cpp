@@ -13,6 +13,7 @@
 #include "interface/private/ViewPrivate.h"
 #include "interface/private/ViewState.h"
 #include "interface/private/WindowInternals.h"
+#include "server/Desktop.h"
 
 using namespace BPrivate;
 
@@ -122,6 +123,7 @@ WindowInternals::_RoutePress(BMessage* message)
 {
 	const std::unique_ptr<BMessage> event(message);
 	server->BeginInput(*event);
+	_NotePointer(*event);
 	const bool elsewhere = event->GetBool(kPointerElsewhere, false);
 	const bool isDown = event->what == B_MOUSE_DOWN;
 	pointerTarget = elsewhere ? nullptr : owner_of(tree.ViewAt(event->FindPoint("where")));
@@ -154,6 +156,7 @@ WindowInternals::_RouteMove(BMessage* message)
 		return;
 	if (server != nullptr)
 		server->BeginInput(*event);
+	_NotePointer(*event);
 
 	const bool changed = view != mouseView;
 	leftView = changed ? mouseView : nullptr;
@@ -259,13 +262,47 @@ WindowInternals::_RouteWheel(BMessage* message)
 }
 
 
-// What GetMouse() has taken out of the queue never reaches a hook, but what follows from it does.
-void
-WindowInternals::NoteConsumedPointer(const BMessage& message)
+// #pragma mark - polling
+
+
+bool
+WindowInternals::TakePointer(BPoint* _screen, uint32* _buttons)
 {
-	server->BeginInput(message);
-	if (message.what == B_MOUSE_UP)
+	const std::unique_ptr<BMessage> message(
+		LooperPrivate(&window).TakeMessage([](const BMessage& message) {
+			return message.what == B_MOUSE_MOVED || message.what == B_MOUSE_UP;
+		}));
+	if (message == nullptr)
+		return false;
+	server->BeginInput(*message);
+	_NotePointer(*message);
+	if (message->what == B_MOUSE_UP)
 		_EndPress();
+	*_screen = lastScreen;
+	*_buttons = lastButtons;
+	return true;
+}
+
+
+// During a press everything comes as a message, so the last one tells, and what the desktop knows
+// already comes in its turn. Without one for a while there is none, as after a drag.
+void
+WindowInternals::GetPointer(BPoint* _screen, uint32* _buttons) const
+{
+	Desktop::Get()->GetMouse(_screen, _buttons);
+	if (!pressed || *_buttons == 0)
+		return;
+	*_screen = lastScreen;
+	*_buttons = lastButtons;
+}
+
+
+void
+WindowInternals::_NotePointer(const BMessage& message)
+{
+	lastScreen = message.FindPoint("screen_where");
+	lastButtons =
+		message.what == B_MOUSE_UP ? 0 : static_cast<uint32>(message.GetInt32("buttons", 0));
 }
 
 

@@ -76,16 +76,29 @@ Worker::BeginWaiting()
 
 
 void
+Worker::BeginWaiting(int32 knownWork)
+{
+	change(*this, [this, knownWork] {
+		fWaiting += 1;
+		fKnownWork = knownWork;
+	});
+}
+
+
+void
 Worker::EndWaiting()
 {
-	change(*this, [this] { fWaiting -= 1; });
+	change(*this, [this] {
+		fWaiting -= 1;
+		fKnownWork = -1;
+	});
 }
 
 
 bool
 Worker::IsIdle() const
 {
-	return fWork <= 0 || fWaiting > 0;
+	return fWork <= 0 || (fWaiting > 0 && (fKnownWork < 0 || fWork <= fKnownWork));
 }
 
 
@@ -96,6 +109,13 @@ WaitingScope::WaitingScope(Worker* worker) : fWorker(worker)
 {
 	if (fWorker != nullptr)
 		fWorker->BeginWaiting();
+}
+
+
+WaitingScope::WaitingScope(Worker* worker, int32 knownWork) : fWorker(worker)
+{
+	if (fWorker != nullptr)
+		fWorker->BeginWaiting(knownWork);
 }
 
 

@@ -65,7 +65,10 @@ public:
 
 	// Input, in WindowInput.cpp and WindowKeys.cpp. Takes ownership of the message.
 	void Route(BMessage* message, BHandler* target);
-	void NoteConsumedPointer(const BMessage& message);
+	// For those who poll the mouse: the next waiting movement or release, which then reaches no
+	// hook; false when none waits. Then GetPointer() tells the present state.
+	bool TakePointer(BPoint* _screen, uint32* _buttons);
+	void GetPointer(BPoint* _screen, uint32* _buttons) const;
 	void SetFocus(BView* view);
 	void Navigate(const BView* from, bool backwards, bool byGroups);
 	// Whether the key belongs to the window: a shortcut, or a key with Command held.
@@ -110,6 +113,8 @@ public:
 	BView* keyMenuBarView = nullptr; // the same
 	std::vector<BView*> eventMaskViews; // with a permanent or temporary mask
 	bool pressed = false; // between a press that came in and its release
+	BPoint lastScreen; // of the last pointer message
+	uint32 lastButtons = 0;
 	bool inMouseDown = false;
 	bool wantsAllPointer = false;
 	BView* pointerTarget = nullptr; // during the handling of one pointer message
@@ -132,6 +137,7 @@ private:
 	bool _DeliverToMasks(const BMessage& event, BView* under, bool isMove);
 	void _DeliverPointer(const BMessage& event, BView* view, int32 transit);
 	void _Deliver(BMessage* message, BHandler* target);
+	void _NotePointer(const BMessage& message);
 	bool _NewerMoveWaits();
 	bool _IsStale(const BMessage& event);
 	void _EndPress();

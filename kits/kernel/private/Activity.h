@@ -26,11 +26,17 @@ public:
 	void BeginWaiting();
 	void EndWaiting();
 
+	// For who waits for new work itself, and looks for it again and again: work beyond this count
+	// makes the worker busy although it waits. The count is taken before the look.
+	int32 CountWork() const { return fWork; }
+	void BeginWaiting(int32 knownWork);
+
 	bool IsIdle() const;
 
 private:
 	std::atomic<int32> fWork { 0 };
 	std::atomic<int32> fWaiting { 0 };
+	std::atomic<int32> fKnownWork { -1 }; // -1: whatever comes is somebody else's to look at
 };
 
 
@@ -38,6 +44,7 @@ private:
 class WaitingScope {
 public:
 	explicit WaitingScope(Worker* worker);
+	WaitingScope(Worker* worker, int32 knownWork);
 	~WaitingScope();
 	WaitingScope(const WaitingScope&) = delete;
 	WaitingScope& operator=(const WaitingScope&) = delete;
