@@ -151,7 +151,9 @@ BWindow::Quit()
 	MenuTracker::WindowCloses(this);
 	while (fInternals->server != nullptr && !IsHidden())
 		Hide();
-	_DeleteViews();
+	// Quit by another thread, the window still handles what waits in its queue, with its views.
+	if (!LooperPrivate(this).IsRunning() || Thread() == find_thread(NULL))
+		_DeleteViews();
 	if (quitsApplication)
 		be_app->PostMessage(B_QUIT_REQUESTED);
 	BLooper::Quit();

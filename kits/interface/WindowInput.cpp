@@ -442,6 +442,11 @@ BWindow::DispatchMessage(BMessage* message, BHandler* handler)
 			WorkspacesChanged(message->FindInt32("old"), message->FindInt32("new"));
 			break;
 
+		case _QUIT_:
+			_DeleteViews();
+			BLooper::DispatchMessage(message, handler);
+			break;
+
 		default:
 			BLooper::DispatchMessage(message, handler);
 			break;
