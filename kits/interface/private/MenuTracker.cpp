@@ -41,6 +41,19 @@ living_trackers()
 	return result;
 }
 
+
+// Of the event that this thread handles, or now.
+bigtime_t
+time_of_press()
+{
+	const BLooper* looper = BLooper::LooperForThread(find_thread(NULL));
+	const BMessage* message = looper != NULL ? looper->CurrentMessage() : NULL;
+	int64 when;
+	if (message != NULL && message->FindInt64("when", &when) == B_OK)
+		return when;
+	return system_time();
+}
+
 } // namespace
 
 
@@ -154,7 +167,7 @@ MenuTracker::_Begin()
 		sTrackers.push_back(weak_from_this());
 	}
 
-	fStartTime = system_time();
+	fStartTime = time_of_press();
 	fFirst = new MenuWindow(shared_from_this(), BRect(0, 0, 10, 10));
 	fFirstMessenger = BMessenger(fFirst);
 	fFirst->Park();
@@ -189,8 +202,13 @@ MenuTracker::_Synchronize()
 BMenuItem*
 MenuTracker::_Wait(BWindow* window)
 {
-	WaitingScope waiting(window != NULL ? &LooperPrivate(window).Activity() : NULL);
 	std::unique_lock lock(fDoneLock);
+	// The end of the wait is told by who brings it about, so that there is no moment in which
+	// the program seems to be idle before this thread has woken up.
+	if (window != NULL && !fDone) {
+		fWaiter = &LooperPrivate(window).Activity();
+		fWaiter->BeginWaiting();
+	}
 	while (!fDone) {
 		if (window == NULL) {
 			fDoneCondition.wait(lock);
@@ -217,11 +235,11 @@ MenuTracker::Abort()
 	fAborted = true;
 	if (find_thread(NULL) == fThread) {
 		_Finish(NULL);
-		return;
+	} else {
+		fFirstMessenger.SendMessage(kMenuAbort);
+		std::unique_lock lock(fDoneLock);
+		fDoneCondition.wait(lock, [this] { return fDone.load(); });
 	}
-	fFirstMessenger.SendMessage(kMenuAbort);
-	std::unique_lock lock(fDoneLock);
-	fDoneCondition.wait(lock, [this] { return fDone.load(); });
 	_CloseBar();
 }
 
@@ -272,6 +290,8 @@ MenuTracker::_Finish(BMenuItem* item)
 	const std::lock_guard lock(fDoneLock);
 	fResult = chosen ? item : NULL;
 	fDone = true;
+	if (fWaiter != nullptr)
+		fWaiter->EndWaiting();
 	fDoneCondition.notify_all();
 }
 

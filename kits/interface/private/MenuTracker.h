@@ -18,6 +18,7 @@ class BWindow;
 namespace BPrivate {
 
 class MenuWindow;
+class Worker;
 
 
 // A state machine that the messages of the first menu's window feed, in that window's thread; the
@@ -167,6 +168,7 @@ private:
 	std::condition_variable fDoneCondition;
 	std::atomic<bool> fDone { false };
 	BMenuItem* fResult = nullptr;
+	Worker* fWaiter = nullptr; // borrowed; the looper that waits for the end
 };
 
 

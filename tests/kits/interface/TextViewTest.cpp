@@ -468,8 +468,7 @@ TEST(TextView, DrawnTextAppearsAndSelectionIsInverted)
 		return dark;
 	};
 	const int32 plain = count_dark();
-	const int32 all
-		= static_cast<int32>((first.Width() + 1) * (first.Height() + 1));
+	const int32 all = static_cast<int32>((first.Width() + 1) * (first.Height() + 1));
 	EXPECT_GT(plain, 5);
 	EXPECT_LT(plain, all / 2);
 	editor.Locked([&] { editor.view->Select(0, 4); });
