@@ -94,8 +94,19 @@ BOutlineListView::AddItem(BListItem* item, int32 fullListIndex)
 	_SubitemsChanged(superIndex);
 	_SubitemsChanged(fullListIndex);
 	item->fVisible = _ShowsSubitems(superIndex);
-	if (item->fVisible)
+	const int32 end = _SubtreeEnd(fullListIndex);
+	if (end > fullListIndex + 1) {
+		// What follows has come under the new item, and shows as that says.
+		if (Window() != NULL)
+			_UpdateItem(item);
+		_RebuildVisible();
+		for (int32 i = fullListIndex + 1; i < end; i++) {
+			if (!fFullItems[i]->fVisible)
+				fFullItems[i]->Deselect();
+		}
+	} else if (item->fVisible) {
 		_Insert(_VisibleIndexFor(fullListIndex), &item, 1);
+	}
 	return true;
 }
 
@@ -517,6 +528,8 @@ BOutlineListView::_CollectVisible(int32 from, int32 to, std::vector<BListItem*>&
 {
 	for (int32 i = from; i < to;) {
 		BListItem* item = fFullItems[i];
+		if (!item->fVisible && Window() != NULL)
+			_UpdateItem(item);
 		item->fVisible = true;
 		visible.push_back(item);
 		if (item->fExpanded) {
