@@ -32,7 +32,7 @@ private:
 
 
 GalleryWindow::GalleryWindow() :
-	BWindow(BRect(60, 40, 60 + 3 * kColumnWidth + 4 * kMargin - 1, 40 + 601), "Gallery",
+	BWindow(BRect(60, 40, 60 + 3 * kColumnWidth + 4 * kMargin - 1, 40 + 521), "Gallery",
 		B_TITLED_WINDOW, B_ASYNCHRONOUS_CONTROLS | B_NOT_RESIZABLE | B_NOT_ZOOMABLE)
 {
 	_AddMenus();
@@ -84,25 +84,27 @@ GalleryWindow::_AddGroups(float top)
 		const float left = kMargin + index * (kColumnWidth + kMargin);
 		return BRect(left, top, left + kColumnWidth - 1, top + height - 1);
 	};
-	const float second = top + 92 + kMargin;
-	const float third = second + 128 + kMargin;
+	// Three columns of groups that end on one line, and the pages below them all.
+	const float bottom = top + 368;
+	const auto fill = [&](int index, float top) { return column(index, top, bottom - top); };
 
-	fGround->AddChild(NewButtonGroup(column(0, top, 92)));
-	fGround->AddChild(NewChoiceGroup(column(0, second, 128)));
-	fGround->AddChild(NewStringGroup(column(0, third, 132)));
+	const float choices = top + 90 + kMargin;
+	const float strings = choices + 126 + kMargin;
+	fGround->AddChild(NewButtonGroup(column(0, top, 90)));
+	fGround->AddChild(NewChoiceGroup(column(0, choices, 126)));
+	fGround->AddChild(NewStringGroup(fill(0, strings)));
 
-	const float fields = 154;
-	fGround->AddChild(NewFieldGroup(column(1, top, fields)));
-	fGround->AddChild(
-		NewSliderGroup(column(1, top + fields + kMargin, third + 132 - top - fields - kMargin)));
+	const float sliders = top + 150 + kMargin;
+	fGround->AddChild(NewFieldGroup(column(1, top, 150)));
+	fGround->AddChild(NewSliderGroup(fill(1, sliders)));
 
-	const float lists = 122;
-	fGround->AddChild(NewListGroup(column(2, top, lists)));
-	fGround->AddChild(NewTextGroup(column(2, top + lists + kMargin, 120)));
-	const float status = top + lists + 120 + 2 * kMargin;
-	fGround->AddChild(NewStatusGroup(column(2, status, third + 132 - status)));
+	const float text = top + 122 + kMargin;
+	const float status = text + 118 + kMargin;
+	fGround->AddChild(NewListGroup(column(2, top, 122)));
+	fGround->AddChild(NewTextGroup(column(2, text, 118)));
+	fGround->AddChild(NewStatusGroup(fill(2, status)));
 
-	const float pages = third + 132 + kMargin;
+	const float pages = bottom + kMargin;
 	fGround->AddChild(NewPageGroup(BRect(
 		kMargin, pages, 3 * kColumnWidth + 3 * kMargin - 1, fGround->Bounds().bottom - kMargin)));
 }

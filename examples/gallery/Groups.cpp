@@ -5,6 +5,7 @@
 #include <CheckBox.h>
 #include <ColorControl.h>
 #include <Message.h>
+#include <PictureButton.h>
 #include <RadioButton.h>
 #include <Slider.h>
 #include <StatusBar.h>
@@ -151,12 +152,12 @@ NewStringGroup(BRect frame)
 	add("In the middle", B_ALIGN_CENTER);
 	add("Aligned to the right", B_ALIGN_RIGHT);
 
-	top += 6;
+	top += 4;
 	const border_style borders[] = { B_FANCY_BORDER, B_PLAIN_BORDER, B_NO_BORDER };
 	const char* const names[] = { "Fancy", "Plain", "None" };
 	for (int i = 0; i < 3; i++) {
 		const float left = kLeft + i * 73.0f;
-		BBox* sample = NewBox(BRect(left, top, left + 68, top + 40), names[i], borders[i]);
+		BBox* sample = NewBox(BRect(left, top, left + 68, top + 36), names[i], borders[i]);
 		box->AddChild(sample);
 	}
 	return box;
@@ -235,6 +236,9 @@ NewPageGroup(BRect frame)
 		new BColorControl(BPoint(306, 8), B_CELLS_32x8, 6, "disabled", NewMessage());
 	disabled->SetValue({ 200, 80, 40, 255 });
 	colors->AddChild(Disabled(disabled));
+	BPictureButton* picture = new BPictureButton(BRect(604, 14, 696, 52), "picture", NewMessage());
+	picture->SetLabel("Picture button");
+	colors->AddChild(picture);
 	tabs->AddTab(colors);
 
 	BView* second = new BView(page, "Second", B_FOLLOW_ALL, B_WILL_DRAW);

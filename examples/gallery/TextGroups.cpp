@@ -79,7 +79,7 @@ BView*
 NewListGroup(BRect frame)
 {
 	BBox* box = NewBox(frame, "Lists");
-	BListView* list = new BListView(BRect(kLeft, kTop, kLeft + 84, kTop + 88), "list");
+	BListView* list = new BListView(BRect(kLeft + 2, kTop + 2, kLeft + 84, kTop + 86), "list");
 	for (const char* item :
 		{ "Monday", "Tuesday", "Wednesday", "Thursday", "Friday", "Saturday", "Sunday" }) {
 		list->AddItem(new BStringItem(item));
@@ -90,7 +90,7 @@ NewListGroup(BRect frame)
 		new BScrollView("list scroller", list, B_FOLLOW_LEFT | B_FOLLOW_TOP, 0, false, true));
 
 	BOutlineListView* outline =
-		new BOutlineListView(BRect(kLeft + 112, kTop, kLeft + 198, kTop + 88), "outline");
+		new BOutlineListView(BRect(kLeft + 118, kTop + 2, kLeft + 200, kTop + 86), "outline");
 	outline->AddItem(new BStringItem("Plants"));
 	outline->AddItem(new BStringItem("Trees", 1));
 	outline->AddItem(new BStringItem("Oak", 2));

@@ -360,10 +360,11 @@ BTextControl::Draw(BRect updateRect)
 		return;
 	font_height height;
 	GetFontHeight(&height);
-	// On the baseline of the text.
+	// On the baseline of the text, if the two fonts are as high; else in the middle beside it.
 	const BRect textRect = fText->TextRect();
-	const float middle = field.top + textRect.top + (fText->LineHeight(0) - 1) / 2;
-	const float baseline = std::floor(middle + (height.ascent - height.descent) / 2 + 0.5f);
+	const float spare = fText->LineHeight(0) - 1 - std::ceil(height.ascent + height.descent);
+	const float baseline =
+		std::floor(field.top + textRect.top + spare / 2) + std::ceil(height.ascent);
 	const float width = StringWidth(Label());
 	float x = 0;
 	if (fLabelAlignment == B_ALIGN_RIGHT)
