@@ -1,5 +1,6 @@
 #include <algorithm>
 #include <math.h>
+#include <optional>
 
 #include "server/paint/FontEngine.h"
 #include "server/paint/PaintTask.h"
@@ -39,23 +40,23 @@ private:
 void
 TextTask::Draw(const GlyphRun& run, float nonspace, float space)
 {
-	PathPainter outlines(fTask);
-	bool hasOutlines = false;
+	std::optional<PathPainter> outlines;
 	float extra = 0;
 	for (const PlacedGlyph& glyph : run.glyphs) {
 		const float x = glyph.x + extra;
 		if (!fUpright || !_DrawImage(glyph, x)) {
-			_AddOutline(outlines, glyph, x);
-			hasOutlines = true;
+			if (!outlines)
+				outlines.emplace(fTask);
+			_AddOutline(*outlines, glyph, x);
 		}
 		extra += glyph.isSpace ? space : nonspace;
 	}
 	fAdvance = run.width + extra;
-	if (hasOutlines) {
+	if (outlines) {
 		if ((fFont.face & B_OUTLINED_FACE) != 0)
-			outlines.Stroke();
+			outlines->Stroke();
 		else
-			outlines.Fill();
+			outlines->Fill();
 	}
 	if ((fFont.face & (B_UNDERSCORE_FACE | B_STRIKEOUT_FACE)) != 0)
 		_DrawLines();
