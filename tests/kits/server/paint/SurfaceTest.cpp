@@ -1,7 +1,14 @@
 #include "server/paint/Surface.h"
 
+#include <cstdio>
+#include <fstream>
+#include <iterator>
+#include <string>
+
 #include <gtest/gtest.h>
 #include <vector>
+
+#include "server/paint/ImageDecoder.h"
 
 using namespace BPrivate;
 
@@ -80,4 +87,32 @@ TEST(Surface, CopiesOnlyTheRegion)
 			EXPECT_EQ(inside ? 9u : 0u, to.Row(y)[x]);
 		}
 	}
+}
+
+
+TEST(Surface, APictureFileReadsBackPixelByPixel)
+{
+	Surface surface;
+	ASSERT_EQ(B_OK, surface.SetTo(37, 5));
+	for (int32 y = 0; y < 5; y++) {
+		for (int32 x = 0; x < 37; x++)
+			surface.Row(y)[x] = static_cast<uint32>(x * 0x07050301 + y * 0x00ff1133);
+	}
+	const std::string path = testing::TempDir() + "surface.png";
+	for (const bool alpha : { true, false }) {
+		ASSERT_EQ(B_OK, surface.WritePng(path.c_str(), alpha));
+		std::ifstream file(path, std::ios::binary);
+		const std::string bytes { std::istreambuf_iterator<char>(file), {} };
+		Result<DecodedImage> image = DecodeImage(bytes.data(), bytes.size());
+		ASSERT_TRUE(image);
+		ASSERT_EQ(37, image->surface->DeviceWidth());
+		ASSERT_EQ(5, image->surface->DeviceHeight());
+		for (int32 y = 0; y < 5; y++) {
+			for (int32 x = 0; x < 37; x++) {
+				const uint32 expected = surface.Row(y)[x] | (alpha ? 0 : 0xff000000);
+				ASSERT_EQ(expected, image->surface->Row(y)[x]) << x << ", " << y;
+			}
+		}
+	}
+	std::remove(path.c_str());
 }
