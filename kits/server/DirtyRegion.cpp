@@ -76,6 +76,53 @@ unite(std::vector<clipping_rect>& rects)
 }
 
 
+// #pragma mark - RegionIndex
+
+
+RegionIndex::RegionIndex(const BRegion& region) : fFrame(region.FrameInt())
+{
+	fRects.reserve(region.CountRects());
+	for (int32 i = 0; i < region.CountRects(); i++)
+		fRects.push_back(region.RectAtInt(i));
+}
+
+
+// The first rectangle that does not end above.
+size_t
+RegionIndex::_FirstReaching(int32 top) const
+{
+	const auto found = std::partition_point(fRects.begin(), fRects.end(),
+		[top](const clipping_rect& rect) { return rect.bottom < top; });
+	return found - fRects.begin();
+}
+
+
+bool
+RegionIndex::Intersects(const clipping_rect& rect) const
+{
+	for (size_t i = _FirstReaching(rect.top); i < fRects.size() && fRects[i].top <= rect.bottom;
+		 i++) {
+		if (!is_empty(intersect(fRects[i], rect)))
+			return true;
+	}
+	return false;
+}
+
+
+BRegion
+RegionIndex::Part(const clipping_rect& rect) const
+{
+	std::vector<clipping_rect> parts;
+	for (size_t i = _FirstReaching(rect.top); i < fRects.size() && fRects[i].top <= rect.bottom;
+		 i++) {
+		const clipping_rect part = intersect(fRects[i], rect);
+		if (!is_empty(part))
+			parts.push_back(part);
+	}
+	return unite(parts);
+}
+
+
 // #pragma mark - DirtyRegion
 
 

@@ -32,6 +32,23 @@ private:
 };
 
 
+// A region as its list of rectangles, for many questions about small parts of it: each takes time
+// for that part alone.
+class RegionIndex {
+public:
+	explicit RegionIndex(const BRegion& region);
+
+	bool Intersects(const clipping_rect& rect) const;
+	BRegion Part(const clipping_rect& rect) const;
+
+private:
+	size_t _FirstReaching(int32 top) const;
+
+	std::vector<clipping_rect> fRects; // bands from the top, in each from the left
+	clipping_rect fFrame;
+};
+
+
 // The union of many rectangles, in time n log n. Empties the vector.
 BRegion unite(std::vector<clipping_rect>& rects);
 

@@ -145,7 +145,7 @@ private:
 	DrawState fBackgroundState;
 	DirtyRegion fDirty;
 	Current fCurrent;
-	const BRegion* fUpdateRegion = nullptr; // during an update
+	const RegionIndex* fUpdateRegion = nullptr; // during an update
 	uint32 fAttachVersion = 0;
 	int64 fCountDrawn = 0;
 };

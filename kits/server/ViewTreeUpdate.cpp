@@ -55,7 +55,8 @@ ViewTree::Update()
 	if (dirty.IsEmpty())
 		return;
 
-	fUpdateRegion = &dirty;
+	const RegionIndex index(dirty);
+	fUpdateRegion = &index;
 	fCurrent.view = nullptr;
 	std::vector<Step> steps;
 	_Collect(fRoot, _PlaceOfParent(fRoot), steps);
@@ -94,8 +95,7 @@ bool
 ViewTree::_UpdateStep(const Step& step, bool afterChildren)
 {
 	ServerView& view = *step.view;
-	BRegion visible = region_of(step.cut);
-	visible.IntersectWith(fUpdateRegion);
+	BRegion visible = fUpdateRegion->Part(step.cut);
 	if (!view.Has(kDrawOnChildren))
 		_ExcludeChildren(view, step.origin, visible);
 	if (visible.IsEmpty())
@@ -162,9 +162,7 @@ ViewTree::_SetCurrent(const ServerView& view, const BRegion* constraint)
 	if (place.hidden)
 		return;
 
-	BRegion clip = region_of(place.cut);
-	if (fUpdateRegion != nullptr)
-		clip.IntersectWith(fUpdateRegion);
+	BRegion clip = fUpdateRegion != nullptr ? fUpdateRegion->Part(place.cut) : region_of(place.cut);
 	if (!view.Has(kDrawOnChildren))
 		_ExcludeChildren(view, place.origin, clip);
 	if (constraint != nullptr) {
@@ -194,9 +192,7 @@ ViewTree::GetClipping(const ServerView& view, const BRegion* constraint, BRegion
 	if (place.hidden || is_empty(place.cut))
 		return;
 
-	BRegion clip = region_of(place.cut);
-	if (fUpdateRegion != nullptr)
-		clip.IntersectWith(fUpdateRegion);
+	BRegion clip = fUpdateRegion != nullptr ? fUpdateRegion->Part(place.cut) : region_of(place.cut);
 	if (!view.Has(kDrawOnChildren))
 		_ExcludeChildren(view, place.origin, clip);
 	const BRegion covered = _Covering(view, place.cut, true);
