@@ -120,8 +120,9 @@ ServerWindow::SetFrame(BRect frame)
 {
 	fRecord->BeginFrame(frame);
 	Display().Post([window = fRecord] {
-		window->FrameApplied();
-		Display().ApplyTraits(window);
+		// Of several changes that wait the last one holds; it alone is applied and reported.
+		if (window->FrameApplied())
+			Display().ApplyTraits(window);
 	});
 }
 

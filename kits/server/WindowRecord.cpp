@@ -117,11 +117,11 @@ WindowRecord::BeginFrame(BRect frame)
 }
 
 
-void
+bool
 WindowRecord::FrameApplied()
 {
 	std::lock_guard lock(fLock);
-	fFramesUnderWay--;
+	return --fFramesUnderWay == 0;
 }
 
 

@@ -46,7 +46,7 @@ public:
 	void Change(const std::function<void(Properties&)>& change);
 	// The program wants another frame; reports of the desktop are out of date until it is applied.
 	void BeginFrame(BRect frame);
-	void FrameApplied();
+	bool FrameApplied(); // whether no other change is under way
 	// The desktop reports a frame; false if it is out of date.
 	bool ReportFrame(BRect frame);
 	WindowTraits Traits() const;
