@@ -262,8 +262,13 @@ BMenuField::GetPreferredSize(float* _width, float* _height)
 void
 BMenuField::Draw(BRect)
 {
-	if (fLabel == NULL)
+	if (fLabel == NULL) {
+		if (fMenuBar != NULL && IsFocus() && Window()->IsActive()) {
+			SetHighColor(Look::NavigationColor());
+			StrokeRect(fMenuBar->Frame().InsetByCopy(-1, -1));
+		}
 		return;
+	}
 	font_height height;
 	GetFontHeight(&height);
 	// On the baseline of what the bar shows.

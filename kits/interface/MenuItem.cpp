@@ -425,8 +425,7 @@ BMenuItem::Draw()
 	const bool lit = fSelected && (IsEnabled() || fSubmenu != NULL);
 	fSuper->PushState();
 	if (lit)
-		Look::DrawMenuItemBackground(
-			fSuper, fBounds, fSuper->LowColor(), state | Look::kPressed);
+		Look::DrawMenuItemBackground(fSuper, fBounds, fSuper->LowColor(), state | Look::kPressed);
 	fSuper->SetDrawingMode(B_OP_OVER);
 	fSuper->SetHighColor(Look::TextColor(state & Look::kDisabled));
 	fSuper->MovePenTo(ContentLocation());

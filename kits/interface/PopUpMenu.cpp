@@ -1,8 +1,11 @@
 #include "PopUpMenu.h"
 
+#include <cmath>
+
 #include <Message.h>
 
 #include "interface/private/MenuTracker.h"
+#include "interface/private/MenuWindow.h"
 #include "interface/private/ViewArchive.h"
 
 using namespace BPrivate;
@@ -105,15 +108,19 @@ BPopUpMenu::ScreenLocation()
 	if (supermenu->Layout() != B_ITEMS_IN_ROW)
 		return BMenu::ScreenLocation();
 
-	BPoint where = superitem->Frame().LeftTop() + supermenu->fScreenOrigin;
+	// Both labels lie on each other, on one baseline.
+	float left, top, superLeft;
+	GetItemMargins(&left, &top, NULL, NULL);
+	supermenu->GetItemMargins(&superLeft, NULL, NULL, NULL);
+	font_height height;
+	supermenu->GetFontHeight(&height);
+	const BRect label = superitem->Frame();
+	const float text = std::ceil(height.ascent) + std::ceil(height.descent);
+	BPoint where = label.LeftTop() + supermenu->fScreenOrigin;
+	where.x += superLeft - left - MenuWindow::kBorder;
+	where.y += std::floor((label.Height() + 1 - text) / 2) - top - MenuWindow::kBorder;
 	if (BMenuItem* marked = FindMarked())
 		where.y -= marked->Frame().top;
-	// The labels of both lie on each other.
-	float left, superLeft;
-	GetItemMargins(&left, NULL, NULL, NULL);
-	supermenu->GetItemMargins(&superLeft, NULL, NULL, NULL);
-	where.x += superLeft - left;
-	where.y += 1;
 	return where;
 }
 

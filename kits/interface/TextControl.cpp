@@ -358,13 +358,12 @@ BTextControl::Draw(BRect updateRect)
 
 	if (Label() == NULL)
 		return;
+	// On the baseline of the text.
+	BFont font;
+	fText->GetFontAndColor(0, &font);
 	font_height height;
-	GetFontHeight(&height);
-	// On the baseline of the text, if the two fonts are as high; else in the middle beside it.
-	const BRect textRect = fText->TextRect();
-	const float spare = fText->LineHeight(0) - 1 - std::ceil(height.ascent + height.descent);
-	const float baseline =
-		std::floor(field.top + textRect.top + spare / 2) + std::ceil(height.ascent);
+	font.GetHeight(&height);
+	const float baseline = field.top + fText->TextRect().top + std::ceil(height.ascent);
 	const float width = StringWidth(Label());
 	float x = 0;
 	if (fLabelAlignment == B_ALIGN_RIGHT)

@@ -199,14 +199,16 @@ MenuTracker::_Synchronize()
 }
 
 
+// The end of the wait is told by who brings it about, so that there is no moment in which the
+// program seems to be idle before this thread has woken up.
 BMenuItem*
 MenuTracker::_Wait(BWindow* window)
 {
+	_UpdateWaiting(window);
 	std::unique_lock lock(fDoneLock);
-	// The end of the wait is told by who brings it about, so that there is no moment in which
-	// the program seems to be idle before this thread has woken up.
-	if (window != NULL && !fDone) {
-		fWaiter = &LooperPrivate(window).Activity();
+	BLooper* looper = BLooper::LooperForThread(find_thread(NULL));
+	if (looper != NULL && !fDone) {
+		fWaiter = &LooperPrivate(looper).Activity();
 		fWaiter->BeginWaiting();
 	}
 	while (!fDone) {
@@ -215,16 +217,24 @@ MenuTracker::_Wait(BWindow* window)
 			continue;
 		}
 		fDoneCondition.wait_for(lock, std::chrono::microseconds(kUpdateInterval));
-		if (fDone || !window->NeedsUpdate())
-			continue;
+		if (fDone)
+			break;
 		lock.unlock();
-		{
-			const std::lock_guard<std::recursive_mutex> loan(fLoan);
-			window->UpdateIfNeeded();
-		}
+		_UpdateWaiting(window);
 		lock.lock();
 	}
 	return fResult;
+}
+
+
+// No step runs meanwhile: a window draws its menus, too.
+void
+MenuTracker::_UpdateWaiting(BWindow* window)
+{
+	if (window == NULL || !window->NeedsUpdate())
+		return;
+	const std::lock_guard<std::recursive_mutex> loan(fLoan);
+	window->UpdateIfNeeded();
 }
 
 

@@ -107,6 +107,7 @@ private:
 
 	bool _Begin();
 	BMenuItem* _Wait(BWindow* window);
+	void _UpdateWaiting(BWindow* window);
 	void _Finish(BMenuItem* item);
 	void _CloseBar();
 	bool _IsInOpenMenu(const BMenuItem* item) const;

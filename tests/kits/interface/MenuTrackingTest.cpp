@@ -4,9 +4,9 @@
 #include <gtest/gtest.h>
 
 #include <atomic>
-#include <thread>
 #include <vector>
 
+#include <Looper.h>
 #include <MenuBar.h>
 #include <MenuField.h>
 #include <MenuItem.h>
@@ -339,22 +339,35 @@ TEST(MenuTracking, OpeningLeavesTheArchiveUntouched)
 }
 
 
+namespace {
+
+// Runs a menu in a thread that has no window.
+struct PopUpLooper : BLooper {
+	void MessageReceived(BMessage*) override { chosen = menu.Go(BPoint(100, 100), false, true); }
+
+	BPopUpMenu menu { "pop", false, false };
+	BMenuItem* chosen = NULL;
+};
+
+} // namespace
+
+
 TEST(MenuTracking, SynchronousPopUpReturnsTheChosenItem)
 {
 	Menus menus;
-	BPopUpMenu menu("pop", false, false);
-	menu.AddItem(new BMenuItem("one", new BMessage('itm7')));
-	menu.AddItem(new BMenuItem("two", new BMessage('itm8')));
-	menu.SetTargetForItems(menus.window);
-	std::atomic<BMenuItem*> result { NULL };
-	std::thread caller([&] { result = menu.Go(BPoint(100, 100), false, true); });
-	while (!Menus::IsOpen(&menu))
-		snooze(1000);
+	PopUpLooper* looper = new PopUpLooper;
+	looper->menu.AddItem(new BMenuItem("one", new BMessage('itm7')));
+	looper->menu.AddItem(new BMenuItem("two", new BMessage('itm8')));
+	looper->menu.SetTargetForItems(menus.window);
+	looper->Run();
+	looper->PostMessage('open');
 	Driver::WaitUntilIdle();
-	menus.driver.Click(Menus::Item(&menu, 1));
-	caller.join();
-	EXPECT_EQ(menu.ItemAt(1), result);
+	ASSERT_TRUE(Menus::IsOpen(&looper->menu));
+	menus.driver.Click(Menus::Item(&looper->menu, 1));
+	ASSERT_TRUE(looper->Lock());
+	EXPECT_EQ(looper->menu.ItemAt(1), looper->chosen);
 	EXPECT_EQ(Codes(), menus.TakeCodes());
+	looper->Quit();
 }
 
 
