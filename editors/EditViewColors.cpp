@@ -25,7 +25,7 @@ constexpr uint32 kLowChosen = 'low ';
 
 constexpr float kSectionHeight = 100;
 constexpr float kInset = 6;
-constexpr float kFirstRow = 8;
+constexpr float kFirstRow = 10;
 constexpr float kSwatchHeight = 24;
 constexpr float kSwatchStep = 29;
 constexpr float kRadioWidth = 54;

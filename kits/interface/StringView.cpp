@@ -18,7 +18,7 @@ using BPrivate::LabelMetrics;
 
 namespace {
 
-constexpr float kInset = 2; // of the text, at the left and at the right
+constexpr float kInset = 0; // of the text, at the left and at the right
 
 // Calls `action(line)` for every line of the text, with a std::string.
 template<typename Action>

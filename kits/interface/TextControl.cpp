@@ -17,7 +17,7 @@ namespace {
 
 constexpr const char* kInputName = "_input_";
 constexpr float kFrameWidth = 2; // pixels round the field
-constexpr float kHeightPadding = 7;
+constexpr float kHeightPadding = 4;
 constexpr float kLabelGap = 2; // between label and divider
 
 constexpr rgb_color kWhite = { 255, 255, 255, 255 };

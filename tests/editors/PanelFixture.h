@@ -1,0 +1,110 @@
+// PanelFixture: a panel beside a ground that holds the edited views, used by mouse and keys.
+#pragma once
+
+#include <string>
+
+#include <gtest/gtest.h>
+
+#include <Button.h>
+#include <CheckBox.h>
+#include <MenuField.h>
+#include <MenuItem.h>
+#include <Message.h>
+#include <TextControl.h>
+#include <TextView.h>
+
+#include "support/TestWindow.h"
+
+
+template<class Panel> class PanelFixture : public testing::Test {
+protected:
+	PanelFixture() : window(BRect(20, 20, 819, 619))
+	{
+		panel = window.Add(new Panel);
+		ground = window.Add(new BView(
+			BRect(420, 0, 799, 599), "ground", B_FOLLOW_LEFT | B_FOLLOW_TOP, B_WILL_DRAW));
+	}
+
+	// Adds a view to the ground and lets the panel use it.
+	template<class View> View* Use(View* view)
+	{
+		window.Locked([&] {
+			ground->AddChild(view);
+			EXPECT_TRUE(panel->UseView(view));
+		});
+		return view;
+	}
+
+	// Lets the panel look again, as a new selection does.
+	void Reload(BView* view)
+	{
+		window.Locked([&] { EXPECT_TRUE(panel->UseView(view)); });
+	}
+
+	void ExpectDeclined()
+	{
+		BView* plain = new BView(BRect(0, 0, 9, 9), NULL, B_FOLLOW_NONE, B_WILL_DRAW);
+		window.Locked([&] {
+			ground->AddChild(plain);
+			EXPECT_FALSE(panel->UseView(plain));
+			EXPECT_FALSE(panel->UseView(NULL));
+		});
+	}
+
+	// The n-th control of a class with that label, at any depth.
+	template<class Control>
+	Control* Find(const std::string& label, int n = 0, BView* within = nullptr)
+	{
+		BView* root = within != nullptr ? within : panel;
+		for (BView* child = root->ChildAt(0); child != nullptr; child = child->NextSibling()) {
+			Control* control = dynamic_cast<Control*>(child);
+			const char* text = control != nullptr ? control->Label() : nullptr;
+			if (control != nullptr && (text != nullptr ? text : "") == label && n-- == 0)
+				return control;
+			if (Control* found = Find<Control>(label, n, child))
+				return found;
+		}
+		return nullptr;
+	}
+
+	std::string Shown(const char* label, int n = 0) { return Find<BTextControl>(label, n)->Text(); }
+
+	void TypeOver(const char* label, const char* text, int n = 0)
+	{
+		BTextControl* control = Find<BTextControl>(label, n);
+		ASSERT_NE(nullptr, control);
+		window.driver.Click(control->TextView());
+		window.Locked([&] { control->TextView()->SelectAll(); });
+		if (text[0] == '\0')
+			window.driver.Key("Delete");
+		else
+			window.driver.Type(text);
+		window.driver.Key("Return");
+	}
+
+	void Press(const char* label) { window.driver.Click(Find<BButton>(label)); }
+	void Tick(const char* label) { window.driver.Click(Find<BCheckBox>(label)); }
+	bool IsTicked(const char* label) { return Find<BCheckBox>(label)->Value() != B_CONTROL_OFF; }
+
+	// Opens the field by keys and chooses the item as its menu does.
+	void Choose(const char* fieldLabel, const char* item, int n = 0)
+	{
+		BMenuField* field = Find<BMenuField>(fieldLabel, n);
+		ASSERT_NE(nullptr, field);
+		window.Locked([&] {
+			BMenuItem* found = field->Menu()->FindItem(item);
+			ASSERT_NE(nullptr, found);
+			static_cast<BInvoker*>(found)->Invoke();
+		});
+	}
+
+	std::string Chosen(const char* fieldLabel, int n = 0)
+	{
+		BMenuItem* item = Find<BMenuField>(fieldLabel, n)->Menu()->FindMarked();
+		return item != nullptr ? item->Label() : "";
+	}
+
+	TestWindow window;
+	Panel* panel;
+	BView* ground;
+};
