@@ -26,7 +26,7 @@
 namespace {
 
 
-constexpr BRect kFrame(20, 20, 160, 60);
+const BRect kFrame(20, 20, 160, 60);
 
 
 } // namespace

@@ -20,7 +20,7 @@
 namespace {
 
 
-constexpr BRect kFrame(20, 20, 220, 120);
+const BRect kFrame(20, 20, 220, 120);
 
 
 bool
@@ -364,7 +364,7 @@ TEST_F(EditTextViewTest, ChangesNumbersAndMenus)
 	EXPECT_EQ(B_ALIGN_CENTER, text->Alignment());
 	Choose("Offscreen:", "B_RGB32");
 	EXPECT_EQ(1, text->ColorSpace());
-	window.Locked([&] { text->SetColorSpace(B_RGB32); });
+	window.Locked([&] { text->SetColorSpace(B_RGBA32); });
 	Reload(text);
 	EXPECT_EQ("", Chosen("Offscreen:"));
 }

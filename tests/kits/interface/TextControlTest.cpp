@@ -120,7 +120,7 @@ TEST(TextControl, IsRaisedToTheHeightOfItsFont)
 	font_height height;
 	control->GetFontHeight(&height);
 	EXPECT_EQ(
-		ceilf(height.ascent + height.descent + height.leading) + 7, control->Bounds().Height());
+		ceilf(height.ascent + height.descent + height.leading) + 4, control->Bounds().Height());
 }
 
 
