@@ -320,15 +320,14 @@ BMessage::AddData(
 	if (owned == nullptr)
 		return B_NO_MEMORY;
 	const size_t length = strlen(name);
-	const uint32 hash = BPrivate::hash_name(name, length);
-	int32 number = owned->Find(name, length, hash);
+	int32 number = owned->Find(name, length);
 	if (number >= 0 && fWriteBack != nullptr)
 		number = fWriteBack->MakeRoom(*owned, number);
 	if (number < 0) {
 		if (length > B_FIELD_NAME_LENGTH)
 			return B_BAD_VALUE;
 		const status_t status =
-			owned->AddField(name, length, type, isFixedSize, data, size_t(numBytes));
+			owned->AddField(name, length, type, isFixedSize, { data, size_t(numBytes) });
 		if (status == B_OK && fWriteBack != nullptr)
 			fWriteBack->PlaceLast(*owned);
 		return status;
@@ -339,7 +338,7 @@ BMessage::AddData(
 		return B_BAD_TYPE;
 	if (field.Has(MessageField::kFixed) && field.ItemSize() != size_t(numBytes))
 		return B_BAD_VALUE;
-	return owned->AddItem(uint32(number), data, size_t(numBytes));
+	return owned->AddItem(uint32(number), { data, size_t(numBytes) });
 }
 
 
@@ -348,15 +347,11 @@ BMessage::AddMessage(const char* name, const BMessage* message)
 {
 	if (name == nullptr || message == nullptr)
 		return B_BAD_VALUE;
-	// Shared first, so that a message added to itself is added as it was.
+	// First, so that a message can be put into itself.
 	MessageData* nested = _Nested(*message);
-	MessageData* owned = _Own();
-	if (owned == nullptr || nested == nullptr) {
-		if (nested != nullptr)
-			nested->Release();
+	if (nested == nullptr)
 		return B_NO_MEMORY;
-	}
-	const status_t status = _AddNested(name, nested);
+	const status_t status = _Own() != nullptr ? _AddNested(name, nested) : status_t(B_NO_MEMORY);
 	nested->Release();
 	return status;
 }
@@ -548,7 +543,7 @@ BMessage::ReplaceData(
 	if (field.Has(MessageField::kFixed) && field.ItemSize() != size_t(numBytes))
 		return B_BAD_VALUE;
 	MessageData* owned = _Own();
-	return owned != nullptr ? owned->ReplaceItem(number, uint32(index), data, size_t(numBytes))
+	return owned != nullptr ? owned->ReplaceItem(number, uint32(index), { data, size_t(numBytes) })
 							: status_t(B_NO_MEMORY);
 }
 
@@ -654,7 +649,7 @@ BMessage::HasSameData(const BMessage& other, bool ignoreFieldOrder, bool deep) c
 		const MessageField& field = fData->FieldAt(i);
 		int32 twin = int32(i);
 		if (ignoreFieldOrder)
-			twin = other.fData->Find(fData->NameBytes(field), field.nameLength, field.hash);
+			twin = other.fData->Find(fData->NameBytes(field), field.nameLength);
 		if (twin < 0 || !_SameField(i, *other.fData, uint32(twin), ignoreFieldOrder, deep))
 			return false;
 	}
@@ -763,7 +758,7 @@ status_t
 BMessage::_AddNested(const char* name, MessageData* nested)
 {
 	const size_t length = strlen(name);
-	int32 number = fData->Find(name, length, BPrivate::hash_name(name, length));
+	int32 number = fData->Find(name, length);
 	if (number >= 0 && fWriteBack != nullptr)
 		number = fWriteBack->MakeRoom(*fData, number);
 	const bool fixed = number >= 0 && fData->FieldAt(uint32(number)).Has(MessageField::kFixed);
@@ -778,17 +773,21 @@ BMessage::_AddNested(const char* name, MessageData* nested)
 		bytes->Release();
 		return status;
 	}
-	if (number < 0) {
-		if (length > B_FIELD_NAME_LENGTH)
-			return B_BAD_VALUE;
-		const status_t status = fData->AddMessageField(name, length, B_MESSAGE_TYPE, nested);
-		if (status == B_OK && fWriteBack != nullptr)
-			fWriteBack->PlaceLast(*fData);
-		return status;
+	const BPrivate::ItemContents item { nullptr, nested->FlatSize(), nested };
+	const bool copied = nested->IsBetterCopied();
+	if (number >= 0) {
+		if (fData->FieldAt(uint32(number)).type != B_MESSAGE_TYPE)
+			return B_BAD_TYPE;
+		return copied ? fData->AddItem(uint32(number), item)
+					  : fData->AddMessageItem(uint32(number), nested);
 	}
-	if (fData->FieldAt(uint32(number)).type != B_MESSAGE_TYPE)
-		return B_BAD_TYPE;
-	return fData->AddMessageItem(uint32(number), nested);
+	if (length > B_FIELD_NAME_LENGTH)
+		return B_BAD_VALUE;
+	const status_t status = copied ? fData->AddField(name, length, B_MESSAGE_TYPE, false, item)
+								   : fData->AddMessageField(name, length, B_MESSAGE_TYPE, nested);
+	if (status == B_OK && fWriteBack != nullptr)
+		fWriteBack->PlaceLast(*fData);
+	return status;
 }
 
 

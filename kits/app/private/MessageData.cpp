@@ -2,6 +2,8 @@
 
 #include <cstdlib>
 #include <new>
+#include <utility>
+
 #include <sys/random.h>
 
 #include <TypeConstants.h>
@@ -15,7 +17,7 @@ namespace BPrivate {
 namespace {
 
 // Up to here a walk over the fields, or over the items of one, is as good as a table.
-constexpr uint32 kFewFields = 8;
+constexpr uint32 kFewFields = 16;
 constexpr uint32 kFewItems = 8;
 
 // Offsets and the sizes in flattened messages are signed 32-bit numbers.
@@ -44,17 +46,6 @@ mix(uint64 a, uint64 b)
 }
 
 
-void
-put_item(uint8* to, const void* data, size_t size)
-{
-	write_uint32(to, uint32(size));
-	memcpy(to + 4, data, size);
-	memset(to + 4 + size, 0, padded_item_size(size) - 4 - size);
-}
-
-} // namespace
-
-
 uint32
 hash_name(const char* name, size_t length)
 {
@@ -67,39 +58,46 @@ hash_name(const char* name, size_t length)
 		length -= 8;
 	}
 	uint64 word = 0;
-	if (length >= 4) {
-		uint32 low;
-		uint32 high;
-		memcpy(&low, name, 4);
-		memcpy(&high, name + length - 4, 4);
-		word = uint64(high) << 32 | low;
-	} else if (length > 0) {
-		word = uint64(uint8(name[0])) | uint64(uint8(name[length / 2])) << 8
-			| uint64(uint8(name[length - 1])) << 16;
-	}
+	memcpy(&word, name, length);
 	hash = mix(hash ^ word, sSeed ^ 0xe7037ed1a0b428dbull);
 	return uint32(hash ^ hash >> 32);
 }
 
 
+void
+put_item(uint8* to, const ItemContents& item)
+{
+	const size_t end = 4 + item.size;
+	write_uint32(to, uint32(item.size));
+	if (item.message != nullptr)
+		item.message->WritePlain(item.message->What(), to + 4);
+	else
+		memcpy(to + 4, item.data, item.size);
+	// The padding is at most seven bytes.
+	for (size_t at = end; at < ((end + 7) & ~size_t(7)); at++)
+		to[at] = 0;
+}
+
+} // namespace
+
+
 MessageData*
 MessageData::Create()
 {
-	return new (std::nothrow) MessageData;
+	constexpr uint32 kFirstRoom = 8;
+	return _CreateWithRoom(kFirstRoom);
 }
 
 
 MessageData*
-MessageData::CreateFrom(
-	SharedBytes* source, const uint8* base, const MessageField* fields, uint32 count, int32 level)
+MessageData::CreateFrom(SharedBytes* source, const uint8* base, const MessageField* fields,
+	uint32 count, int32 level, uint32 bodySize)
 {
-	MessageData* data = Create();
-	if (data == nullptr || !data->_ReserveFields(count)) {
+	MessageData* data = _CreateWithRoom(count);
+	if (data == nullptr) {
 		for (uint32 i = 0; i < count; i++)
 			free(fields[i].table);
-		if (source != nullptr)
-			source->Release();
-		delete data;
+		source->Release();
 		return nullptr;
 	}
 	if (count > 0)
@@ -107,7 +105,10 @@ MessageData::CreateFrom(
 	data->fCount = count;
 	data->fSource = source;
 	data->fSourceBase = base;
+	data->fBodySize = bodySize;
+	data->fStoreIsBody = false;
 	data->fLevel = int16(level);
+	data->fPlain.store(-1, std::memory_order_relaxed);
 	if (count > kFewFields && !data->_BuildIndex()) {
 		data->Release();
 		return nullptr;
@@ -119,10 +120,11 @@ MessageData::CreateFrom(
 MessageData*
 MessageData::Clone() const
 {
-	MessageData* clone = Create();
+	// It is about to be changed, most likely by adding something.
+	MessageData* clone = _CreateWithRoom(fCount + 1);
 	if (clone == nullptr)
 		return nullptr;
-	if (!clone->_ReserveFields(fCount) || (fStoreSize > 0 && !clone->_ReserveStore(fStoreSize))) {
+	if (fStoreSize > 0 && !clone->_ReserveStore(fStoreSize)) {
 		clone->Release();
 		return nullptr;
 	}
@@ -138,6 +140,9 @@ MessageData::Clone() const
 	clone->fWhat = fWhat;
 	clone->fLevel = fLevel;
 	clone->fHeight = fHeight;
+	clone->fBodySize = fBodySize;
+	clone->fStoreIsBody = fStoreIsBody;
+	clone->fCopies = fCopies;
 	clone->SetNote(fNote);
 
 	for (uint32 i = 0; i < fCount; i++) {
@@ -161,7 +166,6 @@ MessageData::Clone() const
 		clone->Release();
 		return nullptr;
 	}
-	clone->fFlatSize.store(fFlatSize.load(std::memory_order_relaxed), std::memory_order_relaxed);
 	clone->fPlain.store(fPlain.load(std::memory_order_relaxed), std::memory_order_relaxed);
 	return clone;
 }
@@ -179,12 +183,11 @@ MessageData::~MessageData()
 {
 	for (uint32 i = 0; i < fCount; i++)
 		_ReleaseTable(fFields[i]);
-	free(fFields);
+	if (fFields != reinterpret_cast<MessageField*>(this + 1))
+		free(fFields);
 	free(fIndex);
 	free(fStore);
-	free(fNames.load(std::memory_order_relaxed));
-	if (SharedBytes* flat = fFlat.load(std::memory_order_relaxed))
-		flat->Release();
+	_Changed();
 	if (fSource != nullptr)
 		fSource->Release();
 	SetNote(nullptr);
@@ -194,30 +197,26 @@ MessageData::~MessageData()
 int32
 MessageData::Find(const char* name) const
 {
-	const size_t length = strlen(name);
-	return Find(name, length, hash_name(name, length));
+	return Find(name, strlen(name));
 }
 
 
 int32
-MessageData::Find(const char* name, size_t length, uint32 hash) const
+MessageData::Find(const char* name, size_t length) const
 {
+	const uint32 key = name_key(name, length);
 	if (fIndex == nullptr) {
 		for (uint32 i = 0; i < fCount; i++) {
-			const MessageField& field = fFields[i];
-			if (field.hash == hash && field.nameLength == length
-				&& memcmp(NameBytes(field), name, length) == 0)
+			if (_IsNamed(fFields[i], name, length, key))
 				return int32(i);
 		}
 		return -1;
 	}
 
-	for (uint32 slot = hash & fIndexMask; fIndex[slot] != 0; slot = (slot + 1) & fIndexMask) {
-		const uint32 i = fIndex[slot] - 1;
-		const MessageField& field = fFields[i];
-		if (field.hash == hash && field.nameLength == length
-			&& memcmp(NameBytes(field), name, length) == 0)
-			return int32(i);
+	uint32 slot = hash_name(name, length) & fIndexMask;
+	for (; fIndex[slot] != 0; slot = (slot + 1) & fIndexMask) {
+		if (_IsNamed(fFields[fIndex[slot] - 1], name, length, key))
+			return int32(fIndex[slot] - 1);
 	}
 	return -1;
 }
@@ -250,6 +249,7 @@ MessageData::NameAt(uint32 index) const
 			made[offset + fFields[i].nameLength] = '\0';
 			offset += fFields[i].nameLength + size_t(1);
 		}
+		fHasDerived.store(true, std::memory_order_relaxed);
 		if (fNames.compare_exchange_strong(names, made, std::memory_order_acq_rel))
 			names = made;
 		else
@@ -303,6 +303,7 @@ MessageData::GetItem(uint32 number, uint32 index, const void** _data, size_t* _s
 		SharedBytes* made = flatten_to_bytes(*nested, nested->What());
 		if (made == nullptr)
 			return B_NO_MEMORY;
+		nested->fHasDerived.store(true, std::memory_order_relaxed);
 		if (nested->fFlat.compare_exchange_strong(flat, made, std::memory_order_acq_rel))
 			flat = made;
 		else
@@ -380,53 +381,55 @@ MessageData::GetMessage(uint32 number, uint32 index, status_t* _status) const
 
 status_t
 MessageData::AddField(
-	const char* name, size_t length, type_code type, bool fixed, const void* data, size_t size)
+	const char* name, size_t length, type_code type, bool fixed, const ItemContents& item)
 {
-	if (size > kLargestStore)
+	if (item.size > kLargestStore)
 		return B_NO_MEMORY;
-	const size_t bytes = fixed ? size : padded_item_size(size);
-	MessageField field = {};
-	field.nameLength = uint16(length);
-	const uint32 header = _HeaderLength(field, 1, bytes);
+	const size_t bytes = fixed ? item.size : padded_item_size(item.size);
+	const uint32 header = r5_field_header_length(1, bytes, B_R5_FORM);
 	if (!_ReserveStore(header + length + bytes) || !_ReserveFields(1))
 		return B_NO_MEMORY;
 	_Changed();
+	fStoreIsBody = fStoreIsBody && fBodySize == 0;
+	fBodySize = 0;
+	_NoteNested(type, item);
 
+	MessageField& field = fFields[fCount];
 	field.start = fStoreSize;
 	field.name = fStoreSize + header;
 	field.data = field.name + uint32(length);
 	field.size = uint32(bytes);
 	field.count = 1;
+	field.capacity = fixed ? uint32(bytes) : 0;
 	field.type = type;
-	field.hash = hash_name(name, length);
-	field.flags = MessageField::kCompact | (bytes > 255 ? MessageField::kWide : 0);
-	if (fixed) {
-		field.flags |= MessageField::kFixed;
-		field.capacity = uint32(bytes);
-	}
-	_WriteHeader(field);
+	field.key = name_key(name, length);
+	field.table = nullptr;
+	field.nameLength = uint16(length);
+	field.flags = MessageField::kCompact | (bytes > 255 ? MessageField::kWide : 0)
+		| (fixed ? MessageField::kFixed : 0);
+	write_r5_field_head(fStore + field.start, field, bytes, B_R5_FORM);
 	memcpy(fStore + field.name, name, length);
 	if (fixed)
-		memcpy(fStore + field.data, data, size);
+		memcpy(fStore + field.data, item.data, item.size);
 	else
-		put_item(fStore + field.data, data, size);
+		put_item(fStore + field.data, item);
 	fStoreSize = field.data + uint32(bytes);
-
-	fFields[fCount++] = field;
-	_Index(fCount - 1);
+	_AddToIndex(fCount++);
 	return B_OK;
 }
 
 
 status_t
-MessageData::AddItem(uint32 number, const void* data, size_t size)
+MessageData::AddItem(uint32 number, const ItemContents& item)
 {
-	if (size > kLargestStore || fFields[number].count == INT32_MAX)
+	if (item.size > kLargestStore || fFields[number].count == INT32_MAX)
 		return B_NO_MEMORY;
 	_Changed();
+	fBodySize = 0;
 	MessageField& field = fFields[number];
-	return field.Has(MessageField::kFixed) ? _AppendFixed(field, data, size)
-										   : _AppendVariable(field, data, size);
+	_NoteNested(field.type, item);
+	return field.Has(MessageField::kFixed) ? _AppendFixed(field, item)
+										   : _AppendVariable(field, item);
 }
 
 
@@ -439,25 +442,26 @@ MessageData::AddMessageField(const char* name, size_t length, type_code type, Me
 		return B_NO_MEMORY;
 	}
 	_Changed();
+	fStoreIsBody = false;
+	fBodySize = 0;
 
-	MessageField field = {};
+	MessageField& field = fFields[fCount];
+	field = {};
 	field.name = fStoreSize;
 	field.nameLength = uint16(length);
 	field.size = uint32(padded_item_size(data->FlatSize()));
 	field.count = 1;
 	field.capacity = 1;
 	field.type = type;
-	field.hash = hash_name(name, length);
+	field.key = name_key(name, length);
 	field.flags = MessageField::kScattered;
 	field.table = table;
 	data->Acquire();
 	table[0] = ItemPlace::Nested(data).Word();
 	memcpy(fStore + fStoreSize, name, length);
 	fStoreSize += uint32(length);
-	_AddHeight(*data);
-
-	fFields[fCount++] = field;
-	_Index(fCount - 1);
+	_NoteNested(type, { nullptr, 0, data });
+	_AddToIndex(fCount++);
 	return B_OK;
 }
 
@@ -473,22 +477,25 @@ MessageData::AddMessageItem(uint32 number, MessageData* data)
 	data->Acquire();
 	field.table[field.count++] = ItemPlace::Nested(data).Word();
 	field.size += uint32(bytes);
-	_AddHeight(*data);
+	_NoteNested(field.type, { nullptr, 0, data });
 	return B_OK;
 }
 
 
 status_t
-MessageData::ReplaceItem(uint32 number, uint32 index, const void* data, size_t size)
+MessageData::ReplaceItem(uint32 number, uint32 index, const ItemContents& item)
 {
+	const size_t size = item.size;
 	if (size > kLargestStore)
 		return B_NO_MEMORY;
 	_Changed();
+	fBodySize = 0;
 	MessageField& field = fFields[number];
+	_NoteNested(field.type, item);
 	if (field.Has(MessageField::kFixed)) {
 		if (!_OwnFixed(field, field.size))
 			return B_NO_MEMORY;
-		memcpy(fStore + field.data + size_t(index) * size, data, size);
+		memcpy(fStore + field.data + size_t(index) * size, item.data, size);
 		return B_OK;
 	}
 
@@ -496,12 +503,12 @@ MessageData::ReplaceItem(uint32 number, uint32 index, const void* data, size_t s
 	const size_t oldSize = ItemSizeAt(number, index);
 	if (!old.IsNested() && !old.IsInSource()
 		&& padded_item_size(oldSize) == padded_item_size(size)) {
-		put_item(fStore + old.Offset(), data, size);
+		put_item(fStore + old.Offset(), item);
 		return B_OK;
 	}
 
 	uint32 offset;
-	if (!_Scatter(field, field.count) || !_PutItem(data, size, &offset))
+	if (!_Scatter(field, field.count) || !_PutItem(item, &offset))
 		return B_NO_MEMORY;
 	if (old.IsNested())
 		old.Message()->Release();
@@ -531,7 +538,7 @@ MessageData::ReplaceMessage(uint32 number, uint32 index, MessageData* data)
 		fWaste += uint32(oldBytes);
 	field.table[index] = ItemPlace::Nested(data).Word();
 	field.size += uint32(bytes) - uint32(oldBytes);
-	_AddHeight(*data);
+	_NoteNested(field.type, { nullptr, 0, data });
 	_CompactStore();
 	return B_OK;
 }
@@ -550,6 +557,7 @@ MessageData::RemoveItem(uint32 number, uint32 index)
 		if (!_OwnFixed(field, field.size))
 			return B_NO_MEMORY;
 		_Changed();
+		fStoreIsBody = false;
 		const uint32 size = field.ItemSize();
 		uint8* item = fStore + field.data + size_t(index) * size;
 		memmove(item, item + size, size_t(field.count - index - 1) * size);
@@ -579,6 +587,8 @@ void
 MessageData::RemoveField(uint32 number)
 {
 	_Changed();
+	fStoreIsBody = false;
+	fBodySize = 0;
 	MessageField& field = fFields[number];
 	if (!field.Has(MessageField::kInSource | MessageField::kScattered))
 		fWaste += field.size + field.nameLength;
@@ -603,10 +613,12 @@ MessageData::RenameField(uint32 number, const char* name, size_t length)
 	if (!_ReserveStore(length))
 		return B_NO_MEMORY;
 	_Changed();
+	fStoreIsBody = false;
+	fBodySize = 0;
 	memcpy(fStore + fStoreSize, name, length);
 	field.name = fStoreSize;
 	field.nameLength = uint16(length);
-	field.hash = hash_name(name, length);
+	field.key = name_key(name, length);
 	field.flags &=
 		uint16(~(MessageField::kCompact | MessageField::kWide | MessageField::kNameInSource));
 	fStoreSize += uint32(length);
@@ -640,8 +652,11 @@ MessageData::CopyField(const MessageData& from, uint32 number)
 			memcpy(field.table, original.table, field.count * sizeof(uint64));
 		}
 		_Changed();
-		fFields[fCount++] = field;
-		_Index(fCount - 1);
+		fStoreIsBody = false;
+		fBodySize = 0;
+		fPlain.store(-1, std::memory_order_relaxed);
+		fFields[fCount] = field;
+		_AddToIndex(fCount++);
 		return B_OK;
 	}
 
@@ -660,9 +675,9 @@ MessageData::CopyField(const MessageData& from, uint32 number)
 			break;
 		if (i == 0) {
 			status = AddField(name, original.nameLength, original.type,
-				original.Has(MessageField::kFixed), data, size);
+				original.Has(MessageField::kFixed), { data, size });
 		} else
-			status = AddItem(last, data, size);
+			status = AddItem(last, { data, size });
 	}
 	return status;
 }
@@ -695,6 +710,8 @@ MessageData::MoveField(uint32 from, uint32 to)
 	memmove(fFields + to + 1, fFields + to, (from - to) * sizeof(MessageField));
 	fFields[to] = moved;
 	_Changed();
+	fStoreIsBody = false;
+	fBodySize = 0;
 	if (fIndex != nullptr)
 		_BuildIndex();
 }
@@ -732,6 +749,9 @@ MessageData::FlatSize() const
 		return known;
 
 	size_t size = kR5HeaderSize + 1;
+	size_t bodySize;
+	if (_Body(&bodySize) != nullptr)
+		return size + bodySize;
 	for (uint32 i = 0; i < fCount; i++) {
 		const MessageField& field = fFields[i];
 		if (field.Has(MessageField::kCompact)) {
@@ -739,10 +759,13 @@ MessageData::FlatSize() const
 			continue;
 		}
 		const size_t bytes = padded_field_size(*this, field);
-		size += _HeaderLength(field, field.count, bytes) + min_c(field.nameLength, 255) + bytes;
+		size += r5_field_header_length(field.count, bytes, B_R5_FORM) + min_c(field.nameLength, 255)
+			+ bytes;
 	}
-	if (size <= UINT32_MAX)
+	if (size <= UINT32_MAX) {
+		fHasDerived.store(true, std::memory_order_relaxed);
 		fFlatSize.store(uint32(size), std::memory_order_relaxed);
+	}
 	return size;
 }
 
@@ -771,11 +794,28 @@ MessageData::IsPlain() const
 }
 
 
+bool
+MessageData::IsBetterCopied() const
+{
+	constexpr size_t kLargestCopied = 65536;
+	constexpr uint8 kMostCopies = 2;
+	size_t size;
+	return fNote == nullptr && fCopies < kMostCopies && _Body(&size) != nullptr
+		&& size <= kLargestCopied && IsPlain();
+}
+
+
 // Neighbouring fields that lie as the form wants them are copied together.
 uint8*
 MessageData::WritePlain(uint32 what, uint8* to) const
 {
 	to = write_r5_header(to, FlatSize(), what);
+	size_t bodySize;
+	if (const uint8* body = _Body(&bodySize)) {
+		to = append_bytes(to, body, body + bodySize);
+		*to++ = 0;
+		return to;
+	}
 	const uint8* run = nullptr;
 	const uint8* runEnd = nullptr;
 	for (uint32 i = 0; i < fCount; i++) {
@@ -813,16 +853,36 @@ MessageData::WritePlain(uint32 what, uint8* to) const
 // #pragma mark - private
 
 
+MessageData*
+MessageData::_CreateWithRoom(uint32 fields)
+{
+	void* block = malloc(sizeof(MessageData) + fields * sizeof(MessageField));
+	if (block == nullptr)
+		return nullptr;
+	MessageData* data = new (block) MessageData;
+	data->fFields = reinterpret_cast<MessageField*>(data + 1);
+	data->fFieldRoom = fields;
+	return data;
+}
+
+
 // What was derived from the fields no longer holds.
-void
+inline void
 MessageData::_Changed()
 {
+	if (fHasDerived.load(std::memory_order_relaxed))
+		_ForgetDerived();
+}
+
+
+void
+MessageData::_ForgetDerived()
+{
+	fHasDerived.store(false, std::memory_order_relaxed);
 	fFlatSize.store(0, std::memory_order_relaxed);
-	fPlain.store(-1, std::memory_order_relaxed);
-	if (fNames.load(std::memory_order_relaxed) != nullptr)
-		free(fNames.exchange(nullptr, std::memory_order_relaxed));
-	if (fFlat.load(std::memory_order_relaxed) != nullptr)
-		fFlat.exchange(nullptr, std::memory_order_relaxed)->Release();
+	free(fNames.exchange(nullptr, std::memory_order_relaxed));
+	if (SharedBytes* flat = fFlat.exchange(nullptr, std::memory_order_relaxed))
+		flat->Release();
 }
 
 
@@ -832,13 +892,15 @@ MessageData::_ReserveFields(uint32 count)
 	const uint32 needed = fCount + count;
 	if (needed <= fFieldRoom)
 		return true;
-	const uint32 room = fFieldRoom == 0 && count > 1 ? needed : max_c(needed, fFieldRoom * 2);
-	const uint32 least = fFieldRoom == 0 && count == 1 ? 8 : room;
-	void* fields = realloc(fFields, max_c(room, least) * sizeof(MessageField));
+	const uint32 room = max_c(needed, fFieldRoom * 2);
+	const bool isBehind = fFields == reinterpret_cast<MessageField*>(this + 1);
+	void* fields = realloc(isBehind ? nullptr : fFields, room * sizeof(MessageField));
 	if (fields == nullptr)
 		return false;
+	if (isBehind)
+		memcpy(fields, fFields, fCount * sizeof(MessageField));
 	fFields = static_cast<MessageField*>(fields);
-	fFieldRoom = max_c(room, least);
+	fFieldRoom = room;
 	return true;
 }
 
@@ -862,28 +924,24 @@ MessageData::_ReserveStore(size_t size)
 }
 
 
-// Enters a new last field into the index, which is made when there are many.
+// Enters a field, which is already counted, into the index; that is made when there are many.
 void
-MessageData::_Index(uint32 number)
+MessageData::_AddToIndex(uint32 number)
 {
-	if (fIndex == nullptr) {
-		// Without memory for an index the look-up stays a walk.
-		if (fCount > kFewFields)
-			_BuildIndex();
+	if (fIndex == nullptr && number < kFewFields)
 		return;
-	}
-	if ((fCount + 1) * 2 > fIndexMask) {
+	if (fIndex == nullptr || (number + 1) * 2 > fIndexMask) {
+		// Without memory for an index the look-up becomes a walk.
 		_BuildIndex();
 		return;
 	}
 
 	const MessageField& field = fFields[number];
-	uint32 slot = field.hash & fIndexMask;
+	const char* name = NameBytes(field);
+	uint32 slot = hash_name(name, field.nameLength) & fIndexMask;
 	while (fIndex[slot] != 0) {
-		const MessageField& other = fFields[fIndex[slot] - 1];
 		// Of two fields of one name the first is found; the other needs no entry.
-		if (other.hash == field.hash && other.nameLength == field.nameLength
-			&& memcmp(NameBytes(other), NameBytes(field), field.nameLength) == 0)
+		if (_IsNamed(fFields[fIndex[slot] - 1], name, field.nameLength, field.key))
 			return;
 		slot = (slot + 1) & fIndexMask;
 	}
@@ -894,7 +952,7 @@ MessageData::_Index(uint32 number)
 bool
 MessageData::_BuildIndex()
 {
-	uint32 slots = 32;
+	uint32 slots = 64;
 	while (slots < fCount * 4)
 		slots *= 2;
 	free(fIndex);
@@ -903,23 +961,16 @@ MessageData::_BuildIndex()
 		return false;
 	fIndexMask = slots - 1;
 	for (uint32 i = 0; i < fCount; i++)
-		_Index(i);
+		_AddToIndex(i);
 	return true;
 }
 
 
-// Of the compact form, without the name.
-uint32
-MessageData::_HeaderLength(const MessageField&, uint32 count, size_t size) const
+inline bool
+MessageData::_IsNamed(const MessageField& field, const char* name, size_t length, uint32 key) const
 {
-	return r5_field_header_length(count, size, B_R5_FORM);
-}
-
-
-void
-MessageData::_WriteHeader(const MessageField& field)
-{
-	write_r5_field_head(fStore + field.start, field, field.size, B_R5_FORM);
+	return field.key == key && field.nameLength == length
+		&& memcmp(NameBytes(field), name, length) == 0;
 }
 
 
@@ -932,13 +983,14 @@ MessageData::_IsAtEnd(const MessageField& field) const
 
 
 status_t
-MessageData::_AppendFixed(MessageField& field, const void* data, size_t size)
+MessageData::_AppendFixed(MessageField& field, const ItemContents& item)
 {
+	const size_t size = item.size;
 	if (_IsAtEnd(field)) {
 		const status_t status = _Lengthen(field, uint32(size));
 		if (status != B_OK)
 			return status;
-		memcpy(fStore + fStoreSize, data, size);
+		memcpy(fStore + fStoreSize, item.data, size);
 		fStoreSize += uint32(size);
 		field.capacity = field.size;
 		return B_OK;
@@ -947,23 +999,24 @@ MessageData::_AppendFixed(MessageField& field, const void* data, size_t size)
 		if (!_OwnFixed(field, (field.size + size) * 2))
 			return B_NO_MEMORY;
 	}
-	memcpy(fStore + field.data + field.size, data, size);
+	memcpy(fStore + field.data + field.size, item.data, size);
 	field.size += uint32(size);
 	field.count++;
+	fStoreIsBody = false;
 	field.flags &= uint16(~(MessageField::kCompact | MessageField::kWide));
 	return B_OK;
 }
 
 
 status_t
-MessageData::_AppendVariable(MessageField& field, const void* data, size_t size)
+MessageData::_AppendVariable(MessageField& field, const ItemContents& item)
 {
-	const size_t bytes = padded_item_size(size);
+	const size_t bytes = padded_item_size(item.size);
 	if (field.size + bytes > kLargestStore)
 		return B_NO_MEMORY;
 	if (!_IsAtEnd(field)) {
 		uint32 offset;
-		if (!_Scatter(field, field.count + 1) || !_PutItem(data, size, &offset))
+		if (!_Scatter(field, field.count + 1) || !_PutItem(item, &offset))
 			return B_NO_MEMORY;
 		field.table[field.count++] = ItemPlace::InStore(offset).Word();
 		field.size += uint32(bytes);
@@ -977,7 +1030,7 @@ MessageData::_AppendVariable(MessageField& field, const void* data, size_t size)
 		return status;
 	if (field.table != nullptr)
 		field.table[field.count - 1] = ItemPlace::InStore(fStoreSize).Word();
-	put_item(fStore + fStoreSize, data, size);
+	put_item(fStore + fStoreSize, item);
 	fStoreSize += uint32(bytes);
 	return B_OK;
 }
@@ -991,8 +1044,8 @@ MessageData::_Lengthen(MessageField& field, uint32 bytes)
 	const size_t newSize = size_t(field.size) + bytes;
 	uint32 shift = 0;
 	if (field.Has(MessageField::kCompact)) {
-		shift = _HeaderLength(field, field.count + 1, newSize)
-			- _HeaderLength(field, field.count, field.size);
+		shift = r5_field_header_length(field.count + 1, newSize, B_R5_FORM)
+			- r5_field_header_length(field.count, field.size, B_R5_FORM);
 	}
 	if (!_ReserveStore(size_t(bytes) + shift))
 		return B_NO_MEMORY;
@@ -1008,7 +1061,7 @@ MessageData::_Lengthen(MessageField& field, uint32 bytes)
 	field.size = uint32(newSize);
 	field.count++;
 	if (field.Has(MessageField::kCompact)) {
-		_WriteHeader(field);
+		write_r5_field_head(fStore + field.start, field, field.size, B_R5_FORM);
 		const bool mini = field.size <= 255 && field.count <= 255;
 		field.flags &= uint16(~MessageField::kWide);
 		field.flags |= mini ? 0 : MessageField::kWide;
@@ -1025,6 +1078,8 @@ MessageData::_OwnFixed(MessageField& field, size_t capacity)
 		return true;
 	if (!_ReserveStore(capacity))
 		return false;
+	fStoreIsBody = false;
+	fBodySize = 0;
 	memcpy(fStore + fStoreSize, Base(field) + field.data, field.size);
 	if (!field.Has(MessageField::kInSource))
 		fWaste += field.capacity;
@@ -1073,6 +1128,8 @@ MessageData::_Scatter(MessageField& field, uint32 room)
 		return false;
 	if (field.Has(MessageField::kScattered))
 		return true;
+	fStoreIsBody = false;
+	fBodySize = 0;
 	field.size = uint32(padded_field_size(*this, field));
 	field.flags &= uint16(~(MessageField::kCompact | MessageField::kWide | MessageField::kPacked));
 	field.flags |= MessageField::kScattered;
@@ -1081,21 +1138,32 @@ MessageData::_Scatter(MessageField& field, uint32 room)
 
 
 bool
-MessageData::_PutItem(const void* data, size_t size, uint32* _offset)
+MessageData::_PutItem(const ItemContents& item, uint32* _offset)
 {
-	if (!_ReserveStore(padded_item_size(size)))
+	if (!_ReserveStore(padded_item_size(item.size)))
 		return false;
-	put_item(fStore + fStoreSize, data, size);
+	fStoreIsBody = false;
+	put_item(fStore + fStoreSize, item);
 	*_offset = fStoreSize;
-	fStoreSize += uint32(padded_item_size(size));
+	fStoreSize += uint32(padded_item_size(item.size));
 	return true;
 }
 
 
+// A message that is added is plain or not; bytes that are added for one can be anything.
 void
-MessageData::_AddHeight(const MessageData& nested)
+MessageData::_NoteNested(type_code type, const ItemContents& item)
 {
-	fHeight = int16(max_c(int32(fHeight), nested.Height() + 1));
+	if (type != B_MESSAGE_TYPE)
+		return;
+	if (item.message == nullptr) {
+		fPlain.store(-1, std::memory_order_relaxed);
+		return;
+	}
+	if (!item.message->IsPlain())
+		fPlain.store(-1, std::memory_order_relaxed);
+	fHeight = int16(max_c(int32(fHeight), item.message->Height() + 1));
+	fCopies = uint8(max_c(int32(fCopies), item.message->fCopies + 1));
 }
 
 
@@ -1106,23 +1174,42 @@ MessageData::_CompactStore()
 	if (fWaste < 4096 || fWaste < fStoreSize / 2)
 		return;
 
-	MessageData packed;
+	MessageData* packed = _CreateWithRoom(fCount);
+	if (packed == nullptr)
+		return;
 	for (uint32 i = 0; i < fCount; i++) {
 		// Without memory everything stays as it was, only larger than it need be.
-		if (packed.CopyField(*this, i) != B_OK)
+		if (packed->CopyField(*this, i) != B_OK) {
+			packed->Release();
 			return;
+		}
 	}
-	std::swap(fFields, packed.fFields);
-	std::swap(fCount, packed.fCount);
-	std::swap(fFieldRoom, packed.fFieldRoom);
-	std::swap(fIndex, packed.fIndex);
-	std::swap(fIndexMask, packed.fIndexMask);
-	std::swap(fSource, packed.fSource);
-	std::swap(fSourceBase, packed.fSourceBase);
-	std::swap(fStore, packed.fStore);
-	std::swap(fStoreSize, packed.fStoreSize);
-	std::swap(fStoreRoom, packed.fStoreRoom);
+	for (uint32 i = 0; i < fCount; i++)
+		std::swap(fFields[i], packed->fFields[i]);
+	std::swap(fIndex, packed->fIndex);
+	std::swap(fIndexMask, packed->fIndexMask);
+	std::swap(fSource, packed->fSource);
+	std::swap(fSourceBase, packed->fSourceBase);
+	std::swap(fStore, packed->fStore);
+	std::swap(fStoreSize, packed->fStoreSize);
+	std::swap(fStoreRoom, packed->fStoreRoom);
+	fStoreIsBody = packed->fStoreIsBody;
 	fWaste = 0;
+	packed->Release();
+}
+
+
+// All fields as the compact form has them, or NULL when they are not in one piece.
+const uint8*
+MessageData::_Body(size_t* _size) const
+{
+	if (fStoreIsBody) {
+		*_size = fStoreSize;
+		// An empty store has no place, but its emptiness is in one piece.
+		return fStore != nullptr ? fStore : reinterpret_cast<const uint8*>("");
+	}
+	*_size = fBodySize;
+	return fBodySize > 0 ? fSourceBase + fFields[0].start : nullptr;
 }
 
 

@@ -2,6 +2,7 @@
 #pragma once
 
 #include <atomic>
+#include <cstdlib>
 #include <cstring>
 
 #include <MessageForm.h>
@@ -12,6 +13,7 @@
 namespace BPrivate {
 
 class ManagedNote;
+class MessageData;
 
 
 // A field's items lie in the message's own store, or in the bytes that the message was read from.
@@ -36,7 +38,7 @@ struct MessageField {
 	uint32 count;
 	uint32 capacity; // bytes that the data may take where they are, in the store
 	type_code type;
-	uint32 hash;
+	uint32 key; // of the name, see name_key()
 	uint64* table; // where each variable item is, see ItemPlace; NULL when they are few
 	uint16 nameLength;
 	uint16 flags;
@@ -69,13 +71,22 @@ private:
 };
 
 
+// What an item is made of: bytes, or a message that is to be written as bytes.
+struct ItemContents {
+	const void* data;
+	size_t size;
+	const MessageData* message = nullptr;
+};
+
+
 // The owner of the only reference may change it; all others only read, from any thread.
 class MessageData {
 public:
 	static MessageData* Create(); // NULL without memory
-	// Takes over a reference to the source. The fields are copied, tables and all.
+	// Takes over a reference to the source and the tables of the fields. When all fields lie one
+	// after another in the compact form, bodySize is the sum of their bytes, else 0.
 	static MessageData* CreateFrom(SharedBytes* source, const uint8* base,
-		const MessageField* fields, uint32 count, int32 level);
+		const MessageField* fields, uint32 count, int32 level, uint32 bodySize);
 	MessageData* Clone() const;
 
 	void Acquire() { fReferences.fetch_add(1, std::memory_order_relaxed); }
@@ -89,7 +100,7 @@ public:
 	uint32 CountFields() const { return fCount; }
 	const MessageField& FieldAt(uint32 index) const { return fFields[index]; }
 	int32 Find(const char* name) const; // -1; the first of several with one name
-	int32 Find(const char* name, size_t length, uint32 hash) const;
+	int32 Find(const char* name, size_t length) const;
 	const char* NameBytes(const MessageField& field) const; // without a NUL
 	const char* NameAt(uint32 index) const; // with one; valid until a change; NULL without memory
 
@@ -103,11 +114,11 @@ public:
 
 	// Changes, by the only owner. Sizes are not 0, types have been checked.
 	status_t AddField(
-		const char* name, size_t length, type_code type, bool fixed, const void* data, size_t size);
-	status_t AddItem(uint32 field, const void* data, size_t size);
+		const char* name, size_t length, type_code type, bool fixed, const ItemContents& item);
+	status_t AddItem(uint32 field, const ItemContents& item);
 	status_t AddMessageField(const char* name, size_t length, type_code type, MessageData* data);
 	status_t AddMessageItem(uint32 field, MessageData* data);
-	status_t ReplaceItem(uint32 field, uint32 index, const void* data, size_t size);
+	status_t ReplaceItem(uint32 field, uint32 index, const ItemContents& item);
 	status_t ReplaceMessage(uint32 field, uint32 index, MessageData* data);
 	status_t RemoveItem(uint32 field, uint32 index);
 	void RemoveField(uint32 field);
@@ -127,6 +138,9 @@ public:
 	// message of another form lies somewhere in it.
 	size_t FlatSize() const;
 	bool IsPlain() const; // no such item
+	// Whether it should go into another message as bytes. Small messages do, so that a tree is
+	// written in few pieces; but no byte is copied more than a few times on its way to the root.
+	bool IsBetterCopied() const;
 	uint8* WritePlain(uint32 what, uint8* to) const;
 
 	ManagedNote* Note() const { return fNote; }
@@ -145,48 +159,53 @@ public:
 private:
 	MessageData() = default;
 	~MessageData();
+	void operator delete(void* block) { free(block); }
 
+	static MessageData* _CreateWithRoom(uint32 fields);
 	void _Changed();
+	void _ForgetDerived();
 	bool _ReserveFields(uint32 count);
 	bool _ReserveStore(size_t size);
-	MessageField* _NewField(const char* name, size_t length, type_code type);
-	void _Index(uint32 field);
+	void _AddToIndex(uint32 field);
 	bool _BuildIndex();
-	uint32 _HeaderLength(const MessageField& field, uint32 count, size_t size) const;
-	void _WriteHeader(const MessageField& field);
+	bool _IsNamed(const MessageField& field, const char* name, size_t length, uint32 key) const;
 	bool _IsAtEnd(const MessageField& field) const;
-	status_t _AppendFixed(MessageField& field, const void* data, size_t size);
-	status_t _AppendVariable(MessageField& field, const void* data, size_t size);
+	status_t _AppendFixed(MessageField& field, const ItemContents& item);
+	status_t _AppendVariable(MessageField& field, const ItemContents& item);
 	status_t _Lengthen(MessageField& field, uint32 bytes);
 	bool _OwnFixed(MessageField& field, size_t capacity);
 	bool _MakeTable(MessageField& field, uint32 room);
 	bool _Scatter(MessageField& field, uint32 room);
-	bool _PutItem(const void* data, size_t size, uint32* _offset);
-	void _AddHeight(const MessageData& nested);
+	bool _PutItem(const ItemContents& item, uint32* _offset);
+	void _NoteNested(type_code type, const ItemContents& item);
 	void _CompactStore();
-	bool _CompactInto(MessageData& target) const;
 	void _ReleaseTable(MessageField& field);
+	const uint8* _Body(size_t* _size) const;
 
 	std::atomic<int32> fReferences { 1 };
 	uint32 fWhat = 0;
-	MessageField* fFields = nullptr;
+	MessageField* fFields = nullptr; // at first behind this object, in the same block
 	uint32 fCount = 0;
 	uint32 fFieldRoom = 0;
 	uint32* fIndex = nullptr; // slots of field numbers + 1; NULL while there are few fields
 	uint32 fIndexMask = 0;
-	int16 fLevel = 0;
-	int16 fHeight = 0;
+	uint32 fBodySize = 0; // of the source's fields, when they are all there is, as they are
 	SharedBytes* fSource = nullptr;
 	const uint8* fSourceBase = nullptr;
 	uint8* fStore = nullptr;
 	uint32 fStoreSize = 0;
 	uint32 fStoreRoom = 0;
 	uint32 fWaste = 0; // bytes of the store that no field uses any more
-	ManagedNote* fNote = nullptr;
+	int16 fLevel = 0;
+	int16 fHeight = 0;
+	bool fStoreIsBody = true; // the store holds all fields one after another in the compact form
+	uint8 fCopies = 0; // how often the bytes of messages in it have been copied
+	mutable std::atomic<int8> fPlain { 1 }; // -1: not known
+	mutable std::atomic<bool> fHasDerived { false }; // one of the following is set
 	mutable std::atomic<uint32> fFlatSize { 0 }; // 0: not known
-	mutable std::atomic<int8> fPlain { -1 }; // -1: not known
 	mutable std::atomic<SharedBytes*> fFlat { nullptr }; // for those who want the bytes of an item
 	mutable std::atomic<char*> fNames { nullptr }; // all names with their NULs
+	ManagedNote* fNote = nullptr;
 };
 
 
@@ -214,7 +233,15 @@ write_uint32(void* to, uint32 value)
 }
 
 
-uint32 hash_name(const char* name, size_t length);
+// Tells most names apart at a glance.
+inline uint32
+name_key(const char* name, size_t length)
+{
+	if (length == 0)
+		return 0;
+	return uint32(length) << 24 | uint32(uint8(name[0])) << 16
+		| uint32(uint8(name[length / 2])) << 8 | uint8(name[length - 1]);
+}
 
 
 } // namespace BPrivate

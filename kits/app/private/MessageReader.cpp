@@ -36,6 +36,24 @@ swap_if(uint32 value, bool swapped)
 }
 
 
+// Names are short, so this is quicker than a call.
+bool
+has_zero(const char* bytes, size_t length)
+{
+	constexpr uint64 kOnes = 0x0101010101010101;
+	uint64 zeros = 0;
+	for (; length >= 8; bytes += 8, length -= 8) {
+		uint64 word;
+		memcpy(&word, bytes, 8);
+		zeros |= (word - kOnes) & ~word & kOnes << 7;
+	}
+	uint32 rest = 0;
+	for (; length > 0; bytes++, length--)
+		rest |= *bytes == 0 ? 1 : 0;
+	return zeros != 0 || rest != 0;
+}
+
+
 // Types that the Dano form stores alone without saying whether their size is fixed.
 bool
 is_fixed_in_dano(type_code type)
@@ -143,6 +161,22 @@ MessageReader::Read()
 }
 
 
+inline uint16
+MessageReader::_Number16(const uint8* from) const
+{
+	uint16 value;
+	memcpy(&value, from, sizeof(value));
+	return fSwapped ? __builtin_bswap16(value) : value;
+}
+
+
+inline uint32
+MessageReader::_Number32(const uint8* from) const
+{
+	return swap_if(read_uint32(from), fSwapped);
+}
+
+
 // #pragma mark - the R5 form
 
 
@@ -161,6 +195,8 @@ MessageReader::_ReadR5()
 		return nullptr;
 	}
 
+	const size_t start = position;
+	fIsCompact = true;
 	Field field;
 	while (position < fSize && (fBytes[position] & kR5Valid) != 0) {
 		if (!_ReadR5Field(&position, &field) || !_Take(field))
@@ -170,6 +206,7 @@ MessageReader::_ReadR5()
 		_Fail(B_BAD_VALUE, fSize, "the fields do not end before the message does");
 		return nullptr;
 	}
+	fBodySize = uint32(position - start);
 	return _Finish();
 }
 
@@ -233,6 +270,7 @@ MessageReader::_ReadR5Field(size_t* position, Field* field)
 		field->flags |= mini == fitsMini ? MessageField::kCompact : 0;
 		field->flags |= mini ? 0 : MessageField::kWide;
 	}
+	fIsCompact = fIsCompact && (field->flags & MessageField::kCompact) != 0;
 	*position = size_t(at - fBytes) + field->size;
 	return true;
 }
@@ -420,7 +458,7 @@ MessageReader::_Take(const Field& field)
 {
 	if (field.count == 0 || field.size == 0)
 		return _Fail(B_BAD_VALUE, field.start, "the field has no items");
-	if (memchr(field.name, 0, field.nameLength) != nullptr)
+	if (has_zero(field.name, field.nameLength))
 		return _Fail(B_BAD_VALUE, field.start, "the field's name has an end inside it");
 	if (field.fixed && field.size % field.count != 0)
 		return _Fail(B_BAD_VALUE, field.data, "the items do not divide the field's data evenly");
@@ -434,7 +472,7 @@ MessageReader::_Take(const Field& field)
 bool
 MessageReader::_TakeReference(const Field& field)
 {
-	MessageField taken;
+	MessageField& taken = _NextField();
 	taken.name = uint32(reinterpret_cast<const uint8*>(field.name) - fBytes);
 	taken.start = uint32(field.start - fBytes);
 	taken.data = uint32(field.data - fBytes);
@@ -442,7 +480,7 @@ MessageReader::_TakeReference(const Field& field)
 	taken.count = field.count;
 	taken.capacity = 0;
 	taken.type = field.type;
-	taken.hash = hash_name(field.name, field.nameLength);
+	taken.key = name_key(field.name, field.nameLength);
 	taken.table = nullptr;
 	taken.nameLength = uint16(field.nameLength);
 	taken.flags = field.flags | MessageField::kInSource | MessageField::kNameInSource
@@ -460,16 +498,23 @@ MessageReader::_TakeReference(const Field& field)
 		}
 	}
 
-	constexpr uint32 kFew = sizeof(fFewFields) / sizeof(fFewFields[0]);
-	if (fFieldCount < kFew)
-		fFewFields[fFieldCount] = taken;
-	else {
-		if (fFieldCount == kFew)
-			fManyFields.assign(fFewFields, fFewFields + kFew);
-		fManyFields.push_back(taken);
-	}
 	fFieldCount++;
 	return true;
+}
+
+
+// Room for one more field, which counts when it is complete.
+inline MessageField&
+MessageReader::_NextField()
+{
+	constexpr uint32 kFew = sizeof(fFewFields) / sizeof(fFewFields[0]);
+	if (fFieldCount < kFew)
+		return fFewFields[fFieldCount];
+	if (fManyFields.empty())
+		fManyFields.assign(fFewFields, fFewFields + kFew);
+	if (fFieldCount == fManyFields.size())
+		fManyFields.resize(fFieldCount * 2);
+	return fManyFields[fFieldCount];
 }
 
 
@@ -541,9 +586,9 @@ MessageReader::_AddSwappedItem(const Field& field, bool first, const uint8* item
 		memcpy(swapped, item, size);
 		if (fSwapped)
 			swap_item(field.type, swapped, size, read_uint32(fBytes) == swap_if(kR5Magic, true));
-		status = first
-			? fBuilt->AddField(field.name, field.nameLength, field.type, field.fixed, swapped, size)
-			: fBuilt->AddItem(fBuilt->CountFields() - 1, swapped, size);
+		status = first ? fBuilt->AddField(
+					 field.name, field.nameLength, field.type, field.fixed, { swapped, size })
+					   : fBuilt->AddItem(fBuilt->CountFields() - 1, { swapped, size });
 	}
 	if (swapped != few)
 		free(swapped);
@@ -558,7 +603,8 @@ MessageReader::_Finish()
 	fBuilt = nullptr;
 	if (data == nullptr) {
 		const MessageField* fields = fManyFields.empty() ? fFewFields : fManyFields.data();
-		data = MessageData::CreateFrom(fSource, fBytes, fields, fFieldCount, fLevel);
+		data = MessageData::CreateFrom(
+			fSource, fBytes, fields, fFieldCount, fLevel, fIsCompact ? fBodySize : 0);
 		// Whatever came of it, it has taken over the source and the tables.
 		fSource = nullptr;
 		fFieldCount = 0;
@@ -584,22 +630,6 @@ MessageReader::_Fail(status_t status, size_t offset, const char* reason)
 	fStatus = status;
 	fDamage = { offset, reason };
 	return false;
-}
-
-
-uint16
-MessageReader::_Number16(const uint8* from) const
-{
-	uint16 value;
-	memcpy(&value, from, sizeof(value));
-	return fSwapped ? __builtin_bswap16(value) : value;
-}
-
-
-uint32
-MessageReader::_Number32(const uint8* from) const
-{
-	return swap_if(read_uint32(from), fSwapped);
 }
 
 

@@ -54,6 +54,7 @@ private:
 	bool _TakeSwapped(const Field& field);
 	bool _CheckItems(const Field& field, uint64* table);
 	bool _AddSwappedItem(const Field& field, bool first, const uint8* item, size_t size);
+	MessageField& _NextField();
 	MessageData* _Finish();
 	bool _Fail(status_t status, const uint8* where, const char* reason);
 	bool _Fail(status_t status, size_t offset, const char* reason);
@@ -74,6 +75,8 @@ private:
 	std::vector<MessageField> fManyFields; // all of them, when there are more
 	uint32 fFieldCount = 0;
 	MessageData* fBuilt = nullptr; // fields that had to be copied
+	bool fIsCompact = false; // so far all fields are as the compact form has them
+	uint32 fBodySize = 0; // of the fields of the R5 form
 };
 
 

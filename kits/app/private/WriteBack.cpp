@@ -8,7 +8,7 @@ int32
 WriteBack::_PlaceOf(const MessageData& target, uint32 number) const
 {
 	const MessageField& field = target.FieldAt(number);
-	return fSource->Find(target.NameBytes(field), field.nameLength, field.hash);
+	return fSource->Find(target.NameBytes(field), field.nameLength);
 }
 
 
@@ -56,7 +56,7 @@ status_t
 WriteBack::Restore(MessageData& target, uint32 sourceField, bool carried) const
 {
 	const MessageField& field = fSource->FieldAt(sourceField);
-	const int32 present = target.Find(fSource->NameBytes(field), field.nameLength, field.hash);
+	const int32 present = target.Find(fSource->NameBytes(field), field.nameLength);
 	if (present >= 0) {
 		const status_t status = target.CopyFieldOver(uint32(present), *fSource, sourceField);
 		if (status == B_OK)

@@ -255,7 +255,7 @@ TEST(ManagedArchive, SamplesComeBackExactly)
 			std::string bytes(size_t(flattened_message_size(archive, B_HAIKU_FORM)), '\0');
 			ASSERT_EQ(
 				B_OK, flatten_message(archive, B_HAIKU_FORM, bytes.data(), ssize_t(bytes.size())));
-			EXPECT_EQ(bytes, std::string(static_cast<const char*>(data), size));
+			EXPECT_TRUE(bytes == std::string(static_cast<const char*>(data), size));
 		}
 	}
 	EXPECT_LE(25, managed);

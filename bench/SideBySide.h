@@ -1,0 +1,54 @@
+// Two pieces of work measured in turns, so that both meet the same machine.
+#pragma once
+
+#include <algorithm>
+#include <chrono>
+#include <cstdio>
+#include <vector>
+
+namespace bench {
+
+
+inline double
+seconds(const auto& work, int repeats)
+{
+	const auto start = std::chrono::steady_clock::now();
+	for (int i = 0; i < repeats; i++)
+		work();
+	return std::chrono::duration<double>(std::chrono::steady_clock::now() - start).count()
+		/ repeats;
+}
+
+
+// Prints the median of nine ratios with the lowest and the highest, and returns whether the median
+// meets the goal. Each turn runs both for some milliseconds.
+inline bool
+compare(const char* what, double goal, const auto& ours, const auto& theirs)
+{
+	constexpr int kTurns = 9;
+	constexpr double kTurnSeconds = 0.03;
+	const auto repeats_for = [&](const auto& work) {
+		return std::max(1, int(kTurnSeconds / std::max(seconds(work, 1), 1e-9)));
+	};
+	ours();
+	theirs();
+	const int ourRepeats = repeats_for(ours);
+	const int theirRepeats = repeats_for(theirs);
+	std::vector<double> ratios;
+	double ourTime = 0;
+	double theirTime = 0;
+	for (int turn = 0; turn < kTurns; turn++) {
+		ourTime = seconds(ours, ourRepeats);
+		theirTime = seconds(theirs, theirRepeats);
+		ratios.push_back(ourTime / theirTime);
+	}
+	std::sort(ratios.begin(), ratios.end());
+	const double median = ratios[kTurns / 2];
+	printf("%-52s %7.3f  [%.3f .. %.3f]  goal %.2f  %s  (%.2f us / %.2f us)\n", what, median,
+		ratios.front(), ratios.back(), goal, median <= goal ? "met" : "NOT MET", ourTime * 1e6,
+		theirTime * 1e6);
+	return median <= goal;
+}
+
+
+} // namespace bench
