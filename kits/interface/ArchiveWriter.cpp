@@ -65,7 +65,7 @@ begin_archive(const ArchiveSource* source, BMessage* archive)
 	auto writeBack = std::make_unique<WriteBack>(data);
 	for (uint32 i = 0; i < data->CountFields(); i++) {
 		const MessageField& field = data->FieldAt(i);
-		const bool present = own->Find(data->NameBytes(field), field.nameLength, field.hash) >= 0;
+		const bool present = own->Find(data->NameBytes(field), field.nameLength) >= 0;
 		if (!source->IsKnownField(i) && !present)
 			writeBack->Restore(*own, i, true);
 	}
