@@ -23,7 +23,7 @@ struct RowFunctions {
 
 
 // The C library writes more than a word at a time.
-void
+inline void
 FillWords(uint32* row, int32 count, uint32 pixel)
 {
 	static_assert(sizeof(wchar_t) == sizeof(uint32));
@@ -236,9 +236,11 @@ Compositor::_FillPart(const clipping_rect& part)
 		if (!bit && LeavesClearBits(fInk.mode))
 			return;
 		if (IsConstant(fInk.mode)) {
-			const bool high = fInk.mode != B_OP_ERASE && bit;
-			for (int32 y = part.top; y <= part.bottom; y++)
-				FillWords(fSurface.Row(y) + part.left, count, high ? fInk.high : fInk.low);
+			const uint32 pixel = fInk.mode != B_OP_ERASE && bit ? fInk.high : fInk.low;
+			const int32 stride = fSurface.BytesPerRow() / sizeof(uint32);
+			uint32* row = fSurface.Row(part.top) + part.left;
+			for (int32 rows = part.bottom - part.top; rows >= 0; rows--, row += stride)
+				FillWords(row, count, pixel);
 			return;
 		}
 		for (int32 y = part.top; y <= part.bottom; y++)

@@ -53,8 +53,7 @@ PaintTask::PaintTask(Painter& painter, const pattern& pattern) :
 PaintTask::PaintTask(Painter& painter, const pattern& pattern, const Ink& ink) :
 	fPainter(painter), fState(painter.fState != nullptr ? *painter.fState : kDefaultState),
 	fInk(ink), fOutput(painter.fSurface, painter.fClip, fInk, pattern, Round(painter.fOrigin.x),
-				   Round(painter.fOrigin.y)),
-	fPenSize(std::clamp(Round(fState.Transform(fState.penSize)), 1, 10000))
+				   Round(painter.fOrigin.y))
 {
 }
 

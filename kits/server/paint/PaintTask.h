@@ -52,9 +52,9 @@ public:
 
 	// The pen in whole logical pixels, and how many of them lie before the coordinate: a pen of
 	// 2 covers c and c + 1, one of 3 covers c - 1 to c + 1.
-	int32 PenSize() const { return fPenSize; }
-	int32 PenBefore() const { return (fPenSize - 1) / 2; }
-	int32 PenAfter() const { return fPenSize / 2; }
+	int32 PenSize() const { return std::clamp(Round(fState.Transform(fState.penSize)), 1, 10000); }
+	int32 PenBefore() const { return (PenSize() - 1) / 2; }
+	int32 PenAfter() const { return PenSize() / 2; }
 
 	void FillLogical(const clipping_rect& rect);
 	// A straight line between two logical pixels, as device rectangles that do not overlap.
@@ -70,7 +70,6 @@ private:
 	const DrawState& fState;
 	Ink fInk;
 	Compositor fOutput;
-	int32 fPenSize;
 };
 
 
@@ -83,7 +82,12 @@ PaintTask::Round(float coordinate)
 	constexpr float kLimit = 1 << 26;
 	if (!(coordinate > -kLimit))
 		return coordinate <= -kLimit ? -(1 << 26) : 0;
-	return coordinate < kLimit ? (int32)floorf(coordinate + 0.5f) : 1 << 26;
+	if (coordinate >= kLimit)
+		return 1 << 26;
+	// Cutting and correcting is quicker than a call of floorf().
+	const float moved = coordinate + 0.5f;
+	const int32 cut = (int32)moved;
+	return cut > moved ? cut - 1 : cut;
 }
 
 
