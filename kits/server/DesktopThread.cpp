@@ -157,8 +157,9 @@ DesktopThread::RunOnDisplay(const std::function<void()>& task)
 	// The signal is sent when the task is let go of, run or not: a loop that ends drops its tasks,
 	// and must not leave the caller waiting.
 	struct Ender {
-		StartSignal& signal;
+		explicit Ender(StartSignal& signal) : signal(signal) {}
 		~Ender() { signal.Send(B_OK); }
+		StartSignal& signal;
 	};
 	StartSignal signal;
 	auto ender = std::make_shared<Ender>(signal);
