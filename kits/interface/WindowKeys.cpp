@@ -8,6 +8,7 @@
 #include <AppDefs.h>
 #include <Application.h>
 #include <Control.h>
+#include <MenuField.h>
 #include <Message.h>
 
 #include "interface/private/MenuBarKeys.h"
@@ -70,8 +71,10 @@ is_navigable(const BView* view)
 {
 	if ((view->Flags() & B_NAVIGABLE) == 0)
 		return false;
-	const BControl* control = dynamic_cast<const BControl*>(view);
-	return control == nullptr || control->IsEnabled();
+	if (const BControl* control = dynamic_cast<const BControl*>(view))
+		return control->IsEnabled();
+	const BMenuField* field = dynamic_cast<const BMenuField*>(view);
+	return field == nullptr || field->IsEnabled();
 }
 
 } // namespace
