@@ -309,6 +309,8 @@ DesktopThread::Show(const WindowReference& window, bool show)
 			Expect(kAnyWindow, BackendEvent::Type::WindowActivated);
 	}
 	window->native->SetShown(show);
+	if (window->IsMenu())
+		fPointer->UpdateGrab();
 	if (!show)
 		fPolicy->WindowHidden(window);
 	fPointer->WindowsRearranged();
@@ -414,8 +416,11 @@ DesktopThread::HandleEvent(const BackendEvent& event)
 			break;
 
 		case Type::WindowShown:
-			if (WindowReference window = Find(event.window))
+			if (WindowReference window = Find(event.window)) {
 				Settle(window->Id(), Type::WindowShown);
+				if (window->IsMenu())
+					fPointer->UpdateGrab();
+			}
 			break;
 
 		case Type::CloseRequested:

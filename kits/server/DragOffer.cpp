@@ -113,7 +113,8 @@ make_foreign_drag(const BMessage& data)
 		}
 	}
 	// Files are not text, though many programs offer their addresses as such.
-	if (message->what == B_MIME_DATA && data.FindData(kPlainText, B_MIME_TYPE, &bytes, &size) == B_OK)
+	if (message->what == B_MIME_DATA
+		&& data.FindData(kPlainText, B_MIME_TYPE, &bytes, &size) == B_OK)
 		message->AddData(kPlainText, B_MIME_TYPE, bytes, size, false);
 	return message;
 }

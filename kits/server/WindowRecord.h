@@ -69,6 +69,7 @@ public:
 	std::unique_ptr<BackendWindow> native;
 	BRect reportedFrame;
 	std::vector<uint32> subset; // ids of the windows that it is modal or floating for
+	uint32 owner = 0; // id of the window that it stays above; 0 for none
 	int64 shownSerial = 0; // the later shown, the larger
 	bool nativeShown = false;
 	bool hasCursor = false;

@@ -175,7 +175,13 @@ QtBackend::event(QEvent* event)
 BRect
 QtBackend::ScreenFrame() const
 {
-	return FromQt(QGuiApplication::primaryScreen()->geometry());
+	// Only what is on it as a whole.
+	const QRect screen = QGuiApplication::primaryScreen()->geometry();
+	const float factor = fRatio / fScale;
+	const float left = std::ceil(static_cast<float>(screen.x()) * factor);
+	const float top = std::ceil(static_cast<float>(screen.y()) * factor);
+	return BRect(left, top, left + std::floor(static_cast<float>(screen.width()) * factor) - 1,
+		top + std::floor(static_cast<float>(screen.height()) * factor) - 1);
 }
 
 

@@ -89,11 +89,12 @@ QtBackend::SetPointerGrab(BackendWindow* window)
 	auto* wanted = static_cast<QtWindow*>(window);
 	if (wanted == fGrabbing)
 		return;
-	if (fGrabbing != nullptr)
+	// A window that is not on the screen yet cannot have it; it is asked for again when it is.
+	if (wanted != nullptr && !wanted->setMouseGrabEnabled(true))
+		return;
+	if (wanted == nullptr)
 		fGrabbing->setMouseGrabEnabled(false);
 	fGrabbing = wanted;
-	if (fGrabbing != nullptr)
-		fGrabbing->setMouseGrabEnabled(true);
 }
 
 

@@ -53,8 +53,10 @@ WindowPolicy::Activated(const WindowReference& window)
 			other->inFront = other == window;
 		window->active = true;
 		window->Deliver(ActivationMessage(true));
-		if (!window->IsModal() && !window->IsFloating())
+		if (!window->IsModal() && !window->IsFloating()) {
 			fLastNormal = window;
+			fDesktop.UpdateOwners();
+		}
 	}
 	if ((before == nullptr) != (window == nullptr))
 		fDesktop.PostToApplication(ActivationMessage(window != nullptr));
@@ -138,8 +140,14 @@ WindowPolicy::OwnerOf(const WindowReference& window) const
 				return main->native.get();
 		}
 	}
+	// It stays with the one that it was opened for as long as that is there.
+	const WindowReference owner = fDesktop.Find(window->owner);
+	if (owner != nullptr && owner->nativeShown)
+		return owner->native.get();
+	window->owner = 0;
 	if (fLastNormal == nullptr || !fLastNormal->nativeShown || fLastNormal == window)
 		return nullptr;
+	window->owner = fLastNormal->Id();
 	return fLastNormal->native.get();
 }
 

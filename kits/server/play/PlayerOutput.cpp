@@ -42,7 +42,7 @@ void
 Player::_Tree(PlayTokenReader& reader)
 {
 	if (reader.AtEnd()) {
-		_Print(tree_of(fFinder.Describe(fFinder.DefaultWindow().id)));
+		_Print(tree_of(fFinder.DescribeWindow(fFinder.DefaultWindow()).node));
 		return;
 	}
 	const ViewPath path = ViewPath::Read(reader);
@@ -57,7 +57,7 @@ Player::_Property(PlayTokenReader& reader, std::string* _described)
 {
 	const ViewPath path = ViewPath::Read(reader);
 	const std::string property = reader.TakeText("a property");
-	FoundView found = fFinder.Find(path);
+	const FoundView found = fFinder.Find(path);
 	*_described = path.source + ' ' + property;
 	if (property == "pixel") {
 		const std::string at = reader.TakeText("a point X,Y");
@@ -68,13 +68,6 @@ Player::_Property(PlayTokenReader& reader, std::string* _described)
 		return text_of_color(color_at(picture, 0, 0));
 	}
 
-	if (found.isWindow) {
-		found.node.label = found.window.title;
-		found.node.className = found.window.className;
-		found.node.frame = found.window.frame;
-		found.node.focus = found.window.active;
-		found.node.hidden = !found.window.shown;
-	}
 	std::string value;
 	if (!property_of(found.node, property, &value))
 		throw PlayError { "a property", property };

@@ -232,6 +232,19 @@ ViewFinder::Describe(uint32 window)
 }
 
 
+FoundView
+ViewFinder::DescribeWindow(const WindowNode& window)
+{
+	FoundView found { window, Describe(window.id), nullptr, true };
+	found.node.className = window.className;
+	found.node.label = window.title;
+	found.node.frame = window.frame;
+	found.node.focus = window.active;
+	found.node.hidden = !window.shown;
+	return found;
+}
+
+
 std::optional<FoundView>
 ViewFinder::Look(const ViewPath& path)
 {
@@ -248,7 +261,7 @@ ViewFinder::Look(const ViewPath& path)
 		found.window = DefaultWindow();
 	}
 
-	found.node = Describe(found.window.id);
+	found = DescribeWindow(found.window);
 	found.isWindow = next == path.steps.size();
 	for (; next < path.steps.size(); next++) {
 		std::vector<const ViewNode*> matches;

@@ -56,6 +56,8 @@ public:
 	WindowNode DefaultWindow(); // the active one, or else the newest that is shown; throws
 	WindowNode WindowNamed(const std::string& title); // throws
 	ViewNode Describe(uint32 window); // throws
+	// The same, with what the window is.
+	FoundView DescribeWindow(const WindowNode& window); // throws
 
 	// The item of that label in the menu that was opened last of those that have it.
 	std::optional<FoundView> LookMenuItem(const std::string& label);
