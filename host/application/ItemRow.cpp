@@ -64,7 +64,7 @@ DrawColumn(BView* owner, const BString& text, float left, float right, float bas
 const ItemRow::Columns ItemRow::kColumns = { 6, 58, 108, 258, 320 };
 
 
-ItemRow::ItemRow(const BResourceItem* item)
+ItemRow::ItemRow(const BResourceItem* item) : BStringItem("")
 {
 	SetTo(item);
 }
@@ -88,6 +88,7 @@ ItemRow::SetTo(const BResourceItem* item)
 	fSize.SetTo("");
 	fSize << static_cast<uint64>(item->Size());
 	fPreview = PreviewOf(item);
+	SetText((BString(fType) << ":" << fID).String());
 }
 
 

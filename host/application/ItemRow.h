@@ -11,7 +11,8 @@ class BResourceItem;
 }
 
 
-class ItemRow : public BListItem {
+// Its text is TYPE:ID, as the command line writes it; scripts find the row by it.
+class ItemRow : public BStringItem {
 public:
 	// Where the columns start, in pixels from the left edge of the list.
 	struct Columns {
