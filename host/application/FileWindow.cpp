@@ -49,9 +49,6 @@ FileWindow::FileWindow(BRect frame, std::unique_ptr<ResourceDocument> document) 
 
 FileWindow::~FileWindow()
 {
-	for (int32 i = 0; i < fList->CountItems(); i++)
-		delete fList->ItemAt(i);
-	fList->MakeEmpty();
 }
 
 
@@ -132,9 +129,13 @@ FileWindow::QuitRequested()
 }
 
 
+// The rows are ours; the list goes with the window's views.
 void
 FileWindow::Quit()
 {
+	while (BListItem* row = fList->RemoveItem(static_cast<int32>(0)))
+		delete row;
+
 	BMessage closed(kFileWindowClosed);
 	closed.AddPointer("window", this);
 	be_app->PostMessage(&closed);

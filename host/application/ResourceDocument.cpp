@@ -11,6 +11,19 @@
 
 using namespace BResEditor;
 
+namespace {
+
+
+status_t
+AddItemTo(BResources& resources, const BResourceItem& item)
+{
+	const void* data = item.Size() > 0 ? item.Data() : "";
+	return resources.AddResource(item.Type(), item.ID(), data, item.Size(), item.Name());
+}
+
+
+} // namespace
+
 
 class ResourceDocument::ReadAccess {
 public:
@@ -122,8 +135,7 @@ ResourceDocument::SaveAs(const char* path)
 	status = resources.SetTo(&file, true);
 	for (int32 i = 0; status == B_OK && i < CountItems(); i++) {
 		const BResourceItem* item = Item(HandleAt(i));
-		status = resources.AddResource(
-			item->Type(), item->ID(), item->Data(), item->Size(), item->Name());
+		status = AddItemTo(resources, *item);
 	}
 	if (status == B_OK)
 		status = resources.Sync();
@@ -338,7 +350,8 @@ ResourceDocument::_PresentItems() const
 }
 
 
-// Only what differs is touched, so that everything else in the file stays as it is.
+// Only what differs is touched, so that everything else in the file stays as it is. Items keep
+// their places; new ones follow in the document's order.
 status_t
 ResourceDocument::_WriteDifferences(const char* path, const SavedItems& present)
 {
@@ -355,15 +368,56 @@ ResourceDocument::_WriteDifferences(const char* path, const SavedItems& present)
 		if (present.find(key) == present.end())
 			resources.RemoveResource(key.first, key.second);
 	}
-	for (const auto& [key, item] : present) {
-		auto saved = fSaved.find(key);
-		if (saved != fSaved.end() && saved->second.name == item.name
-			&& saved->second.data == item.data)
-			continue;
-		status = resources.AddResource(
-			key.first, key.second, item.data.data(), item.data.size(), item.name.String());
-		if (status != B_OK)
-			return status;
+	status = _WriteChanged(resources, present);
+	for (int32 i = 0; status == B_OK && i < CountItems(); i++) {
+		const BResourceItem* item = Item(HandleAt(i));
+		const ItemKey key(item->Type(), item->ID());
+		if (!resources.HasResource(key.first, key.second) && _HasChanged(key, present))
+			status = AddItemTo(resources, *item);
 	}
-	return resources.Sync();
+	return status == B_OK ? resources.Sync() : status;
+}
+
+
+// What is added goes to the end. So from the first item that changes on, all are added again.
+status_t
+ResourceDocument::_WriteChanged(BResources& resources, const SavedItems& present) const
+{
+	type_code type;
+	int32 id;
+	const char* name;
+	size_t size;
+	int32 count = 0;
+	int32 first = -1;
+	for (; resources.GetResourceInfo(count, &type, &id, &name, &size); count++) {
+		if (first < 0 && _HasChanged({ type, id }, present))
+			first = count;
+	}
+
+	status_t status = B_OK;
+	for (int32 i = first; first >= 0 && i < count && status == B_OK; i++) {
+		resources.GetResourceInfo(first, &type, &id, &name, &size);
+		const BString oldName(name);
+		const void* oldData = resources.LoadResource(type, id, &size);
+		if (_HasChanged({ type, id }, present))
+			status = AddItemTo(resources, *Item(FindItem(type, id)));
+		else if (oldData != nullptr)
+			status = resources.AddResource(type, id, oldData, size, oldName.String());
+		else
+			status = B_IO_ERROR;
+	}
+	return status;
+}
+
+
+// Whether the item is new or differs from what was last read or saved.
+bool
+ResourceDocument::_HasChanged(const ItemKey& key, const SavedItems& present) const
+{
+	const auto item = present.find(key);
+	if (item == present.end())
+		return false;
+	const auto saved = fSaved.find(key);
+	return saved == fSaved.end() || saved->second.name != item->second.name
+		|| saved->second.data != item->second.data;
 }

@@ -10,6 +10,8 @@
 
 #include "host/library/ResourceCollection.h"
 
+class BResources;
+
 
 // The collection's locks guard the items and the undo steps. Loading and saving take them; any
 // thread may do either.
@@ -74,7 +76,8 @@ private:
 		int64 size = -1; // -1: no file
 		bool operator==(const FileStamp&) const = default;
 	};
-	typedef std::map<std::pair<type_code, int32>, SavedItem> SavedItems;
+	typedef std::pair<type_code, int32> ItemKey;
+	typedef std::map<ItemKey, SavedItem> SavedItems;
 
 	class ReadAccess;
 	class WriteAccess;
@@ -82,6 +85,8 @@ private:
 	static FileStamp _StampOf(const char* path);
 	SavedItems _PresentItems() const;
 	status_t _WriteDifferences(const char* path, const SavedItems& present);
+	status_t _WriteChanged(BResources& resources, const SavedItems& present) const;
+	bool _HasChanged(const ItemKey& key, const SavedItems& present) const;
 	bool _Replay(std::vector<Step>& from, std::vector<Step>& to, bool undo);
 	void _ReplayChange(const Change& change, bool undo);
 

@@ -137,6 +137,15 @@ ArchiveWriter::KeepClass(bool always)
 
 
 void
+ArchiveWriter::KeepName(const char* name)
+{
+	const char* read = nullptr;
+	fSource.FindString("_name", &read);
+	Keep("_name", same_string(read, name));
+}
+
+
+void
 ArchiveWriter::_Note(status_t status)
 {
 	if (fStatus == B_OK)

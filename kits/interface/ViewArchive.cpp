@@ -318,9 +318,8 @@ BView::Archive(BMessage* archive, bool deep) const
 		return status;
 	ArchiveWriter writer(archive);
 	writer.KeepClass(dynamic_cast<const StandInView*>(this) != nullptr);
-	// BHandler has written the name; that of an archive may have to stay as it was read.
-	if (fSource != nullptr)
-		writer.String("_name", Name(), nullptr);
+	// BHandler has written the name; one that was read stays as it was.
+	writer.KeepName(Name());
 	status = writer.Status();
 	if (status == B_OK)
 		status = _ArchiveOwnFields(archive);

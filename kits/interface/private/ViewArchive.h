@@ -130,6 +130,8 @@ public:
 	// For the field that BArchivable wrote: further names of the source stay, until somebody adds
 	// names of his own. `always`: whatever the object's class is.
 	void KeepClass(bool always);
+	// For the name, which BHandler wrote.
+	void KeepName(const char* name);
 	// What the object was read from; empty for a new object. A look leaves no marks.
 	const BMessage& Source() const { return fSource; }
 
