@@ -276,7 +276,7 @@ WindowInternals::Present()
 void
 WindowInternals::MessageHandled()
 {
-	if (server == nullptr || !tree.HasDamage())
+	if (server == nullptr || (!tree.HasDamage() && toPresent.IsEmpty()))
 		return;
 	if (tree.IsDirty() && updatesDisabled == 0)
 		return;

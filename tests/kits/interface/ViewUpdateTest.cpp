@@ -316,6 +316,49 @@ TEST(ViewUpdate, DisabledUpdatesAreMadeUpFor)
 }
 
 
+TEST(ViewUpdate, NothingOfATransactionIsShownBeforeItsEnd)
+{
+	TestWindow window;
+	PaintView* view = window.Add(new PaintView(BRect(0, 0, 99, 99), kWhite));
+	window.Locked([&] {
+		window.Window()->BeginViewTransaction();
+		view->SetHighColor(kRed);
+		view->FillRect(BRect(0, 0, 9, 9));
+		view->Flush();
+	});
+	EXPECT_EQ(kWhite, window.driver.PixelAt(view, BPoint(5, 5)));
+	window.Locked([&] { window.Window()->EndViewTransaction(); });
+	EXPECT_EQ(kRed, window.driver.PixelAt(view, BPoint(5, 5)));
+}
+
+
+TEST(ViewUpdate, OfManyViewsOnlyThoseThatWereTouchedAreDrawn)
+{
+	constexpr int kViews = 10000;
+	TestWindow window(BRect(0, 0, 999, 999));
+	std::vector<BView*> log;
+	PaintView* parent = new PaintView(BRect(0, 0, 999, 999), kWhite);
+	std::vector<PaintView*> views;
+	for (int i = 0; i < kViews; i++) {
+		const BPoint at(i % 100 * 10, i / 100 * 10);
+		views.push_back(new PaintView(BRect(at.x, at.y, at.x + 7, at.y + 7), kRed));
+		views.back()->log = &log;
+		parent->AddChild(views.back());
+	}
+	window.Add(parent);
+	EXPECT_EQ(size_t(kViews), log.size());
+	log.clear();
+	window.Locked([&] { views[5050]->MoveBy(1, 0); });
+	EXPECT_EQ((std::vector<BView*> { views[5050] }), log);
+	log.clear();
+	window.Locked([&] {
+		for (PaintView* view : views)
+			view->MoveBy(0, 1);
+	});
+	EXPECT_EQ(size_t(kViews), log.size());
+}
+
+
 TEST(ViewUpdate, AViewBitmapLiesOverTheColourAndIsTiled)
 {
 	TestWindow window;
