@@ -91,7 +91,7 @@ public:
 private:
 	friend class PaintTask;
 
-	static constexpr int32 kMaxDamage = 16;
+	static constexpr int32 kMaxDamage = 8;
 
 	void _AddDamage(const clipping_rect& deviceRect);
 
