@@ -376,8 +376,12 @@ BTranslatorRoster::Translate(translator_id translator, BPositionIO* source, BMes
 					   : ToTranslationError(encoded.Error());
 	}
 
+	const BBitmap& pixels = *bitmap;
 	BBitmapStream stream(bitmap.release());
-	std::string result(stream.Size(), '\0');
-	stream.ReadAt(0, result.data(), result.size());
-	return WriteAll(destination, result.data(), result.size());
+	TranslatorBitmap header;
+	stream.ReadAt(0, &header, sizeof(header));
+	status = WriteAll(destination, &header, sizeof(header));
+	if (status == B_OK)
+		status = WriteAll(destination, pixels.Bits(), pixels.BitsLength());
+	return status;
 }

@@ -96,7 +96,7 @@ TEST(Surface, APictureFileReadsBackPixelByPixel)
 	ASSERT_EQ(B_OK, surface.SetTo(37, 5));
 	for (int32 y = 0; y < 5; y++) {
 		for (int32 x = 0; x < 37; x++)
-			surface.Row(y)[x] = static_cast<uint32>(x * 0x07050301 + y * 0x00ff1133);
+			surface.Row(y)[x] = (uint32)x * 0x07050301u + (uint32)y * 0x00ff1133u;
 	}
 	const std::string path = testing::TempDir() + "surface.png";
 	for (const bool alpha : { true, false }) {
