@@ -307,3 +307,26 @@ TEST(WatchMessages, PrintsAllButTheFrequentCodes)
 	fflush(stdout);
 	EXPECT_EQ("Code\n", testing::internal::GetCapturedStdout());
 }
+
+
+TEST(ActivateOnClick, ActivatesTheClickedWindow)
+{
+	TestWindow window;
+	BWindow* other = new BWindow(BRect(500, 50, 599, 149), "other", B_TITLED_WINDOW, 0);
+	other->Show();
+	Driver::WaitUntilIdle();
+	window.Locked([&] {
+		window.Window()->AddCommonFilter(
+			new BMessageFilter(B_ANY_DELIVERY, B_ANY_SOURCE, ActivateOnClick));
+	});
+	ASSERT_TRUE(other->IsActive());
+
+	BMessage press(B_MOUSE_DOWN);
+	window.Window()->PostMessage(&press);
+	Driver::WaitUntilIdle();
+	EXPECT_TRUE(window.Window()->IsActive());
+	EXPECT_FALSE(other->IsActive());
+
+	other->Lock();
+	other->Quit();
+}

@@ -6,6 +6,7 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+#include <AppDefs.h>
 #include <Button.h>
 #include <Message.h>
 #include <ScrollBar.h>
@@ -231,29 +232,42 @@ TEST_F(WorkViewTest, TheResizeZoneEndsAtTwelve)
 
 TEST_F(WorkViewTest, AHalfPixelInsideTheZoneResizes)
 {
-	window.Locked([&] {
-		workView->SetSelectedView(plain);
-		BMessage press(B_MOUSE_DOWN);
-		press.AddPoint("where", FromCorner(plain, 6, 5.5));
-		workView->HandleFilteredMouse(&press, plain, 0);
-		EXPECT_EQ(5u, workView->EventMask());
-		workView->MouseUp(BPoint(0, 0));
-		EXPECT_EQ(0u, workView->EventMask());
-
-		press.ReplacePoint("where", FromCorner(plain, 6, 6));
-		workView->HandleFilteredMouse(&press, plain, 0);
-		EXPECT_EQ(0u, workView->EventMask());
-	});
+	window.driver.Click(plain);
+	window.driver.MoveTo(plain, FromCorner(plain, 6, 5.5));
+	window.driver.Press();
+	EXPECT_EQ(5u, workView->EventMask());
+	window.driver.Release();
+	EXPECT_EQ(0u, workView->EventMask());
+	EXPECT_EQ(BRect(20, 20, 119, 79), plain->Frame());
 }
 
 
 TEST_F(WorkViewTest, APressWithoutAPlaceIsIgnored)
 {
-	window.Locked([&] {
-		BMessage press(B_MOUSE_DOWN);
-		workView->HandleFilteredMouse(&press, plain, 0);
-	});
+	BMessage press(B_MOUSE_DOWN);
+	press.AddInt32("buttons", B_PRIMARY_MOUSE_BUTTON);
+	window.Window()->PostMessage(&press, plain);
+	Driver::WaitUntilIdle();
 	EXPECT_EQ(root, workView->SelectedView());
+}
+
+
+TEST_F(WorkViewTest, TheFirstOfTwoWorkViewsTakesTheMouse)
+{
+	Listener* otherListener = new Listener;
+	window.Add(otherListener);
+	WorkView* other = new WorkView(BRect(20, 360, 200, 390), B_FOLLOW_NONE, otherListener);
+	BView* otherRoot = new BView(BRect(0, 0, 99, 99), "other", B_FOLLOW_NONE, B_WILL_DRAW);
+	window.Add(other);
+	window.Locked([&] { other->SetEditView(otherRoot); });
+	otherListener->selections.clear();
+
+	window.driver.Click(plain);
+	EXPECT_EQ(plain, workView->SelectedView());
+	// The other one's views are not in the first one's tree, so their clicks pass.
+	window.driver.Click(otherRoot, BPoint(20, 5));
+	EXPECT_EQ(plain, workView->SelectedView());
+	EXPECT_TRUE(otherListener->selections.empty());
 }
 
 
@@ -287,10 +301,11 @@ TEST_F(WorkViewTest, ArrowKeysMoveTheSelectedView)
 TEST_F(WorkViewTest, EachByteOfAKeyActs)
 {
 	window.driver.Click(plain);
-	window.Locked([&] {
-		const char bytes[] = { B_LEFT_ARROW, B_UP_ARROW, B_LEFT_ARROW };
-		workView->KeyDown(bytes, 3);
-	});
+	const char bytes[] = { B_LEFT_ARROW, B_UP_ARROW, B_LEFT_ARROW, '\0' };
+	BMessage key(B_KEY_DOWN);
+	key.AddString("bytes", bytes);
+	window.Window()->PostMessage(&key, workView);
+	Driver::WaitUntilIdle();
 	EXPECT_EQ(BRect(18, 19, 117, 78), plain->Frame());
 	EXPECT_EQ(3, listener->moves);
 }
@@ -446,10 +461,10 @@ TEST_F(WorkViewTest, ColorsOfTheTreeSurvive)
 
 TEST_F(WorkViewTest, KeysWithNothingSelectedDoNothing)
 {
-	window.Locked([&] {
-		workView->SetEditView(NULL);
-		const char key = B_DELETE;
-		workView->KeyDown(&key, 1);
-	});
+	window.driver.Click(plain);
+	window.Locked([&] { workView->SetEditView(NULL); });
+	window.driver.Key("Delete");
+	window.driver.Key("Left");
 	EXPECT_EQ(NULL, workView->SelectedView());
+	EXPECT_EQ(0, listener->moves);
 }

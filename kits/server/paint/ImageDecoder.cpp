@@ -5,8 +5,11 @@
 #include <QImageReader>
 #include <QImageWriter>
 #include <QLoggingCategory>
+#include <future>
 #include <mutex>
 #include <string.h>
+#include <thread>
+#include <unistd.h>
 
 #include <Errors.h>
 
@@ -39,6 +42,23 @@ ToNames(const QList<QByteArray>& formats)
 }
 
 
+// Loads Qt's image plug-ins. Their loaders belong to the thread that asks for them first and break
+// when they outlive it, so that thread waits until the program has ended.
+void
+LoadPlugins()
+{
+	std::promise<void> loaded;
+	std::future<void> isLoaded = loaded.get_future();
+	std::thread([loaded = std::move(loaded)]() mutable {
+		QImageReader::supportedImageFormats();
+		loaded.set_value();
+		for (;;)
+			pause();
+	}).detach();
+	isLoaded.wait();
+}
+
+
 // Reads from memory that it does not copy.
 class MemoryReader {
 public:
@@ -50,6 +70,7 @@ public:
 			QImageReader::setAllocationLimit(kMaxMegabytes);
 			// Damage is reported by our own results.
 			QLoggingCategory::setFilterRules("qt.gui.imageio*=false");
+			LoadPlugins();
 		});
 
 		fBuffer.setData(fBytes);

@@ -1,0 +1,230 @@
+// Dragging views about in the work area, and dropping on it.
+
+#include "work/WorkView.h"
+
+#include <memory>
+#include <string>
+
+#include <gtest/gtest.h>
+
+#include <Bitmap.h>
+#include <Box.h>
+#include <Button.h>
+#include <Entry.h>
+#include <File.h>
+#include <MenuBar.h>
+#include <Message.h>
+#include <Path.h>
+#include <Resources.h>
+
+#include "archive/BitmapView.h"
+#include "archive/ViewDrag.h"
+#include "archive/ViewTree.h"
+#include "support/TestWindow.h"
+#include "work/WorkBackgroundView.h"
+
+namespace {
+
+
+class WorkViewDropTest : public testing::Test {
+protected:
+	WorkViewDropTest() : window(BRect(40, 40, 539, 439))
+	{
+		BView* listener = new BView(BRect(0, 0, 9, 9), "listener", B_FOLLOW_NONE, 0);
+		window.Add(listener);
+		workView = new WorkView(BRect(20, 20, 449, 349), B_FOLLOW_ALL_SIDES, listener);
+		window.Add(workView);
+		root = new BView(BRect(0, 0, 299, 199), "root", B_FOLLOW_LEFT | B_FOLLOW_TOP, B_WILL_DRAW);
+		root->AddChild(new BButton(BRect(20, 20, 99, 44), "button", "Press", NULL));
+		box = new BBox(BRect(140, 20, 279, 179), "box");
+		root->AddChild(box);
+		window.Locked([&] { workView->SetEditView(root); });
+	}
+
+	BView* Find(const char* name) { return workView->EditView()->FindView(name); }
+
+	// A drag that begins in the view's middle, which was selected before.
+	void DragSelected(const char* name, BView* to, BPoint where, uint32 modifiers = 0)
+	{
+		BView* view = Find(name);
+		window.driver.Click(view, BPoint(10, 10));
+		const BPoint from = Driver::PointIn(view, BPoint(10, 10));
+		window.driver.Drag(from, Driver::PointIn(to, where), 10, 1, modifiers);
+	}
+
+	// As a drag from elsewhere delivers it.
+	void Drop(BMessage* message, BView* target, BPoint where)
+	{
+		message->AddPoint("_drop_point_", Driver::PointIn(target, where));
+		message->AddPoint("_drop_offset_", BPoint(0, 0));
+		window.Window()->PostMessage(message, target);
+		Driver::WaitUntilIdle();
+	}
+
+	TestWindow window;
+	WorkView* workView;
+	BView* root;
+	BBox* box;
+};
+
+
+} // namespace
+
+
+TEST_F(WorkViewDropTest, ADragMovesTheView)
+{
+	DragSelected("button", root, BPoint(40, 130));
+	BView* button = Find("button");
+	ASSERT_NE(nullptr, button);
+	EXPECT_EQ(root, button->Parent());
+	EXPECT_EQ(BPoint(30, 120), button->Frame().LeftTop());
+	EXPECT_EQ(button, workView->SelectedView());
+	EXPECT_EQ(2, root->CountChildren());
+}
+
+
+TEST_F(WorkViewDropTest, ADragIntoABoxChangesTheParent)
+{
+	DragSelected("button", box, BPoint(30, 60));
+	BView* button = Find("button");
+	ASSERT_NE(nullptr, button);
+	EXPECT_EQ(box, button->Parent());
+	EXPECT_EQ(BPoint(20, 50), button->Frame().LeftTop());
+}
+
+
+TEST_F(WorkViewDropTest, AControlDragCopies)
+{
+	DragSelected("button", box, BPoint(30, 60), B_CONTROL_KEY);
+	EXPECT_EQ(2, root->CountChildren());
+	EXPECT_EQ(1, box->CountChildren());
+	EXPECT_EQ(BRect(20, 20, 99, 44), root->ChildAt(1)->Frame());
+	EXPECT_STREQ("button", box->ChildAt(0)->Name());
+}
+
+
+TEST_F(WorkViewDropTest, ADropOnNothingLosesTheView)
+{
+	BView* button = Find("button");
+	window.driver.Click(button, BPoint(10, 10));
+	window.driver.Drag(Driver::PointIn(button, BPoint(10, 10)), BPoint(1200, 800));
+	EXPECT_EQ(NULL, Find("button"));
+	EXPECT_EQ(1, root->CountChildren());
+	EXPECT_NE(nullptr, ViewAttached(root, workView->SelectedView()));
+}
+
+
+TEST_F(WorkViewDropTest, TwoQuickClicksLoseNothing)
+{
+	BView* button = Find("button");
+	window.driver.SetWaiting(false);
+	for (int i = 0; i < 2; i++)
+		window.driver.Click(button, BPoint(10, 10));
+	window.driver.SetWaiting(true);
+	Driver::WaitUntilIdle();
+	ASSERT_NE(nullptr, Find("button"));
+	EXPECT_EQ(BRect(20, 20, 99, 44), Find("button")->Frame());
+	EXPECT_EQ(2, root->CountChildren());
+}
+
+
+TEST_F(WorkViewDropTest, AMenuBarEndsAtTheLeftTop)
+{
+	BMenuBar bar(BRect(0, 0, 100, 18), "bar");
+	BMessage drag;
+	MakeDragMessage(&bar, &drag);
+	Drop(&drag, box, BPoint(40, 40));
+	BView* dropped = Find("bar");
+	ASSERT_NE(nullptr, dropped);
+	EXPECT_EQ(box, dropped->Parent());
+	EXPECT_EQ(BPoint(0, 0), dropped->Frame().LeftTop());
+}
+
+
+TEST_F(WorkViewDropTest, AnArchiveIsAddedWhereItIsDropped)
+{
+	BView view(BRect(0, 0, 30, 30), "fresh", B_FOLLOW_NONE, B_WILL_DRAW);
+	BMessage archive('drop');
+	view.Archive(&archive, true);
+	Drop(&archive, root, BPoint(25, 150));
+	ASSERT_NE(nullptr, Find("fresh"));
+	EXPECT_EQ(BPoint(25, 150), Find("fresh")->Frame().LeftTop());
+	EXPECT_EQ(Find("fresh"), workView->SelectedView());
+}
+
+
+TEST_F(WorkViewDropTest, RubbishChangesNothing)
+{
+	BMessage empty('DATA');
+	Drop(&empty, root, BPoint(25, 150));
+	BMessage unknown('drop');
+	unknown.AddString("class", "NoSuchClass");
+	Drop(&unknown, root, BPoint(25, 150));
+	EXPECT_EQ(2, root->CountChildren());
+}
+
+
+TEST_F(WorkViewDropTest, APictureBecomesABitmapView)
+{
+	const std::string path = testing::TempDir() + "dropped picture.png";
+	ASSERT_TRUE(window.driver.Screenshot(path.c_str()));
+	entry_ref ref;
+	ASSERT_EQ(B_OK, get_ref_for_path(path.c_str(), &ref));
+	BMessage drop('DATA');
+	drop.AddRef("refs", &ref);
+	Drop(&drop, root, BPoint(5, 150));
+
+	BitmapView* view = dynamic_cast<BitmapView*>(Find("dropped picture.png"));
+	ASSERT_NE(nullptr, view);
+	ASSERT_NE(nullptr, view->Bitmap());
+	EXPECT_EQ(view->Bitmap()->Bounds(), view->Bounds());
+	EXPECT_EQ(0u, view->Flags());
+}
+
+
+TEST_F(WorkViewDropTest, AFileOfAViewComesBack)
+{
+	const std::string path = testing::TempDir() + "dragged.rsrc";
+	{
+		BButton button(BRect(0, 0, 50, 20), "filed", "Filed", NULL);
+		BMessage archive('drop');
+		button.Archive(&archive, true);
+		std::vector<char> bytes(static_cast<size_t>(archive.FlattenedSize()));
+		archive.Flatten(bytes.data(), static_cast<ssize_t>(bytes.size()));
+		BFile file(path.c_str(), B_READ_WRITE | B_CREATE_FILE | B_ERASE_FILE);
+		BResources resources(&file, true);
+		resources.AddResource('ARCV', 1, bytes.data(), bytes.size(), "zetka");
+		ASSERT_EQ(B_OK, resources.Sync());
+	}
+	entry_ref ref;
+	ASSERT_EQ(B_OK, get_ref_for_path(path.c_str(), &ref));
+	BMessage drop('DATA');
+	drop.AddRef("refs", &ref);
+	Drop(&drop, root, BPoint(5, 150));
+	EXPECT_NE(nullptr, dynamic_cast<BButton*>(Find("filed")));
+}
+
+
+TEST_F(WorkViewDropTest, TheGroundAsksBeforeItReplaces)
+{
+	for (const bool yes : { false, true }) {
+		BView view(BRect(0, 0, 80, 80), "fresh", B_FOLLOW_NONE, B_WILL_DRAW);
+		BMessage archive('drop');
+		view.Archive(&archive, true);
+		archive.AddPoint("_drop_point_", BPoint(400, 300));
+		window.Window()->PostMessage(&archive, workView->Container());
+		Driver::WaitUntilIdle();
+		if (yes) {
+			BWindow* alert = be_app->WindowAt(be_app->CountWindows() - 1);
+			EXPECT_STREQ("Warning!", alert->Title());
+			alert->Lock();
+			BView* button = alert->FindView("_b0_");
+			alert->Unlock();
+			window.driver.Click(button);
+			EXPECT_STREQ("fresh", workView->EditView()->Name());
+		} else {
+			window.driver.Key("Escape");
+			EXPECT_STREQ("root", workView->EditView()->Name());
+		}
+	}
+}
