@@ -62,8 +62,10 @@ read_font(const BMessage& archive, FontSpec* _font)
 	const char* style;
 	if (archive.FindString("_fname", 0, &family) == B_OK
 		&& archive.FindString("_fname", 1, &style) == B_OK) {
+		// A family that is not installed does not lose the style: what was bold stays bold.
 		BFont font;
-		if (font.SetFamilyAndStyle(family, style) == B_OK) {
+		if (font.SetFamilyAndStyle(family, style) == B_OK
+			|| font.SetFamilyAndStyle(NULL, style) == B_OK) {
 			const FontSpec spec = ToFontSpec(font);
 			_font->familyAndStyle = spec.familyAndStyle;
 			_font->face = spec.face;

@@ -157,3 +157,17 @@ TEST(Box, ReadsTheBoolOfOldArchives)
 	EXPECT_EQ(B_PLAIN_BORDER, revived->Border());
 	EXPECT_TRUE(archive.HasSameData(ArchiveOf(*revived), false, true));
 }
+
+
+TEST(Box, KeepsItsBoldLabelWithoutTheFamilyOfItsArchive)
+{
+	ControlFixture fixture;
+	BBox box(BRect(10, 10, 199, 99), "box");
+	BMessage archive = ArchiveOf(box);
+	archive.ReplaceString("_fname", 0, "A family that is not installed");
+	std::unique_ptr<BBox> revived = Revive<BBox>(archive);
+	BFont font;
+	revived->GetFont(&font);
+	EXPECT_EQ(be_bold_font->FamilyAndStyle(), font.FamilyAndStyle());
+	ExpectArchiveRoundTrip<BBox>(fixture, archive);
+}
