@@ -43,7 +43,9 @@ public:
 	// Everything may change while the window is shown. Moves and sizes are reported back as
 	// events, with the frame that the desktop really gave.
 	virtual void SetTraits(const WindowTraits& traits) = 0;
-	virtual void SetOwner(BackendWindow* owner) = 0; // stays above it; NULL for none
+	// Stays above its owner, NULL for none; or above all normal windows of the program, where the
+	// owner stands for them on desktops that cannot do better.
+	virtual void SetOwner(BackendWindow* owner, bool aboveAll) = 0;
 	virtual void SetShown(bool shown) = 0;
 	virtual void SetMinimized(bool minimized) = 0;
 	virtual void Activate() = 0; // raise, and ask for the keyboard

@@ -356,14 +356,13 @@ DesktopThread::Flush(const WindowReference& window)
 }
 
 
-// A floating or modal window stays above the window that it belongs to: one of its subset, or the
-// one that was active last before it.
+// A floating or modal window stays above those that it belongs to: its subset, or all.
 void
 DesktopThread::UpdateOwners()
 {
 	for (const WindowReference& window : fWindows) {
 		if (window->native != nullptr)
-			window->native->SetOwner(fPolicy->OwnerOf(window));
+			window->native->SetOwner(fPolicy->OwnerOf(window), !window->HasSubset());
 	}
 }
 

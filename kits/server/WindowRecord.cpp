@@ -100,6 +100,14 @@ WindowRecord::IsFloating() const
 }
 
 
+bool
+WindowRecord::HasSubset() const
+{
+	const uint32 feel = Feel();
+	return feel == kModalSubsetFeel || feel == kFloatingSubsetFeel;
+}
+
+
 void
 WindowRecord::Change(const std::function<void(Properties&)>& change)
 {

@@ -43,6 +43,7 @@ public:
 	bool IsMenu() const;
 	bool IsModal() const;
 	bool IsFloating() const;
+	bool HasSubset() const; // floats over, or blocks, the windows of its subset alone
 	void Change(const std::function<void(Properties&)>& change);
 	// The program wants another frame; reports of the desktop are out of date until it is applied.
 	void BeginFrame(BRect frame);

@@ -47,7 +47,7 @@ HeadlessWindow::TakeFrame(BRect frame)
 
 // Layers keep floating and modal windows above the others here.
 void
-HeadlessWindow::SetOwner(BackendWindow* owner)
+HeadlessWindow::SetOwner(BackendWindow* owner, bool aboveAll)
 {
 }
 

@@ -14,7 +14,7 @@ public:
 	~HeadlessWindow() override;
 
 	void SetTraits(const WindowTraits& traits) override;
-	void SetOwner(BackendWindow* owner) override;
+	void SetOwner(BackendWindow* owner, bool aboveAll) override;
 	void SetShown(bool shown) override;
 	void SetMinimized(bool minimized) override;
 	void Activate() override;

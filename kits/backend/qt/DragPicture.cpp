@@ -56,8 +56,10 @@ DragPicture::exposeEvent(QExposeEvent* event)
 	fStore.resize(size());
 	fStore.beginPaint(all);
 	{
+		// A desktop that cannot blend shows what is half seen through as if it lay on white; one
+		// that can blends the window as a whole.
 		QPainter painter(fStore.paintDevice());
-		painter.setCompositionMode(QPainter::CompositionMode_Source);
+		painter.fillRect(all, Qt::white);
 		painter.drawImage(QPoint(), fImage);
 	}
 	fStore.endPaint();

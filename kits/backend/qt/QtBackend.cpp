@@ -236,6 +236,8 @@ void
 QtBackend::AddWindow(QtWindow* window)
 {
 	fWindows.push_back(window);
+	const auto* active = dynamic_cast<QtWindow*>(QGuiApplication::focusWindow());
+	window->FloatAbove(active != nullptr && active->Traits().kind != WindowTraits::Kind::Modal);
 }
 
 
@@ -277,6 +279,9 @@ QtBackend::_FocusChanged(QWindow* focus)
 		fActivatedAt = system_time();
 	}
 	fRequested = nullptr;
+	const bool above = window != nullptr && window->Traits().kind != WindowTraits::Kind::Modal;
+	for (QtWindow* other : fWindows)
+		other->FloatAbove(above);
 	fModifiers.Clear();
 	_ReportModifiers();
 

@@ -90,7 +90,21 @@ QtWindow::_ApplyFlags()
 		flags.setFlag(Qt::WindowMaximizeButtonHint, fTraits.hasTitle && fTraits.zoomable);
 	}
 	flags.setFlag(Qt::WindowDoesNotAcceptFocus, !fTraits.takesFocus);
+	flags.setFlag(Qt::WindowStaysOnTopHint, fFloatsAbove);
 	setFlags(flags);
+}
+
+
+// Desktops keep a window above one other, or above all. The second is meant while the program is
+// active only.
+void
+QtWindow::FloatAbove(bool above)
+{
+	const bool floats = above && fTraits.kind == WindowTraits::Kind::Floating;
+	if (floats == fFloatsAbove)
+		return;
+	fFloatsAbove = floats;
+	_ApplyFlags();
 }
 
 
@@ -123,9 +137,12 @@ QtWindow::TakeFrame(BRect frame)
 
 
 void
-QtWindow::SetOwner(BackendWindow* owner)
+QtWindow::SetOwner(BackendWindow* owner, bool aboveAll)
 {
-	QWindow* parent = dynamic_cast<QtWindow*>(owner);
+	// Where it can float above all of them it needs no owner among them.
+	const bool floats = aboveAll && fTraits.kind == WindowTraits::Kind::Floating
+		&& QGuiApplication::platformName() == QLatin1String("xcb");
+	QWindow* parent = floats ? nullptr : dynamic_cast<QtWindow*>(owner);
 	if (transientParent() != parent)
 		setTransientParent(parent);
 }

@@ -23,7 +23,7 @@ public:
 	~QtWindow() override;
 
 	void SetTraits(const WindowTraits& traits) override;
-	void SetOwner(BackendWindow* owner) override;
+	void SetOwner(BackendWindow* owner, bool aboveAll) override;
 	void SetShown(bool shown) override;
 	void SetMinimized(bool minimized) override;
 	void Activate() override;
@@ -35,6 +35,7 @@ public:
 
 	const WindowTraits& Traits() const { return fTraits; }
 	FrontImage& Image() const { return *fImage; }
+	void FloatAbove(bool above); // above all windows, if it is a floating one
 	void TakeFrame(BRect frame); // as by the desktop
 	void ShowCursor(); // its own, or none while the program hides it
 
@@ -74,6 +75,7 @@ private:
 	BRect fTextSpot; // screen, logical
 	int32 fRepeat = 0; // of the key that is held
 	bool fMinimized = false;
+	bool fFloatsAbove = false;
 };
 
 

@@ -11,7 +11,7 @@ namespace BPrivate {
 namespace {
 
 constexpr uint32 kAcceptsFirstClick = 0x10, kAvoidFocus = 0x2000, kAvoidFront = 0x80;
-constexpr uint32 kModalSubsetFeel = 2, kFloatingSubsetFeel = 5;
+constexpr uint32 kModalSubsetFeel = 2;
 
 
 std::unique_ptr<BMessage>
@@ -132,8 +132,7 @@ WindowPolicy::OwnerOf(const WindowReference& window) const
 	if (!window->IsModal() && !window->IsFloating())
 		return nullptr;
 
-	const uint32 feel = window->Feel();
-	if (feel == kModalSubsetFeel || feel == kFloatingSubsetFeel) {
+	if (window->HasSubset()) {
 		for (const uint32 id : window->subset) {
 			const WindowReference main = fDesktop.Find(id);
 			if (main != nullptr && main->nativeShown)
