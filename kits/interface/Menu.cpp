@@ -20,6 +20,8 @@ constexpr float kMarginTop = 2;
 constexpr float kMarginRight = 20;
 constexpr float kMarginBottom = 0;
 
+constexpr bigtime_t kAddingTime = 20000; // microseconds of dynamic items at a time
+
 std::mutex sInfoLock;
 menu_info* sInfo; // NULL until it is asked for
 
@@ -506,15 +508,15 @@ BMenu::_Closed()
 }
 
 
+// For a while only, so that the menu shows and follows the pointer meanwhile; true: there is more.
 bool
-BMenu::_AddDynamicItems()
+BMenu::_AddDynamicItems(bool first)
 {
-	// A menu that wants to be asked again is asked until it has no more.
-	bool more = AddDynamicItem(B_INITIAL_ADD);
-	bool any = more;
-	while (more)
+	const bigtime_t start = system_time();
+	bool more = AddDynamicItem(first ? B_INITIAL_ADD : B_PROCESSING);
+	while (more && system_time() - start < kAddingTime)
 		more = AddDynamicItem(B_PROCESSING);
-	return any;
+	return more;
 }
 
 

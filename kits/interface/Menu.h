@@ -176,7 +176,7 @@ private:
 	virtual void _LayoutChanged(); // of a menu that is attached and not open
 	void _MeasureItem(BMenuItem* item, float* _width, float* _height);
 	void _ChooseTriggers();
-	bool _AddDynamicItems();
+	bool _AddDynamicItems(bool first);
 	void _DrawItems(BRect updateRect);
 
 	BMenuItem* _ItemAtPoint(BPoint where) const;

@@ -386,6 +386,10 @@ MenuTracker::MessageReceived(BMessage* message)
 			_Relayout();
 			break;
 
+		case kMenuAdd:
+			_AddMoreItems();
+			break;
+
 		case kMenuPoll:
 			if (_HookEnds())
 				_Finish(NULL);

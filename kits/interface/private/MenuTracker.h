@@ -95,6 +95,7 @@ private:
 		BRect savedFrame; // of the menu, as it is while closed
 		float scroll; // of the items
 		float maxScroll;
+		bool adding; // its AddDynamicItem() has more
 	};
 	struct Hit {
 		int32 level = -1; // -1: outside, kBarLevel: in the bar
@@ -118,6 +119,7 @@ private:
 	void _CloseFrom(size_t level);
 	void _Close(Level& level);
 	void _Relayout();
+	void _AddMoreItems();
 	Hit _HitTest(BPoint screen);
 	void _Follow(const Hit& hit, bool byKey);
 	void _Select(size_t level, BMenuItem* item);

@@ -38,7 +38,7 @@ MenuTracker::_Open(BMenu* menu, bool selectFirst)
 		Step step(*this);
 		if (!step.IsLocked())
 			return;
-		menu->_AddDynamicItems();
+		level.adding = menu->_AddDynamicItems(true);
 		menu->fShowTriggers = fRequest.byKey;
 		menu->fLayoutValid = false;
 		menu->_ValidateLayout();
@@ -60,6 +60,26 @@ MenuTracker::_Open(BMenu* menu, bool selectFirst)
 	fLevels.push_back(level);
 	if (level.window != fFirst)
 		level.window->Show();
+	if (level.adding)
+		fFirstMessenger.SendMessage(kMenuAdd);
+}
+
+
+void
+MenuTracker::_AddMoreItems()
+{
+	bool more = false;
+	for (Level& level : fLevels) {
+		if (!level.adding)
+			continue;
+		Step step(*this);
+		if (!step.IsLocked())
+			return;
+		level.adding = level.menu->_AddDynamicItems(false);
+		more = more || level.adding;
+	}
+	if (more)
+		fFirstMessenger.SendMessage(kMenuAdd);
 }
 
 
@@ -127,6 +147,8 @@ MenuTracker::_Close(Level& level)
 	Step step(*this);
 	// When the owner waits for the end it is not locked, and nobody else uses the menu.
 	BMenu* menu = level.menu;
+	if (level.adding && step.IsLocked())
+		menu->AddDynamicItem(BMenu::B_ABORT);
 	menu->BView::ScrollTo(BPoint(0, 0));
 	menu->RemoveSelf();
 	menu->_Closed();
@@ -176,6 +198,10 @@ MenuTracker::MouseMoved(BPoint screen)
 {
 	if (fFinished)
 		return;
+	if (_HookEnds()) {
+		_Finish(NULL);
+		return;
+	}
 	if (!fHasOrigin) {
 		fHasOrigin = true;
 		fOrigin = screen;

@@ -482,3 +482,75 @@ TEST(MenuTracking, MenuFieldChoosesByMouseAndKeys)
 	menus.driver.Click(field->MenuBar());
 	EXPECT_FALSE(Menus::IsOpen(menu));
 }
+
+
+namespace {
+
+// Adds items when it opens: some at once, one more with every further call.
+struct DynamicMenu : BMenu {
+	DynamicMenu(int32 total) : BMenu("Dynamic"), total(total) {}
+
+	bool AddDynamicItem(add_state state) override
+	{
+		if (state == B_ABORT) {
+			aborted = true;
+			return false;
+		}
+		if (state == B_INITIAL_ADD)
+			RemoveItems(0, CountItems(), true);
+		AddItem(new BMenuItem("dynamic", new BMessage('itm6')));
+		return CountItems() < total;
+	}
+
+	const int32 total;
+	std::atomic<bool> aborted { false };
+};
+
+bool
+end_when_told(BMenu*, void* state)
+{
+	return *static_cast<std::atomic<bool>*>(state);
+}
+
+struct HookedMenu : BPopUpMenu {
+	HookedMenu() : BPopUpMenu("hooked", false, false)
+	{
+		SetTrackingHook(end_when_told, &end);
+		AddItem(new BMenuItem("one", NULL));
+	}
+
+	std::atomic<bool> end { false };
+};
+
+} // namespace
+
+
+TEST(MenuTracking, DynamicItemsAreAddedWhenTheMenuOpens)
+{
+	Menus menus;
+	DynamicMenu* menu = new DynamicMenu(5);
+	menus.Locked([&] { menus.bar->AddItem(menu); });
+	for (int round = 0; round < 2; round++) {
+		menus.driver.Click(menus.BarItem(2));
+		ASSERT_TRUE(Menus::IsOpen(menu));
+		EXPECT_EQ(5, menu->CountItems());
+		menus.driver.Click(Menus::Item(menu, 4));
+		EXPECT_EQ(Codes { 'itm6' }, menus.TakeCodes());
+	}
+	EXPECT_FALSE(menu->aborted);
+}
+
+
+TEST(MenuTracking, TheTrackingHookEndsIt)
+{
+	Menus menus;
+	HookedMenu menu;
+	menu.Go(BPoint(200, 200), true, true, true);
+	Driver::WaitUntilIdle();
+	ASSERT_TRUE(Menus::IsOpen(&menu));
+	menus.driver.MoveTo(BPoint(300, 300));
+	ASSERT_TRUE(Menus::IsOpen(&menu));
+	menu.end = true;
+	menus.driver.MoveTo(BPoint(310, 310));
+	EXPECT_FALSE(Menus::IsOpen(&menu));
+}

@@ -537,3 +537,77 @@ TEST(TextView, ArchiveRoundTripKeepsEverything)
 	ASSERT_EQ(B_OK, revived->Archive(&again));
 	EXPECT_TRUE(again.HasSameData(archive));
 }
+
+
+// #pragma mark - input methods
+
+
+namespace {
+
+void
+send_method(Editor& editor, int32 code, const char* string, bool confirmed)
+{
+	BMessage event(B_INPUT_METHOD_EVENT);
+	event.AddInt32("be:opcode", code);
+	if (string != NULL)
+		event.AddString("be:string", string);
+	if (confirmed)
+		event.AddBool("be:confirmed", true);
+	editor.Window()->PostMessage(&event, editor.view);
+	Driver::WaitUntilIdle();
+}
+
+} // namespace
+
+
+TEST(TextView, ComposedTextIsShownAndReplacedUntilItIsConfirmed)
+{
+	Editor editor;
+	editor.driver.Type("ab");
+	editor.driver.Key("Left");
+	send_method(editor, 0, NULL, false);
+	send_method(editor, 2, "n", false);
+	EXPECT_STREQ("anb", editor.view->Text());
+	send_method(editor, 2, "\xe3\x81\xab", false);
+	EXPECT_STREQ("a\xe3\x81\xab"
+				 "b",
+		editor.view->Text());
+	send_method(editor, 2, "\xe4\xba\x8c", true);
+	send_method(editor, 1, NULL, false);
+	EXPECT_STREQ("a\xe4\xba\x8c"
+				 "b",
+		editor.view->Text());
+	expect_selection(editor.view, 4, 4);
+	editor.driver.Key("z", B_CONTROL_KEY);
+	EXPECT_STREQ("ab", editor.view->Text());
+}
+
+
+TEST(TextView, ComposedTextThatIsNotConfirmedGoes)
+{
+	Editor editor;
+	editor.driver.Type("x");
+	send_method(editor, 0, NULL, false);
+	send_method(editor, 2, "abc", false);
+	send_method(editor, 1, NULL, false);
+	EXPECT_STREQ("x", editor.view->Text());
+}
+
+
+TEST(TextView, HiddenTypingShowsBulletsAndIsNotCopied)
+{
+	Editor editor;
+	editor.Locked([&] { editor.view->HideTyping(true); });
+	editor.driver.Type("iiii");
+	editor.Locked([&] {
+		EXPECT_NEAR(4 * editor.view->StringWidth(B_UTF8_BULLET), editor.view->LineWidth(0), 2);
+		be_clipboard->Lock();
+		be_clipboard->Clear();
+		be_clipboard->Commit();
+		be_clipboard->Unlock();
+		editor.view->SelectAll();
+		editor.view->Copy(be_clipboard);
+		EXPECT_FALSE(editor.view->AcceptsPaste(be_clipboard));
+	});
+	EXPECT_STREQ("iiii", editor.view->Text());
+}
