@@ -233,9 +233,9 @@ TextBuffer::_Reserve(int32 length)
 		return;
 	const int32 gap = length + kMinimalGap + fLength / 16;
 	std::vector<char> bytes(fLength + gap);
-	memcpy(bytes.data(), fBytes.data(), fGapStart);
-	memcpy(
-		bytes.data() + fGapStart + gap, fBytes.data() + fGapStart + fGapSize, fLength - fGapStart);
+	const auto behindGap = fBytes.begin() + fGapStart + fGapSize;
+	std::copy(fBytes.begin(), fBytes.begin() + fGapStart, bytes.begin());
+	std::copy(behindGap, behindGap + (fLength - fGapStart), bytes.begin() + fGapStart + gap);
 	fBytes.swap(bytes);
 	fGapSize = gap;
 }
