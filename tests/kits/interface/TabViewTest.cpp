@@ -255,8 +255,7 @@ TEST(TabView, RevivesWhatItWrote)
 	BMessage container;
 	ASSERT_EQ(B_OK, archive.FindMessage("_views", &container));
 	EXPECT_FALSE(container.HasMessage("_views"));
-	fixture.Locked(
-		[&] { EXPECT_EQ(model->ContainerView(), model->ViewForTab(1)->Parent()); });
+	fixture.Locked([&] { EXPECT_EQ(model->ContainerView(), model->ViewForTab(1)->Parent()); });
 	ExpectArchiveRoundTrip<BTabView>(fixture, archive);
 
 	std::unique_ptr<BTabView> revived = Revive<BTabView>(archive);
@@ -341,4 +340,39 @@ TEST(TabView, APageOfAnUnknownClassStaysWhatItIs)
 	ASSERT_EQ(2, revived->CountTabs());
 	EXPECT_STREQ("Second", revived->TabAt(1)->Label());
 	EXPECT_TRUE(archive.HasSameData(ArchiveOf(*revived), false, true));
+}
+
+
+TEST(TabView, AManagedArchiveOfATabViewStaysManaged)
+{
+	BApplication app("application/x-vnd.Archway-test");
+	std::unique_ptr<BTabView> model(NewTabView(2));
+	model->Select(1);
+	BMessage archive = ArchiveOf(*model);
+	BMessage container;
+	ASSERT_EQ(B_OK, archive.FindMessage("_views", &container));
+
+	// The objects by their numbers: the container, then each tab and its page. The page in front
+	// is named by the list and by the container.
+	std::vector<BMessage> objects = { container };
+	objects[0].AddInt32("_views", 5);
+	for (int32 i = 0; i < 2; i++) {
+		objects.push_back(ArchiveOf(*model->TabAt(i)));
+		objects.push_back(ArchiveOf(*model->ViewForTab(i)));
+	}
+	for (const char* name : { "_views", "_l_items", "_view_list" })
+		archive.RemoveName(name);
+	archive.AddInt32("_views", 1);
+	for (int32 i = 0; i < 2; i++) {
+		archive.AddInt32("_l_items", 2 + 2 * i);
+		archive.AddInt32("_view_list", 3 + 2 * i);
+	}
+	for (const BMessage& object : objects)
+		archive.AddMessage("_managed_archivable", &object);
+	archive.AddBool("_managed_archive", true);
+
+	std::unique_ptr<BTabView> revived = Revive<BTabView>(archive);
+	EXPECT_EQ("First Second", Labels(revived.get()));
+	EXPECT_EQ(revived->ContainerView(), revived->ViewForTab(1)->Parent());
+	EXPECT_TRUE(archive.HasSameData(ArchiveOf(*revived), true, true));
 }
