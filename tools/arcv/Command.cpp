@@ -16,6 +16,7 @@ RunArcv(int argc, const char* const* argv)
 	AddDumpCommand(app, &status);
 	AddCheckCommand(app, &status);
 	AddDiffCommand(app, &status);
+	AddRenderCommand(app, &status);
 	AddExtractCommand(app, &status);
 	AddInsertCommand(app, &status);
 	AddRemoveCommand(app, &status);

@@ -23,6 +23,7 @@ void AddInsertCommand(CLI::App& app, int* _status);
 void AddListCommand(CLI::App& app, int* _status);
 void AddRdefCommand(CLI::App& app, int* _status);
 void AddRemoveCommand(CLI::App& app, int* _status);
+void AddRenderCommand(CLI::App& app, int* _status);
 
 // The whole program; what it returns is the exit status.
 int RunArcv(int argc, const char* const* argv);

@@ -71,7 +71,7 @@ TEST(Arcv, UsageIsExplained)
 	const ProgramResult help = RunArcv({ "--help" });
 	EXPECT_EQ(0, help.status);
 	for (const char* command : { "list", "dump", "check", "diff", "extract", "insert", "remove",
-			 "convert", "rdef", "compile" })
+			 "convert", "rdef", "compile", "render" })
 		EXPECT_THAT(help.output, HasSubstr(command));
 }
 
