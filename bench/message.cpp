@@ -129,14 +129,22 @@ map_tree(int count, parent_func parent)
 }
 
 
-// A bare live object.
+// A bare live object: what a reader cannot do without.
 struct Node {
-	std::string name;
-	std::string label;
 	float frame[4];
 	int flags;
 	int value;
-	std::vector<std::unique_ptr<Node>> children;
+	size_t nameLength;
+	Node* firstChild = nullptr; // owned
+	Node* nextSibling = nullptr; // owned by the parent
+
+	~Node()
+	{
+		while (Node* child = firstChild) {
+			firstChild = child->nextSibling;
+			delete child;
+		}
+	}
 };
 
 
@@ -144,15 +152,17 @@ std::unique_ptr<Node>
 make_node(const BMessage& view)
 {
 	auto node = std::make_unique<Node>();
-	node->name = view.FindString("_name");
-	node->label = view.FindString("_label");
+	node->nameLength = strlen(view.FindString("_name"));
 	const BRect frame = view.FindRect("_frame");
 	memcpy(node->frame, &frame, sizeof(frame));
 	node->flags = view.FindInt32("_flags");
 	node->value = view.FindInt32("_val");
+	Node** end = &node->firstChild;
 	BMessage child;
-	for (int32 i = 0; view.FindMessage("_views", i, &child) == B_OK; i++)
-		node->children.push_back(make_node(child));
+	for (int32 i = 0; view.FindMessage("_views", i, &child) == B_OK; i++) {
+		*end = make_node(child).release();
+		end = &(*end)->nextSibling;
+	}
 	return node;
 }
 
@@ -161,16 +171,18 @@ std::unique_ptr<Node>
 make_node(const QVariantMap& view)
 {
 	auto node = std::make_unique<Node>();
-	node->name = view.value("_name").toByteArray().toStdString();
-	node->label = view.value("_label").toByteArray().toStdString();
+	node->nameLength = size_t(view.value("_name").toByteArray().size());
 	const QVariantList frame = view.value("_frame").toList();
 	for (int i = 0; i < 4; i++)
 		node->frame[i] = frame[i].toFloat();
 	node->flags = view.value("_flags").toInt();
 	node->value = view.value("_val").toInt();
+	Node** end = &node->firstChild;
 	const QVariantList children = view.value("_views").toList();
-	for (const QVariant& child : children)
-		node->children.push_back(make_node(child.toMap()));
+	for (const QVariant& child : children) {
+		*end = make_node(child.toMap()).release();
+		end = &(*end)->nextSibling;
+	}
 	return node;
 }
 
@@ -179,7 +191,7 @@ int
 count_nodes(const Node& node)
 {
 	int count = 1;
-	for (const auto& child : node.children)
+	for (const Node* child = node.firstChild; child != nullptr; child = child->nextSibling)
 		count += count_nodes(*child);
 	return count;
 }

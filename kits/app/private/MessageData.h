@@ -189,6 +189,7 @@ private:
 	uint32 fFieldRoom = 0;
 	uint32* fIndex = nullptr; // slots of field numbers + 1; NULL while there are few fields
 	uint32 fIndexMask = 0;
+	uint64 fNameBits = 0; // a bit for each name that is or was there; most absent names lack theirs
 	uint32 fBodySize = 0; // of the source's fields, when they are all there is, as they are
 	SharedBytes* fSource = nullptr;
 	const uint8* fSourceBase = nullptr;
@@ -241,6 +242,13 @@ name_key(const char* name, size_t length)
 		return 0;
 	return uint32(length) << 24 | uint32(uint8(name[0])) << 16
 		| uint32(uint8(name[length / 2])) << 8 | uint8(name[length - 1]);
+}
+
+
+inline uint64
+name_bit(uint32 key)
+{
+	return uint64(1) << (key * 0x9e3779b1u >> 26);
 }
 
 
