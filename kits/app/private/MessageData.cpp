@@ -102,6 +102,8 @@ MessageData::CreateFrom(SharedBytes* source, const uint8* base, const MessageFie
 	}
 	if (count > 0)
 		memcpy(data->fFields, fields, count * sizeof(MessageField));
+	for (uint32 i = 0; i < count; i++)
+		data->fNameBits |= name_bit(fields[i].key);
 	data->fCount = count;
 	data->fSource = source;
 	data->fSourceBase = base;
@@ -141,6 +143,7 @@ MessageData::Clone() const
 	clone->fLevel = fLevel;
 	clone->fHeight = fHeight;
 	clone->fBodySize = fBodySize;
+	clone->fNameBits = fNameBits;
 	clone->fStoreIsBody = fStoreIsBody;
 	clone->fCopies = fCopies;
 	clone->SetNote(fNote);
@@ -205,6 +208,8 @@ int32
 MessageData::Find(const char* name, size_t length) const
 {
 	const uint32 key = name_key(name, length);
+	if ((fNameBits & name_bit(key)) == 0)
+		return -1;
 	if (fIndex == nullptr) {
 		for (uint32 i = 0; i < fCount; i++) {
 			if (_IsNamed(fFields[i], name, length, key))
@@ -619,6 +624,7 @@ MessageData::RenameField(uint32 number, const char* name, size_t length)
 	field.name = fStoreSize;
 	field.nameLength = uint16(length);
 	field.key = name_key(name, length);
+	fNameBits |= name_bit(field.key);
 	field.flags &=
 		uint16(~(MessageField::kCompact | MessageField::kWide | MessageField::kNameInSource));
 	fStoreSize += uint32(length);
@@ -928,6 +934,7 @@ MessageData::_ReserveStore(size_t size)
 void
 MessageData::_AddToIndex(uint32 number)
 {
+	fNameBits |= name_bit(fFields[number].key);
 	if (fIndex == nullptr && number < kFewFields)
 		return;
 	if (fIndex == nullptr || (number + 1) * 2 > fIndexMask) {
