@@ -352,6 +352,10 @@ DesktopThread::Flush(const WindowReference& window)
 	if (window->native == nullptr || pending.CountRects() == 0)
 		return;
 	window->flushes++;
+	for (int32 i = 0; i < pending.CountRects(); i++) {
+		const clipping_rect part = pending.RectAtInt(i);
+		window->flushedPixels += int64(part.right - part.left + 1) * (part.bottom - part.top + 1);
+	}
 	window->native->Flush(pending);
 }
 

@@ -76,6 +76,7 @@ public:
 	bool hasCursor = false;
 	CursorShape cursor;
 	int64 flushes = 0;
+	int64 flushedPixels = 0; // device pixels
 
 private:
 	const uint32 fId;

@@ -56,8 +56,10 @@ QtBackend::_ReportModifiers()
 void
 QtBackend::ReportPointer(const BackendEvent& event, quint64 timestamp)
 {
+	// The real pointer, which may rest anywhere, does not interfere with that of a script.
+	if (fScripted)
+		return;
 	fPointer = event.where;
-	fScripted = false;
 	if (fDragPicture != nullptr)
 		fDragPicture->MoveTo(ToQt(BRect(fPointer, fPointer)).topLeft());
 	fPressTime = event.type == BackendEvent::Type::ButtonPressed ? timestamp : 0;

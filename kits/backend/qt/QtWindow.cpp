@@ -263,7 +263,13 @@ QtWindow::_Paint(const QRegion& wanted)
 		for (const QRect& rect : region - covered)
 			painter.fillRect(rect, QColor::fromRgb(kEmptyColor));
 		const qreal ratio = fBackend.Ratio();
-		for (const QRect& rect : region& covered) {
+		const QRegion shown = region & covered;
+		for (const QRect& rect : shown) {
+			if (ratio == 1) {
+				// Rows are copied as they are.
+				painter.drawImage(rect.topLeft(), image, rect);
+				continue;
+			}
 			const QRectF source(
 				rect.x() * ratio, rect.y() * ratio, rect.width() * ratio, rect.height() * ratio);
 			painter.drawImage(QRectF(rect), image, source);
