@@ -418,8 +418,8 @@ BColorControl::Draw(BRect updateRect)
 	frame.InsetBy(-kBevel, -kBevel);
 	Look::DrawFieldFrame(this, frame, base, IsEnabled() ? Look::kNormal : Look::kDisabled);
 	for (int32 ramp = 0; ramp < kRampCount; ramp++) {
-		if (_RampFrame(ramp).Intersects(updateRect))
-			_DrawRamp(ramp);
+		if (_RampFrame(ramp).Intersects(updateRect & Bounds()))
+			_DrawRamp(ramp, updateRect & Bounds());
 	}
 
 	if (IsFocus() && IsEnabled() && Window()->IsActive()) {
@@ -429,16 +429,21 @@ BColorControl::Draw(BRect updateRect)
 }
 
 
+// Only the columns that are asked for: the cells, and with them the ramp, may be of any size.
 void
-BColorControl::_DrawRamp(int32 ramp)
+BColorControl::_DrawRamp(int32 ramp, BRect updateRect)
 {
 	const BRect frame = _RampFrame(ramp);
+	const BRect visible = frame & updateRect;
 	const rgb_color base = Look::BaseColor(this);
-	const int32 columns = static_cast<int32>(frame.Width()) + 1;
+	const float first = std::floor(visible.left);
+	const int32 columns = static_cast<int32>(visible.right - first) + 1;
 
 	BeginLineArray(columns);
-	for (int32 column = 0; column < columns; column++) {
-		const uint8 amount = static_cast<uint8>(column * 255 / std::max<int32>(columns - 1, 1));
+	for (int32 i = 0; i < columns; i++) {
+		const float x = first + i;
+		const float part = std::clamp((x - frame.left) / frame.Width(), 0.0f, 1.0f);
+		const uint8 amount = static_cast<uint8>(part * 255);
 		rgb_color color = { 0, 0, 0, 255 };
 		if (ramp == kGreyRamp || ramp == 1)
 			color.red = amount;
@@ -448,8 +453,7 @@ BColorControl::_DrawRamp(int32 ramp)
 			color.blue = amount;
 		if (!IsEnabled())
 			color = mix_color(color, base, 128);
-		AddLine(BPoint(frame.left + column, frame.top), BPoint(frame.left + column, frame.bottom),
-			color);
+		AddLine(BPoint(x, visible.top), BPoint(x, visible.bottom), color);
 	}
 	EndLineArray();
 

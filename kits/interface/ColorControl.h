@@ -81,7 +81,7 @@ private:
 	void _TrackTo(BPoint where);
 	int32 _RampValue(int32 ramp) const;
 	void _ChangeRamp(int32 ramp, int32 value);
-	void _DrawRamp(int32 ramp);
+	void _DrawRamp(int32 ramp, BRect updateRect);
 
 	BTextControl* fFields[3]; // children: red, green, blue
 	color_control_layout fLayout;

@@ -188,7 +188,10 @@ BStringView::Draw(BRect updateRect)
 	float baseline =
 		Bounds().bottom - metrics.descent - (CountLines(fText) - 1) * metrics.lineHeight;
 	ForEachLine(fText, [&](const std::string& line) {
-		_DrawLine(line.c_str(), baseline);
+		if (baseline + metrics.descent >= updateRect.top
+			&& baseline - metrics.ascent <= updateRect.bottom) {
+			_DrawLine(line.c_str(), baseline);
+		}
 		baseline += metrics.lineHeight;
 	});
 }

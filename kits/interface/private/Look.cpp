@@ -10,6 +10,8 @@ namespace BPrivate::Look {
 
 namespace {
 
+constexpr float kLargestArrow = 12; // from the middle of its base to an end
+
 struct Line {
 	BPoint from;
 	BPoint to;
@@ -686,7 +688,7 @@ DrawArrow(BView* view, BRect frame, Direction direction, rgb_color color)
 	const float x = std::floor((frame.left + frame.right) / 2);
 	const float y = std::floor((frame.top + frame.bottom) / 2);
 	const float room = std::min(frame.Width(), frame.Height());
-	const float half = std::max(2.0f, std::floor(room / 3));
+	const float half = std::clamp(std::floor(room / 3), 2.0f, kLargestArrow);
 	const float before = std::floor(half / 2);
 	const float after = half - before;
 

@@ -234,3 +234,16 @@ TEST(ColorControl, AnOddLayoutIsReadAsTheSmallest)
 	EXPECT_EQ(6, revived->CellSize());
 	EXPECT_TRUE(archive.HasSameData(ArchiveOf(*revived), false, true));
 }
+
+
+TEST(ColorControl, CellsOfAnySizeAreShownAtOnce)
+{
+	ControlFixture fixture;
+	BColorControl* control = fixture.Add(NewColorControl());
+	for (const float size : { 1000.0f, 2147483647.0f, 1e30f }) {
+		fixture.Locked([&] { control->SetCellSize(size); });
+		EXPECT_EQ(size, control->CellSize());
+	}
+	fixture.Locked([&] { control->SetCellSize(8); });
+	EXPECT_GT(fixture.driver.PixelAt(control, BPoint(252, 10)).red, 240);
+}
