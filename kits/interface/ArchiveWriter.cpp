@@ -73,6 +73,16 @@ begin_archive(const ArchiveSource* source, BMessage* archive)
 }
 
 
+bool
+is_as_read(const BMessage& archive)
+{
+	const MessagePrivate access(&archive);
+	const WriteBack* writeBack = access.GetWriteBack();
+	return writeBack != nullptr && access.Data() != nullptr
+		&& writeBack->IsUnchanged(*access.Data());
+}
+
+
 // #pragma mark - ArchiveWriter
 
 

@@ -49,7 +49,7 @@ owner_of(const ServerView* node)
 
 BView::BView(BRect frame, const char* name, uint32 resizingMode, uint32 flags) :
 	BHandler(name), fNode(new ServerView(this, whole_frame(frame), resizingMode | flags)),
-	fOwner(nullptr), fState(nullptr), fExtras(nullptr), fSource(nullptr), fTouched(0), fRevivedWord(0)
+	fOwner(nullptr), fState(nullptr), fExtras(nullptr), fSource(nullptr), fTouched(0), fEntry(0), fRevivedWord(0)
 {
 }
 
@@ -520,6 +520,7 @@ ViewPrivate::Insert(ServerView* parent, BView* child, BView* before, BWindow* wi
 		}
 	}
 
+	child->fEntry = 0;
 	parent->InsertChild(node, before != nullptr ? before->fNode : nullptr);
 	if (window != nullptr)
 		ViewPrivate(child).Attach(window);

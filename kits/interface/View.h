@@ -383,6 +383,7 @@ private:
 	void _ArchiveModes(
 		BMessage* archive, const BPrivate::DrawState& now, const BPrivate::DrawState& read) const;
 	status_t _ArchiveChildren(BMessage* archive) const;
+	static bool _TakeEntry(const BMessage& source, int32 count, int32* _entry, BMessage* _child);
 	const BPrivate::DrawState& _BottomState() const;
 	BPrivate::ViewState* _State();
 	const BPrivate::ViewState& _StateToRead() const;
@@ -399,7 +400,8 @@ private:
 	mutable BPrivate::ViewState* fState; // owned; NULL while every value is the default
 	BPrivate::ViewExtras* fExtras; // owned; scroll bars, event mask and other rare things
 	BPrivate::ArchiveSource* fSource; // owned; what an archived view was read from
-	uint32 fTouched; // which settings were ever changed, for the archive
+	uint32 fTouched : 9; // which settings were ever changed, for the archive
+	uint32 fEntry : 23; // 1 + its number in the parent's archive; 0 once it was added anew
 	uint32 fRevivedWord; // flags and mode that an unchanged archived view has
 };
 

@@ -23,6 +23,7 @@ namespace {
 thread_local const BView* sArchivedAsChild = nullptr;
 
 constexpr int32 kColors = 3; // high, low, view
+constexpr int32 kMaxEntry = (1 << 23) - 2;
 
 
 // What the fields of a view say, by the rules for missing and strange ones.
@@ -252,7 +253,7 @@ ViewPrivate::ForceWord(uint32 flags, uint32 mode)
 
 BView::BView(BMessage* archive) :
 	BHandler(archive), fNode(new ServerView(this, BRect(), 0)), fOwner(nullptr), fState(nullptr),
-	fExtras(nullptr), fSource(nullptr), fTouched(0), fRevivedWord(0)
+	fExtras(nullptr), fSource(nullptr), fTouched(0), fEntry(0), fRevivedWord(0)
 {
 	if (archive != nullptr)
 		_InitFromArchive(archive);
@@ -305,6 +306,8 @@ BView::_InitFromArchive(BMessage* archive)
 			view = new StandInView(&child);
 		}
 		AddChild(view);
+		if (i < kMaxEntry)
+			view->fEntry = i + 1;
 	}
 }
 
@@ -450,6 +453,20 @@ BView::_ArchiveModes(BMessage* archive, const DrawState& now, const DrawState& r
 }
 
 
+// Replaces the child's archive by the next entry that is a message, if it says the same.
+bool
+BView::_TakeEntry(const BMessage& source, int32 count, int32* _entry, BMessage* _child)
+{
+	BMessage read;
+	while (*_entry < count && source.FindMessage("_views", *_entry, &read) != B_OK)
+		(*_entry)++;
+	if (*_entry >= count || !same_message(*_child, read))
+		return false;
+	*_child = read;
+	return true;
+}
+
+
 // A child that archives to what it was read from is the same message again, so that nothing is
 // copied, and the comparison one level up is short.
 status_t
@@ -466,15 +483,18 @@ BView::_ArchiveChildren(BMessage* archive) const
 	children.reserve(CountChildren());
 	for (const ServerView* node = fNode->FirstChild(); node != nullptr && status == B_OK;
 		 node = node->Next()) {
+		const BView* view = node->Owner();
 		BMessage child;
-		sArchivedAsChild = node->Owner();
-		status = node->Owner()->Archive(&child, true);
+		sArchivedAsChild = view;
+		status = view->Archive(&child, true);
+		// Where it was read from this view's archive, it need not be compared with all of that.
+		const int32 readFrom = static_cast<int32>(view->fEntry) - 1;
 		BMessage read;
-		while (entry < count && source.FindMessage("_views", entry, &read) != B_OK)
-			entry++;
-		if (entry < count && same_message(child, read))
-			child = read;
-		else
+		if (readFrom == entry && view->fSource != nullptr && is_as_read(child))
+			read = view->fSource->Archive();
+		if (!read.IsEmpty() && read.what == child.what)
+			child = std::move(read);
+		else if (!_TakeEntry(source, count, &entry, &child))
 			unchanged = false;
 		entry++;
 		children.push_back(std::move(child));

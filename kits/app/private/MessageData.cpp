@@ -707,6 +707,33 @@ MessageData::CopyFieldOver(uint32 target, const MessageData& from, uint32 number
 }
 
 
+bool
+MessageData::HasSameField(uint32 number, const MessageData& other) const
+{
+	const MessageField& a = fFields[number];
+	const MessageField& b = other.fFields[number];
+	if (a.type != b.type || a.count != b.count || a.nameLength != b.nameLength
+		|| memcmp(NameBytes(a), other.NameBytes(b), a.nameLength) != 0)
+		return false;
+	const bool inPlace = !a.Has(MessageField::kScattered) && !b.Has(MessageField::kScattered);
+	if (inPlace && Base(a) + a.data == other.Base(b) + b.data && a.size == b.size)
+		return true;
+	for (uint32 i = 0; i < a.count; i++) {
+		const MessageData* nested = MessageAt(number, i);
+		if (nested != nullptr && nested == other.MessageAt(number, i))
+			continue;
+		const void* data;
+		const void* otherData;
+		size_t size, otherSize;
+		if (GetItem(number, i, &data, &size) != B_OK
+			|| other.GetItem(number, i, &otherData, &otherSize) != B_OK || size != otherSize
+			|| (data != otherData && memcmp(data, otherData, size) != 0))
+			return false;
+	}
+	return true;
+}
+
+
 void
 MessageData::MoveField(uint32 from, uint32 to)
 {

@@ -126,6 +126,9 @@ public:
 	// Copies a field of another message to the end, or in the place of one.
 	status_t CopyField(const MessageData& from, uint32 field);
 	status_t CopyFieldOver(uint32 target, const MessageData& from, uint32 field);
+	// Whether the other's field of the same number has the same name, type and bytes. Fields that
+	// share their bytes are not read.
+	bool HasSameField(uint32 field, const MessageData& other) const;
 	// Brings a field to an earlier place.
 	void MoveField(uint32 from, uint32 to);
 	void SetCarried(uint32 field, bool carried);

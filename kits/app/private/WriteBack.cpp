@@ -52,6 +52,19 @@ WriteBack::PlaceLast(MessageData& target) const
 }
 
 
+bool
+WriteBack::IsUnchanged(const MessageData& target) const
+{
+	if (target.CountFields() != fSource->CountFields())
+		return false;
+	for (uint32 i = 0; i < target.CountFields(); i++) {
+		if (!target.HasSameField(i, *fSource))
+			return false;
+	}
+	return true;
+}
+
+
 status_t
 WriteBack::Restore(MessageData& target, uint32 sourceField, bool carried) const
 {

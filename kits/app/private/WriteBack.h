@@ -24,6 +24,8 @@ public:
 	void PlaceLast(MessageData& target) const;
 	// Puts the source's field in as it was read, in place of the one that may be there.
 	status_t Restore(MessageData& target, uint32 sourceField, bool carried) const;
+	// Whether the fields are those of the source, in their order.
+	bool IsUnchanged(const MessageData& target) const;
 	// The items after the first one are carried along only.
 	void SetFirstItemOwn(uint32 sourceField) { fFirstItemOwn = int32(sourceField); }
 

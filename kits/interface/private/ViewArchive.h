@@ -96,6 +96,11 @@ private:
 _EXPORT status_t archive_as_child(const BView* view, BMessage* archive);
 
 
+// Whether the archive that begin_archive() was called for has become, byte by byte, what the object
+// was read from. Fields that were kept are not looked at, whatever they hold.
+bool is_as_read(const BMessage& archive);
+
+
 // Writes fields into an archive that begin_archive() was called for, or into one of a new object.
 class _EXPORT ArchiveWriter {
 public:
