@@ -182,6 +182,19 @@ same_message(const BMessage& a, const BMessage& b)
 }
 
 
+// Whether none of these entries of "_views" can be read.
+bool
+has_no_message(const BMessage& archive, int32 from, int32 to)
+{
+	BMessage read;
+	for (int32 i = from; i < to; i++) {
+		if (archive.FindMessage("_views", i, &read) == B_OK)
+			return false;
+	}
+	return true;
+}
+
+
 // The last step of the outermost view. A child of a managed archive that is archived by itself is
 // nested like any other.
 status_t
@@ -490,11 +503,13 @@ BView::_ArchiveChildren(BMessage* archive) const
 		// Where it was read from this view's archive, it need not be compared with all of that.
 		const int32 readFrom = static_cast<int32>(view->fEntry) - 1;
 		BMessage read;
-		if (readFrom == entry && view->fSource != nullptr && is_as_read(child))
+		if (readFrom >= entry && readFrom < count && is_as_read(child))
 			read = view->fSource->Archive();
-		if (!read.IsEmpty() && read.what == child.what)
+		if (!read.IsEmpty() && read.what == child.what) {
+			unchanged = unchanged && has_no_message(source, entry, readFrom);
+			entry = readFrom;
 			child = std::move(read);
-		else if (!_TakeEntry(source, count, &entry, &child))
+		} else if (!_TakeEntry(source, count, &entry, &child))
 			unchanged = false;
 		entry++;
 		children.push_back(std::move(child));
@@ -502,10 +517,7 @@ BView::_ArchiveChildren(BMessage* archive) const
 	if (status != B_OK)
 		return status;
 	// Entries that are no messages count for nothing, but stay while the rest does.
-	BMessage read;
-	for (; entry < count && unchanged; entry++)
-		unchanged = source.FindMessage("_views", entry, &read) != B_OK;
-
+	unchanged = unchanged && has_no_message(source, entry, count);
 	if (writer.Keep("_views", unchanged))
 		return writer.Status();
 	for (const BMessage& child : children) {
