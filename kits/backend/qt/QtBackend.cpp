@@ -257,7 +257,19 @@ BackendWindow*
 QtBackend::WindowAt(BPoint screen) const
 {
 	const QRect place = ToQt(BRect(screen.x, screen.y, screen.x, screen.y));
-	return dynamic_cast<QtWindow*>(QGuiApplication::topLevelAt(place.topLeft()));
+	QWindow* top = QGuiApplication::topLevelAt(place.topLeft());
+	if (fDragPicture == nullptr || top != fDragPicture.get())
+		return dynamic_cast<QtWindow*>(top);
+
+	// Where the picture's hole does not count: the one below it, as far as we know their order.
+	const auto rank = [](const QtWindow& window) { return static_cast<int>(window.Traits().kind); };
+	QtWindow* best = nullptr;
+	for (QtWindow* window : fWindows) {
+		const bool there = window->isVisible() && window->geometry().contains(place.topLeft());
+		if (there && (best == nullptr || rank(*window) >= rank(*best)))
+			best = window;
+	}
+	return best;
 }
 
 
