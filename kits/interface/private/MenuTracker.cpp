@@ -153,26 +153,29 @@ MenuTracker::_Begin()
 	for (const std::shared_ptr<MenuTracker>& other : living_trackers())
 		other->fFirstMessenger.SendMessage(kMenuAbort);
 	BMenu* menu = fRequest.menu;
-	if (fRequest.barItem != NULL)
-		menu = fRequest.barItem->IsEnabled() ? fRequest.barItem->Submenu() : NULL;
 	if ((fBar != NULL && fBar->fTracker != NULL) || (menu != NULL && menu->fTracker != NULL))
 		return false;
+	BMenuItem* item = NULL;
 	if (fBar != NULL) {
 		if (fBar->Window() != NULL)
 			fBar->Window()->MenusBeginning();
 		fBar->_Opened(this, fBar->ConvertToScreen(BPoint(0, 0)));
-	}
-	{
-		const std::lock_guard lock(sTrackersLock);
-		sTrackers.push_back(weak_from_this());
+		// The hook may have taken the item away.
+		if (_IsInOpenMenu(fRequest.barItem))
+			item = fRequest.barItem;
+		menu = item != NULL && item->IsEnabled() ? item->Submenu() : NULL;
 	}
 
 	fStartTime = time_of_press();
 	fFirst = new MenuWindow(shared_from_this(), BRect(0, 0, 10, 10));
 	fFirstMessenger = BMessenger(fFirst);
 	fFirst->Park();
+	{
+		const std::lock_guard lock(sTrackersLock);
+		sTrackers.push_back(weak_from_this());
+	}
 	if (fBar != NULL)
-		fBar->_SelectItem(fRequest.barItem);
+		fBar->_SelectItem(item);
 	if (menu != NULL)
 		_Open(menu, fRequest.byKey);
 	fFirst->Show();

@@ -34,13 +34,20 @@ struct MenuTestWindow : BWindow {
 		}
 	}
 
-	void MenusBeginning() override { beginnings++; }
+	void MenusBeginning() override
+	{
+		beginnings++;
+		if (onBeginning)
+			onBeginning();
+	}
+
 	void MenusEnded() override { ends++; }
 
 	std::vector<uint32> codes;
 	BMessage last;
 	int32 beginnings = 0;
 	int32 ends = 0;
+	std::function<void()> onBeginning;
 };
 
 typedef std::vector<uint32> Codes;
@@ -313,6 +320,20 @@ TEST(MenuTracking, DeletingAnOpenMenuEndsTheTracking)
 	menus.driver.Click(menus.BarItem(0));
 	EXPECT_TRUE(Menus::IsOpen(menus.edit));
 	menus.driver.Key("Escape");
+}
+
+
+TEST(MenuTracking, MenuThatItsWindowTakesAwayBeforeItOpensStaysClosed)
+{
+	Menus menus;
+	menus.Locked([&] {
+		menus.window->onBeginning = [&] { delete menus.bar->RemoveItem(static_cast<int32>(0)); };
+	});
+	menus.driver.Click(menus.BarItem(0));
+	menus.driver.Key("Escape");
+	EXPECT_EQ(1, menus.bar->CountItems());
+	EXPECT_EQ(1, menus.window->beginnings);
+	EXPECT_EQ(1, menus.window->ends);
 }
 
 
