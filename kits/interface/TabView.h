@@ -142,6 +142,7 @@ private:
 	void _RestoreContainer(BMessage* container, const BMessage& source) const;
 	void _Show(int32 index);
 	int32 _TabAt(BPoint where) const;
+	float _UsualTabHeight() const;
 	float _LabelWidth(int32 index) const;
 	void _InvalidateTabs();
 
