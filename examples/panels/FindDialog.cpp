@@ -97,8 +97,10 @@ MakeFindDialog()
 	panel->AddChild(MakeHistory());
 	constexpr uint32 kFollow = B_FOLLOW_RIGHT | B_FOLLOW_BOTTOM;
 	panel->AddChild(new BButton(
-		BRect(174, 250, 253, 273), "cancel", "Cancel", new BMessage(B_QUIT_REQUESTED), kFollow));
-	panel->AddChild(
-		new BButton(BRect(268, 250, 347, 273), "find", "Find", new BMessage('find'), kFollow));
+		BRect(172, 250, 251, 273), "cancel", "Cancel", new BMessage(B_QUIT_REQUESTED), kFollow));
+	BButton* find =
+		new BButton(BRect(266, 250, 345, 273), "find", "Find", new BMessage('find'), kFollow);
+	find->MakeDefault(true);
+	panel->AddChild(find);
 	return panel;
 }

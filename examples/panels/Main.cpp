@@ -3,7 +3,6 @@
 
 #include <cstdio>
 #include <cstring>
-#include <memory>
 #include <string>
 #include <vector>
 
@@ -11,6 +10,7 @@
 #include <File.h>
 #include <Message.h>
 #include <Resources.h>
+#include <Window.h>
 
 #include "Panels.h"
 
@@ -32,6 +32,21 @@ constexpr Design kDesigns[] = {
 };
 
 
+// In a window controls take their colours and sizes, so the design is archived after it was in one.
+status_t
+ArchiveDesign(const Design& design, BMessage* _archive)
+{
+	BView* view = design.make();
+	BWindow* window = new BWindow(
+		view->Frame().OffsetByCopy(50, 50), design.name, B_TITLED_WINDOW, B_ASYNCHRONOUS_CONTROLS);
+	window->AddChild(view);
+	const status_t status = view->Archive(_archive, true);
+	window->Lock();
+	window->Quit();
+	return status;
+}
+
+
 status_t
 AddDesign(const std::string& path, const Design& design)
 {
@@ -41,10 +56,9 @@ AddDesign(const std::string& path, const Design& design)
 	if (status == B_OK)
 		status = resources.SetTo(&file);
 
-	const std::unique_ptr<BView> view(design.make());
 	BMessage archive;
 	if (status == B_OK)
-		status = view->Archive(&archive, true);
+		status = ArchiveDesign(design, &archive);
 	std::vector<char> bytes(static_cast<size_t>(archive.FlattenedSize()));
 	const ssize_t size = static_cast<ssize_t>(bytes.size());
 	if (status == B_OK)

@@ -46,10 +46,10 @@ BView*
 MakeAccountGroup()
 {
 	BBox* box = MakeGroup(
-		BRect(12, 44, 427, 164), "account", "Account", B_FOLLOW_LEFT_RIGHT | B_FOLLOW_TOP);
-	box->AddChild(MakeField(BRect(12, 18, 403, 37), "name", "Your name:", "Ada Example", 'name'));
+		BRect(12, 44, 347, 164), "account", "Account", B_FOLLOW_LEFT_RIGHT | B_FOLLOW_TOP);
+	box->AddChild(MakeField(BRect(12, 18, 323, 37), "name", "Your name:", "Ada Example", 'name'));
 	box->AddChild(
-		MakeField(BRect(12, 42, 403, 61), "server", "Server:", "mail.example.org", 'serv'));
+		MakeField(BRect(12, 42, 323, 61), "server", "Server:", "mail.example.org", 'serv'));
 
 	BPopUpMenu* protocols = new BPopUpMenu("protocols");
 	for (const char* protocol : { "IMAP", "POP3", "Local folder" })
@@ -71,13 +71,13 @@ BView*
 MakeCheckingGroup()
 {
 	BBox* box = MakeGroup(
-		BRect(12, 174, 207, 268), "checking", "Look for new mail", B_FOLLOW_LEFT | B_FOLLOW_TOP);
+		BRect(12, 174, 172, 268), "checking", "Look for new mail", B_FOLLOW_LEFT | B_FOLLOW_TOP);
 	const char* choices[][2] = { { "often", "Every five minutes" }, { "hourly", "Every hour" },
 		{ "never", "When I ask for it" } };
 	float top = 18;
 	for (const auto& [name, label] : choices) {
 		box->AddChild(
-			new BRadioButton(BRect(12, top, 185, top + 17), name, label, new BMessage('chek')));
+			new BRadioButton(BRect(12, top, 150, top + 17), name, label, new BMessage('chek')));
 		top += 23;
 	}
 	static_cast<BRadioButton*>(box->FindView("hourly"))->SetValue(B_CONTROL_ON);
@@ -89,8 +89,8 @@ BView*
 MakeSoundGroup()
 {
 	BBox* box =
-		MakeGroup(BRect(217, 174, 427, 268), "sound", "Sound", B_FOLLOW_LEFT_RIGHT | B_FOLLOW_TOP);
-	BSlider* slider = new BSlider(BRect(12, 18, 198, 80), "volume", "Volume", new BMessage('volu'),
+		MakeGroup(BRect(182, 174, 347, 268), "sound", "Sound", B_FOLLOW_LEFT_RIGHT | B_FOLLOW_TOP);
+	BSlider* slider = new BSlider(BRect(12, 18, 153, 80), "volume", "Volume", new BMessage('volu'),
 		0, 10, B_TRIANGLE_THUMB, B_FOLLOW_LEFT_RIGHT | B_FOLLOW_TOP);
 	slider->SetLimitLabels("quiet", "loud");
 	slider->SetHashMarks(B_HASH_MARKS_BOTTOM);
@@ -110,9 +110,11 @@ AddButtons(BView* panel)
 	panel->AddChild(new BButton(BRect(12, 327, 91, 350), "defaults", "Defaults",
 		new BMessage('dflt'), B_FOLLOW_LEFT | B_FOLLOW_BOTTOM));
 	panel->AddChild(new BButton(
-		BRect(252, 327, 331, 350), "cancel", "Cancel", new BMessage(B_QUIT_REQUESTED), kFollow));
-	panel->AddChild(
-		new BButton(BRect(346, 327, 425, 350), "save", "Save", new BMessage('save'), kFollow));
+		BRect(172, 327, 251, 350), "cancel", "Cancel", new BMessage(B_QUIT_REQUESTED), kFollow));
+	BButton* save =
+		new BButton(BRect(266, 327, 345, 350), "save", "Save", new BMessage('save'), kFollow);
+	save->MakeDefault(true);
+	panel->AddChild(save);
 }
 
 
@@ -132,9 +134,9 @@ MakePanel(BRect frame, const char* name, uint32 resizingMode)
 BView*
 MakePreferences()
 {
-	BView* panel = MakePanel(BRect(0, 0, 439, 361), "preferences");
+	BView* panel = MakePanel(BRect(0, 0, 359, 361), "preferences");
 
-	BStringView* title = new BStringView(BRect(12, 12, 427, 34), "title", "Mail preferences");
+	BStringView* title = new BStringView(BRect(12, 12, 347, 34), "title", "Mail preferences");
 	BFont font(be_bold_font);
 	font.SetSize(16);
 	title->SetFont(&font);
@@ -146,7 +148,7 @@ MakePreferences()
 	panel->AddChild(MakeSoundGroup());
 
 	BStatusBar* space =
-		new BStatusBar(BRect(12, 276, 427, 312), "space", "Mailbox", "250 of 400 MB");
+		new BStatusBar(BRect(12, 276, 347, 312), "space", "Mailbox", "250 of 400 MB");
 	space->SetResizingMode(B_FOLLOW_LEFT_RIGHT | B_FOLLOW_TOP);
 	space->SetMaxValue(400);
 	space->Update(250);
