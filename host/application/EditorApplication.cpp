@@ -13,6 +13,7 @@
 #include "host/application/FileWindow.h"
 #include "host/application/PathWindow.h"
 #include "host/application/ResourceDocument.h"
+#include "host/application/StatusText.h"
 
 namespace {
 
@@ -109,7 +110,7 @@ EditorApplication::_OpenFile(const std::string& path)
 	if (status == B_OK)
 		return _ShowWindow(std::move(document));
 
-	const std::string text = "\"" + path + "\" could not be opened: " + strerror(status) + ".";
+	const std::string text = "\"" + path + "\" could not be opened: " + StatusText(status) + ".";
 	fprintf(stderr, "archway: %s\n", text.c_str());
 	(new BAlert("Archway", text.c_str(), "OK", NULL, NULL, B_WIDTH_AS_USUAL, B_STOP_ALERT))
 		->Go(NULL);

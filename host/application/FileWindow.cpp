@@ -20,6 +20,7 @@
 #include "host/application/ListHeader.h"
 #include "host/application/PathWindow.h"
 #include "host/application/ResourceDocument.h"
+#include "host/application/StatusText.h"
 
 using namespace BResEditor;
 
@@ -283,7 +284,7 @@ FileWindow::_OpenHandle(const BResourceHandle& handle)
 			.OffsetToCopy(Frame().LeftTop() + BPoint(kItemWindowOffset, kItemWindowOffset));
 	ItemWindow* window =
 		new ItemWindow(frame, BMessenger(this), fDocument.get(), fHandlers.get(), handle);
-	fItemWindows.push_back({ window, BMessenger(NULL, window), handle });
+	fItemWindows.push_back({ window, BMessenger(window), handle });
 	window->Show();
 }
 
@@ -328,7 +329,7 @@ FileWindow::_Generate(BMessage* request)
 	if (status == B_OK)
 		_OpenHandle(handle);
 	else
-		_Tell(std::string("The resource could not be made: ") + strerror(status) + ".");
+		_Tell(std::string("The resource could not be made: ") + StatusText(status) + ".");
 }
 
 
@@ -444,7 +445,7 @@ FileWindow::_Save()
 	const status_t status = fDocument->Save();
 	if (status != B_OK) {
 		fSaveBeforeClosing = false;
-		_Tell(std::string("\"") + fDocument->Path() + "\" could not be saved: " + strerror(status)
+		_Tell(std::string("\"") + fDocument->Path() + "\" could not be saved: " + StatusText(status)
 			+ ". The file is as it was.");
 	}
 	_UpdateTitle();
@@ -459,7 +460,7 @@ FileWindow::_SaveAs(const std::string& path)
 	const status_t status = fDocument->SaveAs(path.c_str());
 	if (status != B_OK) {
 		fSaveBeforeClosing = false;
-		_Tell("\"" + path + "\" could not be written: " + strerror(status) + ".");
+		_Tell("\"" + path + "\" could not be written: " + StatusText(status) + ".");
 	}
 	_UpdateTitle();
 	if (fSaveBeforeClosing)
