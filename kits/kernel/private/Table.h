@@ -44,11 +44,16 @@ public:
 		return object;
 	}
 
-	// The id of the first object for which the function is true, or -1.
+	// The id of an object for which the function is true, or -1. The table is not locked meanwhile,
+	// so the function may take the objects' own locks.
 	template<typename Predicate> int32 Find(Predicate predicate) const
 	{
-		std::shared_lock lock(fLock);
-		for (const auto& [id, object] : fObjects) {
+		std::vector<std::pair<int32, std::shared_ptr<T>>> objects;
+		{
+			std::shared_lock lock(fLock);
+			objects.assign(fObjects.begin(), fObjects.end());
+		}
+		for (const auto& [id, object] : objects) {
 			if (predicate(*object))
 				return id;
 		}
