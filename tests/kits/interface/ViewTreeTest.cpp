@@ -129,8 +129,8 @@ TEST(ViewTree, FlagsAndModeShareOneWord)
 
 TEST(ViewTree, HooksOfAttachingComeParentsFirstThenChildrenFirst)
 {
-	TestWindow window;
 	Log log;
+	TestWindow window;
 	BView* parent = new LogView("p", log);
 	BView* child = new LogView("c", log);
 	BView* grandchild = new LogView("g", log);
@@ -171,8 +171,8 @@ TEST(ViewTree, AViewAddedByAHookIsAttachedCompletelyAtOnce)
 		Log& fOther;
 	};
 
-	TestWindow window;
 	Log log;
+	TestWindow window;
 	BView* adder = new Adder(log);
 	adder->AddChild(new LogView("old", log));
 	window.Add(adder);
@@ -196,8 +196,8 @@ TEST(ViewTree, AHookMayTakeViewsOut)
 		}
 	};
 
-	TestWindow window;
 	Log log;
+	TestWindow window;
 	BView* parent = new LogView("p", log);
 	parent->AddChild(new Remover(log));
 	parent->AddChild(new LogView("gone", log));
@@ -280,8 +280,8 @@ TEST(ViewTree, TheWindowsViewsFollowItsSize)
 
 TEST(ViewTree, FrameHooksComeLaterMovedBeforeResized)
 {
-	TestWindow window;
 	Log log;
+	TestWindow window;
 	BView* view = window.Add(new LogView("v", log));
 	log.clear();
 	window.Window()->Lock();

@@ -90,8 +90,8 @@ rects(const BRegion& region)
 
 TEST(ViewUpdate, ManyInvalidationsAreOneUpdate)
 {
-	TestWindow window;
 	int updates = 0;
+	TestWindow window;
 	auto filter = new CountUpdates(&updates);
 	PaintView* view = window.Add(new PaintView(BRect(0, 0, 199, 199), kRed));
 	window.Locked([&] { window.Window()->AddCommonFilter(filter); });
@@ -110,8 +110,8 @@ TEST(ViewUpdate, ManyInvalidationsAreOneUpdate)
 
 TEST(ViewUpdate, DrawingComesParentsFirstInChildOrderAndOnlyWhereDirty)
 {
-	TestWindow window;
 	std::vector<BView*> log;
+	TestWindow window;
 	PaintView* parent = new PaintView(BRect(0, 0, 199, 199), kWhite);
 	PaintView* a = new PaintView(BRect(0, 0, 49, 49), kRed);
 	PaintView* b = new PaintView(BRect(25, 25, 74, 74), kGreen);
@@ -335,8 +335,8 @@ TEST(ViewUpdate, NothingOfATransactionIsShownBeforeItsEnd)
 TEST(ViewUpdate, OfManyViewsOnlyThoseThatWereTouchedAreDrawn)
 {
 	constexpr int kViews = 10000;
-	TestWindow window(BRect(0, 0, 999, 999));
 	std::vector<BView*> log;
+	TestWindow window(BRect(0, 0, 999, 999));
 	PaintView* parent = new PaintView(BRect(0, 0, 999, 999), kWhite);
 	std::vector<PaintView*> views;
 	for (int i = 0; i < kViews; i++) {

@@ -79,7 +79,13 @@ private:
 };
 
 
-struct Two : TestWindow {
+// The log outlives the window, whose views write into it.
+struct LogHolder {
+	Log log;
+};
+
+
+struct Two : LogHolder, TestWindow {
 	Two()
 	{
 		a = Add(new InputView("a", BRect(0, 0, 99, 99), log, B_NAVIGABLE));
@@ -88,7 +94,6 @@ struct Two : TestWindow {
 		log.clear();
 	}
 
-	Log log;
 	InputView* a;
 	InputView* b;
 };
@@ -443,9 +448,9 @@ TEST(WindowInput, PulseComesToViewsThatAskForIt)
 		void Pulse() override { fCount++; }
 		std::atomic<int>& fCount;
 	};
-	TestWindow window;
 	std::atomic<int> beats { 0 };
 	std::atomic<int> others { 0 };
+	TestWindow window;
 	window.Locked([&] { window.Window()->SetPulseRate(5000); });
 	window.Add(new Beat(0, others));
 	window.Add(new Beat(B_PULSE_NEEDED, beats));
@@ -471,8 +476,8 @@ TEST(WindowInput, ActivationReachesTheWindowThenEveryView)
 		}
 		Log& fLog;
 	};
-	TestWindow window;
 	Log log;
+	TestWindow window;
 	BView* parent = new Note("p", log);
 	parent->AddChild(new Note("c", log));
 	window.Add(parent);
