@@ -59,19 +59,50 @@ LoadPlugins()
 }
 
 
+// To be called before anything else is asked of Qt's images.
+void
+Prepare()
+{
+	static std::once_flag sOnce;
+	std::call_once(sOnce, [] {
+		QImageReader::setAllocationLimit(kMaxMegabytes);
+		// Damage is reported by our own results.
+		QLoggingCategory::setFilterRules("qt.gui.imageio*=false");
+		LoadPlugins();
+	});
+}
+
+
+// Whether every piece of a PNG file lies inside it. The library takes memory for a piece by the
+// length that its header claims.
+bool
+HasWholeChunks(const uint8* data, size_t size)
+{
+	constexpr size_t kSignature = 8;
+	constexpr size_t kAround = 12; // length, type, checksum
+
+	for (size_t at = kSignature; at < size;) {
+		if (size - at < kAround)
+			return false;
+		const uint32 length = (uint32)data[at] << 24 | (uint32)data[at + 1] << 16
+			| (uint32)data[at + 2] << 8 | data[at + 3];
+		if (length > size - at - kAround)
+			return false;
+		if (memcmp(data + at + 4, "IEND", 4) == 0)
+			return true;
+		at += kAround + length;
+	}
+	return false;
+}
+
+
 // Reads from memory that it does not copy.
 class MemoryReader {
 public:
 	MemoryReader(const void* data, size_t size) :
 		fBytes(QByteArray::fromRawData(static_cast<const char*>(data), size))
 	{
-		static std::once_flag sOnce;
-		std::call_once(sOnce, [] {
-			QImageReader::setAllocationLimit(kMaxMegabytes);
-			// Damage is reported by our own results.
-			QLoggingCategory::setFilterRules("qt.gui.imageio*=false");
-			LoadPlugins();
-		});
+		Prepare();
 
 		fBuffer.setData(fBytes);
 		fBuffer.open(QIODevice::ReadOnly);
@@ -111,6 +142,8 @@ DecodeImage(const void* data, size_t size)
 	const QByteArray format = reader.Format();
 	if (format.isEmpty())
 		return B_BAD_TYPE;
+	if (format == "png" && !HasWholeChunks(static_cast<const uint8*>(data), size))
+		return B_BAD_DATA;
 	if (!reader.IsWithinLimits())
 		return B_BAD_DATA;
 	const QImage image = reader.Read().convertToFormat(QImage::Format_ARGB32);
@@ -144,6 +177,7 @@ EncodeImage(const Surface& surface, const std::string& format)
 {
 	if (!surface.IsValid())
 		return B_BAD_VALUE;
+	Prepare();
 	const QImage image(reinterpret_cast<const uchar*>(surface.Row(0)), surface.DeviceWidth(),
 		surface.DeviceHeight(), surface.BytesPerRow(),
 		surface.Format() == SurfaceFormat::kAlpha ? QImage::Format_ARGB32 : QImage::Format_RGB32);
@@ -159,6 +193,7 @@ EncodeImage(const Surface& surface, const std::string& format)
 std::vector<std::string>
 ReadableImageFormats()
 {
+	Prepare();
 	return ToNames(QImageReader::supportedImageFormats());
 }
 
@@ -166,6 +201,7 @@ ReadableImageFormats()
 std::vector<std::string>
 WritableImageFormats()
 {
+	Prepare();
 	return ToNames(QImageWriter::supportedImageFormats());
 }
 
