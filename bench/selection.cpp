@@ -60,9 +60,10 @@ public:
 	{
 		fEditor = new ViewEditor(fArgs, fItem);
 		fWindow.Locked([&] {
+			// Only what is attached has its children follow.
 			const BRect bounds = fWindow.Window()->Bounds();
-			fEditor->ResizeTo(bounds.Width(), bounds.Height());
 			fWindow.Window()->AddChild(fEditor);
+			fEditor->ResizeTo(bounds.Width(), bounds.Height());
 		});
 	}
 
