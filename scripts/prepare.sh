@@ -22,6 +22,7 @@ test_packages=(
 	"openbox:a window manager for that screen"
 	"xdotool:moves the pointer and presses keys as a person does"
 	"x11-utils:asks that screen about its windows"
+	"fonts-dejavu-core:characters that the default fonts lack, for tests of text"
 	"imagemagick:takes and compares pictures of that screen"
 )
 

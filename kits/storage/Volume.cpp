@@ -64,7 +64,13 @@ FindMount(dev_t device, Mount* _mount)
 				line.substr(separator + 3, line.find(' ', separator + 3) - separator - 3);
 		return true;
 	}
-	return false;
+
+	// Below a changed root directory the table does not tell about the root itself.
+	struct stat info;
+	if (stat("/", &info) != 0 || info.st_dev != device)
+		return false;
+	_mount->point = "/";
+	return true;
 }
 
 } // namespace
