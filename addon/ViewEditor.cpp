@@ -61,7 +61,7 @@ private:
 ViewEditor::ViewEditor(const BResourceAddonArgs& args, BResourceHandle handle) :
 	BFullItemEditor(args, handle, static_cast<BView*>(this)),
 	BView(BRect(0, 0, 500, 450), "BView Editor", B_FOLLOW_ALL_SIDES, B_NAVIGABLE_JUMP), fPanels(),
-	fPanelCount(0)
+	fPanelCount(0), fWroteItem(false)
 {
 	Init();
 }

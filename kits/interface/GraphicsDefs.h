@@ -81,7 +81,8 @@ typedef struct color_map {
 // transparent entry.
 const color_map* system_colors();
 
-enum color_space {
+// Any number may come from outside, so the type has all of them.
+enum color_space : uint32 {
 	B_NO_COLOR_SPACE = 0x0000,
 
 	// Linear spaces, little-endian; in memory blue comes first.
