@@ -4,6 +4,7 @@
 
 #include <sys/stat.h>
 
+#include <Entry.h>
 #include <File.h>
 #include <Message.h>
 #include <MessageForm.h>
@@ -126,21 +127,24 @@ ResourceDocument::SaveAs(const char* path)
 		return Save();
 
 	ReadAccess access(this);
-	BFile file(path, B_READ_WRITE | B_CREATE_FILE);
-	status_t status = file.InitCheck();
+	BResources resources;
+	status_t status = B_OK;
+	for (int32 i = 0; status == B_OK && i < CountItems(); i++)
+		status = AddItemTo(resources, *Item(HandleAt(i)));
 	if (status != B_OK)
 		return status;
 
-	BResources resources;
-	status = resources.SetTo(&file, true);
-	for (int32 i = 0; status == B_OK && i < CountItems(); i++) {
-		const BResourceItem* item = Item(HandleAt(i));
-		status = AddItemTo(resources, *item);
-	}
+	// What an existing file holds is replaced in one step, once everything is written.
+	const bool isNew = !BEntry(path).Exists();
+	BFile file(path, B_READ_WRITE | B_CREATE_FILE);
+	status = file.InitCheck();
 	if (status == B_OK)
-		status = resources.Sync();
-	if (status != B_OK)
+		status = resources.WriteTo(&file);
+	if (status != B_OK) {
+		if (isNew)
+			BEntry(path).Remove();
 		return status;
+	}
 
 	fPath = path;
 	fSaved = _PresentItems();
