@@ -2,6 +2,7 @@
 
 #include <vector>
 
+#include <DataIO.h>
 #include <OS.h>
 #include <Window.h>
 
@@ -132,7 +133,8 @@ ViewEditor::ExecDataChanged(
 		return;
 
 	BMessage archive;
-	archive.Unflatten(static_cast<const char*>(resource->Data()));
+	BMemoryIO bytes(resource->Data(), resource->Size());
+	archive.Unflatten(&bytes);
 	fLastArchive = archive;
 	SwapInheritedViews(&archive, 0);
 	BArchivable* object = instantiate_object(&archive);
