@@ -8,6 +8,7 @@
 
 #include <Application.h>
 #include <Archivable.h>
+#include <DataIO.h>
 #include <Message.h>
 #include <Point.h>
 #include <Resources.h>
@@ -156,8 +157,12 @@ ViewFromResource(int32 id)
 
 	size_t size;
 	const void* data = sResources->LoadResource(kArchiveType, id, &size);
+	if (data == nullptr)
+		return nullptr;
+
+	BMemoryIO bytes(data, size);
 	BMessage archive;
-	if (data == nullptr || archive.Unflatten(static_cast<const char*>(data)) != B_OK)
+	if (archive.Unflatten(&bytes) != B_OK)
 		return nullptr;
 	return ViewFromArchive(&archive);
 }

@@ -6,6 +6,7 @@
 #include <AppDefs.h>
 #include <Beep.h>
 #include <Bitmap.h>
+#include <DataIO.h>
 #include <Entry.h>
 #include <File.h>
 #include <MenuBar.h>
@@ -56,8 +57,12 @@ ObjectFromFile(const entry_ref& ref)
 		return NULL;
 	size_t size;
 	const void* data = resources.LoadResource(kArchiveType, kDraggedResourceName, &size);
+	if (data == NULL)
+		return NULL;
+
+	BMemoryIO bytes(data, size);
 	BMessage archive;
-	if (data == NULL || archive.Unflatten(static_cast<const char*>(data)) != B_OK)
+	if (archive.Unflatten(&bytes) != B_OK)
 		return NULL;
 	return instantiate_object(&archive);
 }

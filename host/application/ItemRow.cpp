@@ -2,6 +2,7 @@
 
 #include <cmath>
 
+#include <DataIO.h>
 #include <Font.h>
 #include <Message.h>
 #include <View.h>
@@ -28,7 +29,8 @@ PreviewOf(const BResourceItem* item)
 {
 	BMessage message;
 	const char* text;
-	if (item->Size() > 0 && message.Unflatten(static_cast<const char*>(item->Data())) == B_OK) {
+	BMemoryIO data(item->Data(), item->Size());
+	if (item->Size() > 0 && message.Unflatten(&data) == B_OK) {
 		if (message.FindString("class", &text) != B_OK)
 			return "message";
 		BString preview(text);
