@@ -9,12 +9,14 @@
 #include <Button.h>
 #include <Message.h>
 #include <OS.h>
+#include <TextControl.h>
 
 #include "archive/ViewArchive.h"
 #include "archive/ViewTree.h"
 #include "editors/EditView.h"
 #include "kernel/private/Debugger.h"
 #include "palette/WidgetWindow.h"
+#include "support/ControlUser.h"
 #include "support/TestWindow.h"
 #include "work/WorkView.h"
 
@@ -108,6 +110,7 @@ protected:
 	BView* Column() { return editor->ChildAt(0); }
 
 	TestWindow window;
+	ControlUser person { window.driver };
 	BResourceCollection collection;
 	BResourceAddonArgs args;
 	BResourceAddonBase user;
@@ -326,8 +329,7 @@ TEST_F(ViewEditorTest, ANameTypedInThePanelReachesTheItem)
 {
 	Open();
 	window.driver.Click(Find("plain"));
-	window.Locked([&] { Column()->FindView("EditView")->ChildAt(0)->MakeFocus(true); });
-	window.driver.Type("fresh\n");
+	person.TypeOver(ControlUser::Find<BTextControl>(Column(), "Name: "), "fresh");
 	Close();
 
 	BMessage archive, child;

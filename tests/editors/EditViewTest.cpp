@@ -1,6 +1,5 @@
 #include "editors/EditView.h"
 
-#include <functional>
 #include <string>
 
 #include <gtest/gtest.h>
@@ -12,88 +11,20 @@
 #include <TextControl.h>
 #include <TextView.h>
 
-#include "support/TestWindow.h"
+#include "PanelFixture.h"
 
 namespace {
 
 
-// The panel beside a ground that holds the edited view.
-class EditViewTest : public testing::Test {
+class EditViewTest : public PanelFixture<EditView> {
 protected:
-	EditViewTest() : window(BRect(20, 20, 739, 419))
-	{
-		panel = window.Add(new EditView);
-		ground = window.Add(new BView(
-			BRect(420, 0, 719, 399), "ground", B_FOLLOW_LEFT | B_FOLLOW_TOP, B_WILL_DRAW));
-	}
-
-	BView* Use(BView* view)
-	{
-		window.Locked([&] {
-			ground->AddChild(view);
-			EXPECT_TRUE(panel->UseView(view));
-		});
-		return view;
-	}
-
 	BView* UsePlain(uint32 mode = B_FOLLOW_LEFT | B_FOLLOW_TOP, uint32 flags = B_WILL_DRAW)
 	{
 		return Use(new BView(BRect(10, 20, 109, 79), "plain", mode, flags));
 	}
 
-	template<class Control> Control* Find(const char* label)
-	{
-		for (BView* child = panel->ChildAt(0); child != nullptr; child = child->NextSibling()) {
-			Control* control = dynamic_cast<Control*>(child);
-			if (control != nullptr && std::string(control->Label()) == label)
-				return control;
-		}
-		return nullptr;
-	}
-
 	BTextControl* Text(const char* label) { return Find<BTextControl>(label); }
-
-	void TypeOver(const char* label, const char* text)
-	{
-		BTextControl* control = Text(label);
-		window.driver.Click(control->TextView());
-		window.Locked([&] { control->TextView()->SelectAll(); });
-		window.driver.Type(text);
-		window.driver.Key("Return");
-	}
-
-	// The two resizing fields have the same label.
-	BMenu* ResizingMenu(int32 which)
-	{
-		for (BView* child = panel->ChildAt(0); child != nullptr; child = child->NextSibling()) {
-			BMenuField* field = dynamic_cast<BMenuField*>(child);
-			if (field != nullptr && std::string(field->Label()) == "Resizing:" && which-- == 0)
-				return field->Menu();
-		}
-		return nullptr;
-	}
-
-	std::string Marked(BMenu* menu)
-	{
-		BMenuItem* item = menu->FindMarked();
-		return item != nullptr ? item->Label() : "";
-	}
-
-	// Chooses as the menu does: the item marks itself and sends.
-	void Choose(BMenu* menu, const char* label)
-	{
-		window.Locked([&] {
-			BMenuItem* item = menu->FindItem(label);
-			ASSERT_NE(nullptr, item);
-			static_cast<BInvoker*>(item)->Invoke();
-		});
-	}
-
 	std::string ShownFlags() { return Find<BMenuField>("Flags:")->MenuItem()->Label(); }
-
-	TestWindow window;
-	EditView* panel;
-	BView* ground;
 };
 
 
@@ -170,25 +101,25 @@ TEST_F(EditViewTest, ANewLeftEdgeKeepsTheRightOne)
 TEST_F(EditViewTest, MarksTheResizingMode)
 {
 	UsePlain(B_FOLLOW_ALL_SIDES);
-	EXPECT_EQ("Left & Right", Marked(ResizingMenu(0)));
-	EXPECT_EQ("Top & Bottom", Marked(ResizingMenu(1)));
+	EXPECT_EQ("Left & Right", Chosen("Resizing:", 0));
+	EXPECT_EQ("Top & Bottom", Chosen("Resizing:", 1));
 }
 
 
 TEST_F(EditViewTest, MarksNothingForAnOddResizingMode)
 {
 	UsePlain(B_FOLLOW_NONE);
-	EXPECT_EQ("", Marked(ResizingMenu(0)));
-	EXPECT_EQ("", Marked(ResizingMenu(1)));
+	EXPECT_EQ("", Chosen("Resizing:", 0));
+	EXPECT_EQ("", Chosen("Resizing:", 1));
 }
 
 
 TEST_F(EditViewTest, SetsTheResizingMode)
 {
 	BView* view = UsePlain();
-	Choose(ResizingMenu(0), "Right");
+	Choose("Resizing:", "Right", 0);
 	EXPECT_EQ(uint32(B_FOLLOW_RIGHT | B_FOLLOW_TOP), view->ResizingMode());
-	Choose(ResizingMenu(1), "V. Center");
+	Choose("Resizing:", "V. Center", 1);
 	EXPECT_EQ(uint32(B_FOLLOW_RIGHT | B_FOLLOW_V_CENTER), view->ResizingMode());
 }
 
@@ -197,11 +128,10 @@ TEST_F(EditViewTest, ShowsAndTogglesFlags)
 {
 	BView* view = UsePlain(B_FOLLOW_NONE, B_WILL_DRAW | B_FRAME_EVENTS);
 	EXPECT_EQ("Draw, FrEvts", ShownFlags());
-	BMenu* menu = Find<BMenuField>("Flags:")->Menu();
-	Choose(menu, "B_PULSE_NEEDED");
+	Choose("Flags:", "B_PULSE_NEEDED");
 	EXPECT_EQ("Draw, Pulse, FrEvts", ShownFlags());
 	EXPECT_EQ(uint32(B_WILL_DRAW | B_PULSE_NEEDED | B_FRAME_EVENTS), view->Flags());
-	Choose(menu, "B_WILL_DRAW");
+	Choose("Flags:", "B_WILL_DRAW");
 	EXPECT_EQ("Pulse, FrEvts", ShownFlags());
 }
 
@@ -209,7 +139,7 @@ TEST_F(EditViewTest, ShowsAndTogglesFlags)
 TEST_F(EditViewTest, FlagsThatTheMenuDoesNotShowSurvive)
 {
 	BView* view = UsePlain(B_FOLLOW_NONE, B_WILL_DRAW | 0x00010000);
-	Choose(Find<BMenuField>("Flags:")->Menu(), "B_NAVIGABLE");
+	Choose("Flags:", "B_NAVIGABLE");
 	EXPECT_EQ(uint32(B_WILL_DRAW | B_NAVIGABLE | 0x00010000), view->Flags());
 }
 
@@ -243,7 +173,7 @@ TEST_F(EditViewTest, ZoomFillsTheParent)
 	BView* view = UsePlain();
 	window.driver.Click(Find<BButton>("zoom"));
 	EXPECT_EQ(ground->Bounds(), view->Frame());
-	EXPECT_STREQ("299", Text("R:")->Text());
+	EXPECT_STREQ("379", Text("R:")->Text());
 }
 
 

@@ -245,7 +245,9 @@ protected:
 
 	void Select(BTabView* tabs, int32 index)
 	{
-		window.Locked([&] { tabs->Select(index); });
+		const BRect frame = tabs->TabFrame(index);
+		window.driver.Click(tabs, BPoint(frame.left + 8, frame.top + 8));
+		ASSERT_EQ(index, tabs->Selection());
 	}
 };
 
@@ -425,17 +427,7 @@ protected:
 		return text;
 	}
 
-	void Select(const char* text)
-	{
-		window.Locked([&] {
-			for (int32 i = 0; i < list->FullListCountItems(); i++)
-				list->Expand(list->FullListItemAt(i));
-			for (int32 i = 0; i < list->CountItems(); i++) {
-				if (std::string(static_cast<BStringItem*>(list->ItemAt(i))->Text()) == text)
-					list->Select(i);
-			}
-		});
-	}
+	void Select(const char* text) { user.ClickEntry(list, text); }
 
 	std::string Selected()
 	{

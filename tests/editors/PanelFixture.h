@@ -13,6 +13,7 @@
 #include <TextControl.h>
 #include <TextView.h>
 
+#include "support/ControlUser.h"
 #include "support/TestWindow.h"
 
 
@@ -52,19 +53,9 @@ protected:
 	}
 
 	// The n-th control of a class with that label, at any depth.
-	template<class Control>
-	Control* Find(const std::string& label, int n = 0, BView* within = nullptr)
+	template<class Control> Control* Find(const std::string& label, int n = 0)
 	{
-		BView* root = within != nullptr ? within : panel;
-		for (BView* child = root->ChildAt(0); child != nullptr; child = child->NextSibling()) {
-			Control* control = dynamic_cast<Control*>(child);
-			const char* text = control != nullptr ? control->Label() : nullptr;
-			if (control != nullptr && (text != nullptr ? text : "") == label && n-- == 0)
-				return control;
-			if (Control* found = Find<Control>(label, n, child))
-				return found;
-		}
-		return nullptr;
+		return ControlUser::Find<Control>(panel, label, n);
 	}
 
 	std::string Shown(const char* label, int n = 0) { return Find<BTextControl>(label, n)->Text(); }
@@ -73,29 +64,18 @@ protected:
 	{
 		BTextControl* control = Find<BTextControl>(label, n);
 		ASSERT_NE(nullptr, control);
-		window.driver.Click(control->TextView());
-		window.Locked([&] { control->TextView()->SelectAll(); });
-		if (text[0] == '\0')
-			window.driver.Key("Delete");
-		else
-			window.driver.Type(text);
-		window.driver.Key("Return");
+		user.TypeOver(control, text);
 	}
 
 	void Press(const char* label) { window.driver.Click(Find<BButton>(label)); }
 	void Tick(const char* label) { window.driver.Click(Find<BCheckBox>(label)); }
 	bool IsTicked(const char* label) { return Find<BCheckBox>(label)->Value() != B_CONTROL_OFF; }
 
-	// Opens the field by keys and chooses the item as its menu does.
 	void Choose(const char* fieldLabel, const char* item, int n = 0)
 	{
 		BMenuField* field = Find<BMenuField>(fieldLabel, n);
 		ASSERT_NE(nullptr, field);
-		window.Locked([&] {
-			BMenuItem* found = field->Menu()->FindItem(item);
-			ASSERT_NE(nullptr, found);
-			static_cast<BInvoker*>(found)->Invoke();
-		});
+		user.Choose(field, item);
 	}
 
 	std::string Chosen(const char* fieldLabel, int n = 0)
@@ -105,6 +85,7 @@ protected:
 	}
 
 	TestWindow window;
+	ControlUser user { window.driver };
 	Panel* panel;
 	BView* ground;
 };

@@ -9,6 +9,7 @@
 #include "editors/FloatControl.h"
 #include "editors/IntControl.h"
 #include "editors/LiveColorControl.h"
+#include "support/ControlUser.h"
 #include "support/TestWindow.h"
 
 namespace {
@@ -48,15 +49,10 @@ struct Fixture {
 		return control;
 	}
 
-	void TypeOver(BTextControl* control, const char* text)
-	{
-		window.driver.Click(control->TextView());
-		window.Locked([&] { control->TextView()->SelectAll(); });
-		window.driver.Type(text);
-		window.driver.Key("Return");
-	}
+	void TypeOver(BTextControl* control, const char* text) { user.TypeOver(control, text); }
 
 	TestWindow window;
+	ControlUser user { window.driver };
 	Receiver* receiver;
 };
 
