@@ -12,6 +12,9 @@ constexpr uint32 kSelectionChanged = 'clik';
 constexpr uint32 kSelectionMoved = 'move';
 constexpr const char* kSelectedViewField = "what";
 
+// From the work view to itself, behind what a field sends that has lost the keyboard.
+constexpr uint32 kFieldLeft = 'left';
+
 // From the work view to the highlight: draw now.
 constexpr uint32 kDrawHilite = 'draw';
 

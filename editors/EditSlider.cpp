@@ -27,8 +27,6 @@ constexpr uint32 kHashMarksChosen = 'hash';
 constexpr uint32 kThumbChosen = 'styl';
 constexpr uint32 kKeyIncrementChanged = 'kinc';
 constexpr uint32 kMarkCountChanged = 'mark';
-constexpr uint32 kColorChanged = 'colr';
-constexpr uint32 kComponentTyped = 'ccol';
 constexpr uint32 kDefaultPressed = 'dflt';
 
 constexpr float kPanelHeight = 232;
@@ -58,7 +56,7 @@ EditSlider::EditSlider() : EditorInterface("EditSlider", "Properties from BSlide
 
 	row.OffsetBy(0, kRowStep);
 	row.bottom = row.top + kGroupHeight;
-	const BarColorGroup group = AddBarColorGroup(this, row, kColorChanged, kDefaultPressed);
+	const BarColorGroup group = AddBarColorGroup(this, row, kDefaultPressed);
 	barColorControl = group.control;
 	barColorSwatch = group.swatch;
 }
@@ -106,10 +104,10 @@ EditSlider::ApplyEdit(BMessage* message)
 			barColorControl->SetValue(kDefaultColor);
 			_ApplyBarColor();
 			break;
-		case kColorChanged:
+		case kLiveColorChanged:
 			_ApplyBarColor();
 			break;
-		case kComponentTyped:
+		case kColorComponentTyped:
 			barColorControl->SetValueFromComponents();
 			break;
 		case kMinLabelChanged:

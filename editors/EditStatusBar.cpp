@@ -21,8 +21,6 @@ constexpr uint32 kTrailingTextChanged = 'ttxt';
 constexpr uint32 kValueChanged = 'valu';
 constexpr uint32 kMaxChanged = 'max ';
 constexpr uint32 kBarHeightChanged = 'barh';
-constexpr uint32 kColorChanged = 'colr';
-constexpr uint32 kComponentTyped = 'ccol';
 constexpr uint32 kDefaultPressed = 'dflt';
 
 constexpr float kPanelHeight = 177;
@@ -51,7 +49,7 @@ EditStatusBar::EditStatusBar() :
 	_AddNumberRow(row);
 
 	row.Set(area.left, area.top + kGroupTop, area.right, Bounds().bottom - area.left);
-	const BarColorGroup group = AddBarColorGroup(this, row, kColorChanged, kDefaultPressed);
+	const BarColorGroup group = AddBarColorGroup(this, row, kDefaultPressed);
 	fColorControl = group.control;
 	fSwatch = group.swatch;
 }
@@ -102,14 +100,14 @@ EditStatusBar::ApplyEdit(BMessage* message)
 		case kBarHeightChanged:
 			_ApplyBarHeight();
 			break;
-		case kComponentTyped:
+		case kColorComponentTyped:
 			fColorControl->SetValueFromComponents();
 			break;
 		case kDefaultPressed:
 			fColorControl->SetValue(kDefaultColor);
 			_ApplyBarColor();
 			break;
-		case kColorChanged:
+		case kLiveColorChanged:
 			_ApplyBarColor();
 			break;
 		default:

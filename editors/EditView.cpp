@@ -145,7 +145,8 @@ RangeMaximum(const BScrollBar* bar)
 } // namespace
 
 
-EditView::EditView() : EditorInterface("EditView", "Properties from BView", kPanelHeight)
+EditView::EditView() :
+	EditorInterface("EditView", "Properties from BView", kPanelHeight), fRole(ColorRole::kView)
 {
 	BRect area = RowArea();
 	_AddNameRow(area);

@@ -63,7 +63,7 @@ private:
 	void _ApplyRotation();
 
 	// EditViewColors.cpp
-	ColorRole _Role() const;
+	void _TakeRole();
 	void _LoadColors();
 	bool _ApplyColorEdit(BMessage* message);
 	void _ShowRole();
@@ -96,4 +96,5 @@ private:
 	BRadioButton* fViewRadio;
 	BRadioButton* fHighRadio;
 	BRadioButton* fLowRadio;
+	ColorRole fRole; // what the radio buttons selected when they last reported
 };

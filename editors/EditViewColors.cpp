@@ -14,8 +14,6 @@
 namespace {
 
 
-constexpr uint32 kColorChanged = 'colr';
-constexpr uint32 kComponentTyped = 'ccol';
 constexpr uint32 kDefaultPressed = 'dflt';
 constexpr uint32 kParentPressed = 'prnt';
 constexpr uint32 kChildrenPressed = 'chld';
@@ -83,7 +81,7 @@ EditView::_AddColorSection(BRect area)
 	AddChild(section);
 
 	fColorControl = new LiveColorControl(
-		BPoint(kInset, kFirstRow), B_CELLS_32x8, 1, "", new BMessage(kColorChanged), true);
+		BPoint(kInset, kFirstRow), B_CELLS_32x8, 1, "", new BMessage(kLiveColorChanged), true);
 	section->AddChild(fColorControl);
 
 	const float radioLeft = section->Bounds().right - kInset - kRadioWidth;
@@ -112,14 +110,16 @@ EditView::_AddColorSection(BRect area)
 }
 
 
-EditView::ColorRole
-EditView::_Role() const
+// The radio buttons may be ahead of the messages, which are carried out one by one.
+void
+EditView::_TakeRole()
 {
 	if (fHighRadio->Value() != B_CONTROL_OFF)
-		return ColorRole::kHigh;
-	if (fLowRadio->Value() != B_CONTROL_OFF)
-		return ColorRole::kLow;
-	return ColorRole::kView;
+		fRole = ColorRole::kHigh;
+	else if (fLowRadio->Value() != B_CONTROL_OFF)
+		fRole = ColorRole::kLow;
+	else
+		fRole = ColorRole::kView;
 }
 
 
@@ -129,6 +129,7 @@ EditView::_LoadColors()
 	ShowSwatch(fViewSwatch, target->ViewColor());
 	ShowSwatch(fHighSwatch, target->HighColor());
 	ShowSwatch(fLowSwatch, target->LowColor());
+	_TakeRole();
 	_ShowRole();
 }
 
@@ -140,12 +141,14 @@ EditView::_ApplyColorEdit(BMessage* message)
 		case kViewChosen:
 		case kHighChosen:
 		case kLowChosen:
+			_TakeRole();
 			_ShowRole();
 			break;
-		case kComponentTyped:
+		case kColorComponentTyped:
 			fColorControl->SetValueFromComponents();
+			_ApplyColor();
 			break;
-		case kColorChanged:
+		case kLiveColorChanged:
 			_ApplyColor();
 			break;
 		case kDefaultPressed:
@@ -170,7 +173,7 @@ EditView::_ApplyColorEdit(BMessage* message)
 void
 EditView::_ShowRole()
 {
-	switch (_Role()) {
+	switch (fRole) {
 		case ColorRole::kView:
 			fColorControl->SetValue(target->ViewColor());
 			fDefaultButton->SetLabel("216 Gray");
@@ -190,7 +193,7 @@ EditView::_ShowRole()
 void
 EditView::_UseDefaultColor()
 {
-	switch (_Role()) {
+	switch (fRole) {
 		case ColorRole::kView:
 			fColorControl->SetValue(kPanelGray);
 			break;
@@ -213,7 +216,7 @@ EditView::_UseParentColor()
 		return;
 	}
 
-	switch (_Role()) {
+	switch (fRole) {
 		case ColorRole::kView:
 			fColorControl->SetValue(parent->ViewColor());
 			break;
@@ -233,7 +236,7 @@ void
 EditView::_ApplyColor()
 {
 	const rgb_color color = fColorControl->ValueAsColor();
-	switch (_Role()) {
+	switch (fRole) {
 		case ColorRole::kView:
 			if (SameRGB(color, target->ViewColor()))
 				return;
@@ -265,7 +268,7 @@ void
 EditView::_SetChildrensColor()
 {
 	const rgb_color color = fColorControl->ValueAsColor();
-	const ColorRole role = _Role();
+	const ColorRole role = fRole;
 	ForEachDescendant(target, [color, role](BView* view) {
 		switch (role) {
 			case ColorRole::kView:

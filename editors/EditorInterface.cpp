@@ -1,6 +1,12 @@
 #include "editors/EditorInterface.h"
 
+#include <Looper.h>
+#include <Message.h>
+#include <TextControl.h>
+
+#include "archive/TypedText.h"
 #include "archive/ViewTree.h"
+#include "editors/LiveColorControl.h"
 #include "editors/TargetLock.h"
 
 namespace {
@@ -9,6 +15,19 @@ namespace {
 constexpr float kPanelWidth = 400;
 constexpr float kRowInsetX = 6;
 constexpr float kRowInsetY = 16;
+
+constexpr const char* kTypedTextSent = "typed text sent";
+
+
+// Whether the message comes from another control than the one in which something is being typed. A
+// colour control sends while it is dragged, and what it sends replaces no typed text.
+bool
+PassesBy(const BTextControl* field, const BMessage* message)
+{
+	const void* source;
+	return message->FindPointer("source", const_cast<void**>(&source)) == B_OK && source != field
+		&& message->what != kLiveColorChanged && message->what != kColorComponentTyped;
+}
 
 
 } // namespace
@@ -32,6 +51,9 @@ EditorInterface::AllAttached()
 void
 EditorInterface::MessageReceived(BMessage* message)
 {
+	if (_WaitsForTypedText(message))
+		return;
+
 	bool applied = false;
 	if (TargetLives()) {
 		TargetLock lock(target);
@@ -94,4 +116,21 @@ EditorInterface::MenuBesideTextFrame() const
 {
 	const BRect area = RowArea();
 	return BRect(area.right - 110, area.top - 2, area.right, area.top + 18);
+}
+
+
+// An edit may load the fields anew, or replace the view. So what is being typed in one of them is
+// sent first, and the message comes again behind that.
+bool
+EditorInterface::_WaitsForTypedText(const BMessage* message)
+{
+	BTextControl* field = FieldInUse(Window());
+	if (field == nullptr || dynamic_cast<EditorInterface*>(field->Target()) == nullptr
+		|| !PassesBy(field, message) || message->HasBool(kTypedTextSent))
+		return false;
+
+	SendTypedText(field);
+	BMessage again(*message);
+	again.AddBool(kTypedTextSent, true);
+	return Looper()->PostMessage(&again, this) == B_OK;
 }

@@ -48,6 +48,8 @@ protected:
 	BView* target; // borrowed; NULL when the panel has no view
 
 private:
+	bool _WaitsForTypedText(const BMessage* message);
+
 	ViewWatch fTargetWatch;
 };
 

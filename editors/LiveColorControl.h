@@ -3,6 +3,10 @@
 
 #include <ColorControl.h>
 
+// What the panels' colour controls send, and what the platform's fields for the components do.
+constexpr uint32 kLiveColorChanged = 'colr';
+constexpr uint32 kColorComponentTyped = 'ccol';
+
 
 // The message is sent for each value that is set, by the user or by the program: who loads the
 // control from a view gets the message too.

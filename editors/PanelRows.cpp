@@ -200,7 +200,7 @@ SameRGB(rgb_color a, rgb_color b)
 
 
 BarColorGroup
-AddBarColorGroup(BView* panel, BRect frame, uint32 colorCode, uint32 defaultCode)
+AddBarColorGroup(BView* panel, BRect frame, uint32 defaultCode)
 {
 	BBox* group = new BBox(frame, NULL, B_FOLLOW_ALL_SIDES, kGroupFlags, B_PLAIN_BORDER);
 	group->SetFont(be_plain_font, B_FONT_ALL);
@@ -212,8 +212,8 @@ AddBarColorGroup(BView* panel, BRect frame, uint32 colorCode, uint32 defaultCode
 	area.InsetBy(4, 4);
 
 	BarColorGroup parts;
-	parts.control =
-		new LiveColorControl(area.LeftTop(), B_CELLS_32x8, 1, "", new BMessage(colorCode), true);
+	parts.control = new LiveColorControl(
+		area.LeftTop(), B_CELLS_32x8, 1, "", new BMessage(kLiveColorChanged), true);
 	group->AddChild(parts.control);
 
 	BRect right(area.left + 280, area.top, area.right, area.top + 26);

@@ -69,6 +69,6 @@ struct BarColorGroup {
 	LiveColorControl* control;
 	BBox* swatch;
 };
-BarColorGroup AddBarColorGroup(BView* panel, BRect frame, uint32 colorCode, uint32 defaultCode);
+BarColorGroup AddBarColorGroup(BView* panel, BRect frame, uint32 defaultCode);
 void ShowSwatch(BBox* swatch, rgb_color color);
 BBox* AddSwatch(BView* panel, BRect frame);

@@ -6,9 +6,11 @@
 #include <Beep.h>
 #include <Message.h>
 #include <MessageFilter.h>
+#include <TextControl.h>
 #include <Window.h>
 
 #include "archive/EditorCodes.h"
+#include "archive/TypedText.h"
 #include "archive/ViewDrag.h"
 #include "archive/ViewTree.h"
 #include "work/HiliteView.h"
@@ -50,7 +52,7 @@ WorkView::WorkView(BRect frame, uint32 resizingMode, BHandler* editor) :
 	BScrollView("WorkView", MakeScrollTarget(frame), resizingMode, B_FRAME_EVENTS, true, true,
 		B_FANCY_BORDER),
 	fScrollOrigin(0, 0), fResizing(false), fLastResizePoint(0, 0), fRangeWidth(kInitialRange),
-	fRangeHeight(kInitialRange), fEditor(editor), fEditView(nullptr)
+	fRangeHeight(kInitialRange), fEditor(editor), fEditView(nullptr), fFieldsLeft(0)
 {
 	fContainer = new WorkBackgroundView(BRect(0, 0, kGroundSize, kGroundSize), "container",
 		B_FOLLOW_LEFT | B_FOLLOW_TOP, kTargetFlags);
@@ -167,6 +169,7 @@ WorkView::SetSelectedView(BView* view)
 	if (view == SelectedView())
 		return;
 
+	_SendTypedText();
 	Window()->BeginViewTransaction();
 	fHiliteView->InvalidateSelection();
 	fSelectedView.Set(view);
@@ -225,7 +228,7 @@ WorkView::HandleFilteredMouse(BMessage* message, BView* view, int32 modifiers)
 	if (message->FindPoint("where", &where) != B_OK)
 		return;
 
-	MakeFocus(true);
+	_TakeKeyboard();
 	if (view != SelectedView()) {
 		SetSelectedView(view);
 		return;
@@ -237,10 +240,37 @@ WorkView::HandleFilteredMouse(BMessage* message, BView* view, int32 modifiers)
 		beep();
 	else if (inResizeZone)
 		_BeginResize(where);
-	else if (view != fEditView)
-		_BeginMove(view, where, (modifiers & B_CONTROL_KEY) != 0);
-	else
+	else if (view == fEditView)
 		beep();
+	else if (fFieldsLeft > 0)
+		Window()->PostMessage(message, view);
+	else
+		_BeginMove(view, where, (modifiers & B_CONTROL_KEY) != 0);
+}
+
+
+// A field that loses the keyboard sends what was typed in it, by a message of its own. A view is
+// taken away only when that has arrived, and until then a press that would do so is put off.
+void
+WorkView::_TakeKeyboard()
+{
+	if (IsFocus())
+		return;
+
+	MakeFocus(true);
+	if (Window()->PostMessage(kFieldLeft, this) == B_OK)
+		fFieldsLeft++;
+}
+
+
+// What is being typed belongs to the view that was selected while it was typed, also when the
+// selection changes without a press, as under a drag.
+void
+WorkView::_SendTypedText()
+{
+	BTextControl* field = FieldInUse(Window());
+	if (field != nullptr && LiveViewAttached(fContainer, field) == nullptr)
+		SendTypedText(field);
 }
 
 

@@ -59,6 +59,8 @@ public:
 	void HandleFilteredDrop(BMessage* message, BView* target);
 
 private:
+	void _TakeKeyboard();
+	void _SendTypedText();
 	bool _MayMove(const BView* view) const;
 	void _BeginResize(BPoint where);
 	void _BeginMove(BView* view, BPoint where, bool copy);
@@ -79,4 +81,5 @@ private:
 	BView* fEditView; // child of the container, or NULL
 	HiliteView* fHiliteView; // child of the scroll target
 	ViewWatch fSelectedView;
+	int32 fFieldsLeft; // whose text may still be on its way to the panels
 };

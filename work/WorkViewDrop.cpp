@@ -106,6 +106,9 @@ WorkView::MessageReceived(BMessage* message)
 		case B_TRASH_TARGET:
 			// The view was taken away when its drag began.
 			break;
+		case kFieldLeft:
+			fFieldsLeft--;
+			break;
 		default:
 			BView::MessageReceived(message);
 	}

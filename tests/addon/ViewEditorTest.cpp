@@ -1,40 +1,29 @@
-#include "addon/ViewEditor.h"
+#include "EditorFixture.h"
 
-#include <memory>
 #include <string>
 #include <vector>
-
-#include <gtest/gtest.h>
 
 #include <Button.h>
 #include <Message.h>
 #include <OS.h>
 #include <TextControl.h>
 
-#include "archive/ViewArchive.h"
-#include "archive/ViewTree.h"
 #include "editors/EditView.h"
 #include "kernel/private/Debugger.h"
 #include "palette/WidgetWindow.h"
-#include "support/ControlUser.h"
-#include "support/TestWindow.h"
-#include "work/WorkView.h"
 
 using namespace BResEditor;
 
 namespace {
 
 
-// A collection with two items, and an editor of the first in a window.
-class ViewEditorTest : public testing::Test {
+class ViewEditorTest : public EditorFixture {
 protected:
-	ViewEditorTest() : window(BRect(30, 30, 829, 459)), args { &collection }, user(args)
+	ViewEditorTest() : EditorFixture(BRect(30, 30, 829, 459))
 	{
 		item = Add(1, MakeTree("root"));
 		other = Add(2, MakeTree("other"));
 	}
-
-	~ViewEditorTest() override { Close(); }
 
 	static BView* MakeTree(const char* name)
 	{
@@ -46,78 +35,18 @@ protected:
 		return root;
 	}
 
-	static std::vector<char> Flatten(BView* root)
-	{
-		std::unique_ptr<BView> owner(root);
-		BMessage archive;
-		root->Archive(&archive, true);
-		return Flatten(archive);
-	}
-
-	static std::vector<char> Flatten(const BMessage& archive)
-	{
-		std::vector<char> bytes(static_cast<size_t>(archive.FlattenedSize()));
-		archive.Flatten(bytes.data(), static_cast<ssize_t>(bytes.size()));
-		return bytes;
-	}
-
-	BResourceHandle Add(int32 id, BView* root)
-	{
-		const std::vector<char> bytes = Flatten(root);
-		BResourceHandle handle;
-		BResourceCollection* writable = user.WriteLock(NULL);
-		writable->AddItem(&handle, 'ARCV', id, "", bytes.data(), bytes.size());
-		user.WriteUnlock(writable);
-		return handle;
-	}
+	void Open() { EditorFixture::Open(item); }
 
 	void Set(const BResourceHandle& handle, const std::vector<char>& bytes)
 	{
-		BResourceCollection* writable = user.WriteLock(NULL);
+		BResourceCollection* writable = owner.WriteLock(NULL);
 		writable->WriteItem(handle)->SetData(bytes.data(), bytes.size());
-		user.WriteUnlock(writable);
+		owner.WriteUnlock(writable);
 		Driver::WaitUntilIdle();
 	}
 
-	std::string Bytes(const BResourceHandle& handle)
-	{
-		const BResourceItem* found = collection.Item(handle);
-		return std::string(static_cast<const char*>(found->Data()), found->Size());
-	}
-
-	void Open()
-	{
-		editor = new ViewEditor(args, item);
-		window.Locked([&] {
-			editor->ResizeTo(window.Window()->Bounds().Width(), window.Window()->Bounds().Height());
-			window.Window()->AddChild(editor);
-		});
-		workView = dynamic_cast<WorkView*>(editor->FindView("WorkView"));
-	}
-
-	// As the host does: out of the window first.
-	void Close()
-	{
-		if (editor == nullptr)
-			return;
-		window.Locked([&] { editor->RemoveSelf(); });
-		delete static_cast<BFullItemEditor*>(editor);
-		editor = nullptr;
-	}
-
-	BView* Find(const char* name) { return workView->EditView()->FindView(name); }
-
-	BView* Column() { return editor->ChildAt(0); }
-
-	TestWindow window;
-	ControlUser person { window.driver };
-	BResourceCollection collection;
-	BResourceAddonArgs args;
-	BResourceAddonBase user;
 	BResourceHandle item;
 	BResourceHandle other;
-	ViewEditor* editor = nullptr;
-	WorkView* workView = nullptr;
 };
 
 
@@ -156,11 +85,11 @@ TEST_F(ViewEditorTest, AnUnchangedTreeWritesNothing)
 	const std::string before = Bytes(item);
 	Open();
 	uint32 changes;
-	while (collection.GetNextChange(&user, &changes).IsValid())
+	while (collection.GetNextChange(&owner, &changes).IsValid())
 		;
 	Close();
 	EXPECT_EQ(before, Bytes(item));
-	EXPECT_FALSE(collection.GetNextChange(&user, &changes).IsValid());
+	EXPECT_FALSE(collection.GetNextChange(&owner, &changes).IsValid());
 }
 
 
@@ -268,9 +197,9 @@ TEST_F(ViewEditorTest, AChangeWithoutTheWindowsLockStopsInTheDebugger)
 	static std::string sText;
 	sText.clear();
 	BPrivate::set_debugger_hook([](const char* text) { sText = text; });
-	const BResourceCollection* readable = user.ReadLock();
+	const BResourceCollection* readable = owner.ReadLock();
 	editor->ExecDataChanged(readable, item, 0x8);
-	user.ReadUnlock(readable);
+	owner.ReadUnlock(readable);
 	BPrivate::set_debugger_hook(NULL);
 	EXPECT_EQ("ExecDataChanged() called without window locked", sText);
 }
