@@ -5,7 +5,7 @@
 
 // From menus and lists to the file window.
 constexpr uint32 kNewFile = 'Nfil';
-constexpr uint32 kOpenFile = 'Ofil';
+constexpr uint32 kOpenFile = 'Ofil'; // to the application: string "path", the asking window's file
 constexpr uint32 kSave = 'Save';
 constexpr uint32 kSaveAs = 'SvAs';
 constexpr uint32 kRevert = 'Rvrt';
@@ -14,7 +14,13 @@ constexpr uint32 kRedoStep = 'Redo';
 constexpr uint32 kOpenItem = 'Oitm';
 constexpr uint32 kDeleteItem = 'Ditm';
 constexpr uint32 kGenerateItem = 'Gitm'; // int32 "handler"; the fields of the generate-info
-constexpr uint32 kPathChosen = 'Path'; // string "path"
+
+constexpr uint32 kImportItem = 'Iitm';
+constexpr uint32 kExportItem = 'Eitm';
+
+// From file panels to the file window, with what the user chose.
+constexpr uint32 kImportChosen = 'Icho';
+constexpr uint32 kExportChosen = 'Echo';
 
 // From the file window to an item window: finish what is being typed and write it into the item.
 // Answered, when that is done, by kItemApplied.

@@ -6,12 +6,12 @@
 #include <Alert.h>
 #include <AppDefs.h>
 #include <Entry.h>
+#include <FilePanel.h>
 #include <Message.h>
 #include <Path.h>
 
 #include "host/application/Codes.h"
 #include "host/application/FileWindow.h"
-#include "host/application/PathWindow.h"
 #include "host/application/ResourceDocument.h"
 #include "host/application/StatusText.h"
 
@@ -30,6 +30,11 @@ constexpr float kCascade = 24;
 
 EditorApplication::EditorApplication(const Options& options) :
 	BApplication(kSignature), fOptions(options)
+{
+}
+
+
+EditorApplication::~EditorApplication()
 {
 }
 
@@ -63,10 +68,7 @@ EditorApplication::MessageReceived(BMessage* message)
 			_ShowWindow(std::make_unique<ResourceDocument>());
 			break;
 		case kOpenFile:
-			(new PathWindow("Open", "Open", "", BMessenger(this)))->Show();
-			break;
-		case kPathChosen:
-			_OpenFile(message->GetString("path", ""));
+			_ShowOpenPanel(message);
 			break;
 		case kFileWindowClosed:
 			_WindowClosed(message);
@@ -87,6 +89,21 @@ EditorApplication::QuitRequested()
 	for (FileWindow* window : fWindows)
 		window->PostMessage(B_QUIT_REQUESTED);
 	return false;
+}
+
+
+// Begins in the folder of the file whose window asks, later on where the user was last.
+void
+EditorApplication::_ShowOpenPanel(const BMessage* message)
+{
+	const bool isFirst = fOpenPanel == nullptr;
+	if (isFirst)
+		fOpenPanel = std::make_unique<BFilePanel>();
+	BPath folder;
+	const char* path = message->GetString("path", "");
+	if (isFirst && path[0] != '\0' && BPath(path).GetParent(&folder) == B_OK)
+		fOpenPanel->SetPanelDirectory(folder.Path());
+	fOpenPanel->Show();
 }
 
 

@@ -8,6 +8,7 @@
 #include <Application.h>
 #include <Messenger.h>
 
+class BFilePanel;
 class FileWindow;
 
 
@@ -23,6 +24,7 @@ public:
 	};
 
 	explicit EditorApplication(const Options& options);
+	~EditorApplication() override;
 
 	void ReadyToRun() override;
 	void RefsReceived(BMessage* message) override;
@@ -33,9 +35,11 @@ private:
 	// NULL when the file cannot be read, of which the user is told.
 	FileWindow* _OpenFile(const std::string& path);
 	FileWindow* _ShowWindow(std::unique_ptr<class ResourceDocument> document);
+	void _ShowOpenPanel(const BMessage* message);
 	void _OpenOptions();
 	void _WindowClosed(const BMessage* message);
 
 	Options fOptions;
+	std::unique_ptr<BFilePanel> fOpenPanel; // NULL until it is needed
 	std::vector<FileWindow*> fWindows; // each until it tells that it goes
 };

@@ -5,11 +5,13 @@
 #include <Alert.h>
 #include <AppDefs.h>
 #include <Application.h>
+#include <FilePanel.h>
 #include <ListView.h>
 #include <Menu.h>
 #include <MenuBar.h>
 #include <MenuItem.h>
 #include <Message.h>
+#include <Path.h>
 #include <ScrollView.h>
 #include <String.h>
 
@@ -18,7 +20,6 @@
 #include "host/application/ItemRow.h"
 #include "host/application/ItemWindow.h"
 #include "host/application/ListHeader.h"
-#include "host/application/PathWindow.h"
 #include "host/application/ResourceDocument.h"
 #include "host/application/StatusText.h"
 
@@ -66,15 +67,34 @@ FileWindow::MessageReceived(BMessage* message)
 		case kSaveAs:
 			_AskForPath();
 			break;
-		case kPathChosen: {
-			const std::string path = message->GetString("path", "");
-			_ApplyItemsThen([this, path] { _SaveAs(path); });
+		case B_SAVE_REQUESTED:
+			_PlaceChosen(message);
 			break;
-		}
+		case B_CANCEL:
+			if (message->GetInt32("old_what", 0) == B_SAVE_REQUESTED)
+				fSaveBeforeClosing = false;
+			break;
+		case kImportItem:
+			_AskForImport();
+			break;
+		case kImportChosen:
+			_Import(message);
+			break;
+		case kExportItem:
+			_AskForExport();
+			break;
+		case kExportChosen:
+			_Export(message);
+			break;
 		case kNewFile:
-		case kOpenFile:
 			be_app->PostMessage(message);
 			break;
+		case kOpenFile: {
+			BMessage open(kOpenFile);
+			open.AddString("path", fDocument->Path());
+			be_app->PostMessage(&open);
+			break;
+		}
 		case kOpenItem:
 			_OpenSelection();
 			break;
@@ -215,6 +235,9 @@ FileWindow::_AddMenuBar()
 	menu->AddItem(newMenu);
 	menu->AddItem(new BMenuItem("Open", new BMessage(kOpenItem)));
 	menu->AddItem(new BMenuItem("Delete", new BMessage(kDeleteItem)));
+	menu->AddSeparatorItem();
+	menu->AddItem(new BMenuItem("Import...", new BMessage(kImportItem), 'I'));
+	menu->AddItem(new BMenuItem("Export...", new BMessage(kExportItem), 'E'));
 	fMenuBar->AddItem(menu);
 
 	AddChild(fMenuBar);
@@ -471,9 +494,20 @@ FileWindow::_SaveAs(const std::string& path)
 void
 FileWindow::_AskForPath()
 {
-	const char* path = fDocument->Path();
-	(new PathWindow("Save as", "Save", path[0] != '\0' ? path : "Untitled.rsrc", BMessenger(this)))
-		->Show();
+	const BPath path(fDocument->Path());
+	if (fSavePanel == nullptr)
+		fSavePanel = _MakePanel(B_SAVE_PANEL, B_SAVE_REQUESTED, "Save");
+	fSavePanel->SetSaveText(path.InitCheck() == B_OK ? path.Leaf() : "Untitled.rsrc");
+	fSavePanel->Show();
+}
+
+
+void
+FileWindow::_PlaceChosen(const BMessage* message)
+{
+	const std::string chosen = _ChosenPath(message);
+	if (!chosen.empty())
+		_ApplyItemsThen([this, chosen] { _SaveAs(chosen); });
 }
 
 
@@ -531,6 +565,38 @@ FileWindow::_CloseItems()
 	}
 	for (const OpenWindow& open : fItemWindows)
 		open.messenger.SendMessage(B_QUIT_REQUESTED);
+}
+
+
+// In the folder of the document's file, if there is one.
+std::unique_ptr<BFilePanel>
+FileWindow::_MakePanel(file_panel_mode mode, uint32 what, const char* verb)
+{
+	BMessenger target(this);
+	BMessage message(what);
+	auto panel = std::make_unique<BFilePanel>(mode, &target, nullptr, 0, true, &message);
+	const BPath path(fDocument->Path());
+	BPath folder;
+	if (path.InitCheck() == B_OK && path.GetParent(&folder) == B_OK)
+		panel->SetPanelDirectory(folder.Path());
+	panel->SetButtonLabel(B_DEFAULT_BUTTON, verb);
+	BWindow* window = panel->Window();
+	window->Lock();
+	window->SetTitle(verb);
+	window->Unlock();
+	return panel;
+}
+
+
+// What the user chose in a panel for saving; "" when it is gone.
+std::string
+FileWindow::_ChosenPath(const BMessage* message)
+{
+	entry_ref folder;
+	if (message->FindRef("directory", &folder) != B_OK)
+		return "";
+	BPath path(&folder);
+	return path.Append(message->GetString("name", "")) == B_OK ? path.Path() : "";
 }
 
 

@@ -6,6 +6,7 @@
 #include <string>
 #include <vector>
 
+#include <FilePanel.h>
 #include <Messenger.h>
 #include <Window.h>
 
@@ -65,10 +66,19 @@ private:
 	void _Save();
 	void _SaveAs(const std::string& path);
 	void _AskForPath();
+	void _PlaceChosen(const BMessage* message);
 	bool _MayReplaceFile();
 	void _AskAndClose();
 	void _CloseItems();
+	std::unique_ptr<BFilePanel> _MakePanel(file_panel_mode mode, uint32 what, const char* verb);
+	static std::string _ChosenPath(const BMessage* message);
 	void _Tell(const std::string& text);
+
+	void _AskForImport();
+	void _Import(const BMessage* message);
+	status_t _ImportFile(const entry_ref& ref);
+	void _AskForExport();
+	void _Export(const BMessage* message);
 
 	std::unique_ptr<ResourceDocument> fDocument;
 	BResEditor::BResourceAddonArgs fArgs;
@@ -79,6 +89,10 @@ private:
 	BMenuItem* fUndoItem; // child of the menu bar
 	BMenuItem* fRedoItem;
 	std::vector<OpenWindow> fItemWindows;
+	std::unique_ptr<BFilePanel> fSavePanel; // each NULL until it is needed
+	std::unique_ptr<BFilePanel> fImportPanel;
+	std::unique_ptr<BFilePanel> fExportPanel;
+	BResEditor::BResourceHandle fExported; // what the export panel was opened for
 	std::function<void()> fAfterApply; // what waits for the item windows' answers
 	size_t fAnswersMissing;
 	bool fClosing; // the item windows are closing, and this one with the last of them
