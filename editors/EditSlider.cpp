@@ -56,7 +56,7 @@ EditSlider::EditSlider() : EditorInterface("EditSlider", "Properties from BSlide
 
 	row.OffsetBy(0, kRowStep);
 	row.bottom = row.top + kGroupHeight;
-	const BarColorGroup group = AddBarColorGroup(this, row, kDefaultPressed);
+	const BarColorGroup group = AddBarColorGroup(this, row, BPoint(4, 12), kDefaultPressed);
 	barColorControl = group.control;
 	barColorSwatch = group.swatch;
 }

@@ -49,7 +49,7 @@ EditStatusBar::EditStatusBar() :
 	_AddNumberRow(row);
 
 	row.Set(area.left, area.top + kGroupTop, area.right, Bounds().bottom - area.left);
-	const BarColorGroup group = AddBarColorGroup(this, row, kDefaultPressed);
+	const BarColorGroup group = AddBarColorGroup(this, row, BPoint(12, 12), kDefaultPressed);
 	fColorControl = group.control;
 	fSwatch = group.swatch;
 }

@@ -200,23 +200,20 @@ SameRGB(rgb_color a, rgb_color b)
 
 
 BarColorGroup
-AddBarColorGroup(BView* panel, BRect frame, uint32 defaultCode)
+AddBarColorGroup(BView* panel, BRect frame, BPoint origin, uint32 defaultCode)
 {
 	BBox* group = new BBox(frame, NULL, B_FOLLOW_ALL_SIDES, kGroupFlags, B_PLAIN_BORDER);
 	group->SetFont(be_plain_font, B_FONT_ALL);
 	group->SetLabel("Bar Color");
 	panel->AddChild(group);
 
-	BRect area = group->Bounds();
-	area.top = 8;
-	area.InsetBy(4, 4);
-
 	BarColorGroup parts;
-	parts.control = new LiveColorControl(
-		area.LeftTop(), B_CELLS_32x8, 1, "", new BMessage(kLiveColorChanged), true);
+	parts.control =
+		new LiveColorControl(origin, B_CELLS_32x8, 1, "", new BMessage(kLiveColorChanged), true);
 	group->AddChild(parts.control);
 
-	BRect right(area.left + 280, area.top, area.right, area.top + 26);
+	const float width = group->Bounds().right - 4 - (origin.x + 280);
+	BRect right = FrameAt(origin.x + 280, origin.y, width, 26);
 	parts.swatch = AddSwatch(group, right);
 
 	right.top = right.bottom + 4;

@@ -69,6 +69,7 @@ struct BarColorGroup {
 	LiveColorControl* control;
 	BBox* swatch;
 };
-BarColorGroup AddBarColorGroup(BView* panel, BRect frame, uint32 defaultCode);
+// The origin is the colour control's, in the group.
+BarColorGroup AddBarColorGroup(BView* panel, BRect frame, BPoint origin, uint32 defaultCode);
 void ShowSwatch(BBox* swatch, rgb_color color);
 BBox* AddSwatch(BView* panel, BRect frame);
