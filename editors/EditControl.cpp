@@ -1,7 +1,6 @@
 #include "editors/EditControl.h"
 
 #include <cstdio>
-#include <cstdlib>
 
 #include <CheckBox.h>
 #include <Control.h>
@@ -52,9 +51,7 @@ EditControl::UseView(BView* view)
 
 	ShowMessageCode(fMessageControl, _Target()->Message());
 	fLabelControl->SetText(_Target()->Label());
-	char value[16];
-	snprintf(value, sizeof(value), "%ld", static_cast<long>(_Target()->Value()));
-	fValueControl->SetText(value);
+	_ShowValue();
 	fEnabledBox->SetValue(_Target()->IsEnabled() ? B_CONTROL_ON : B_CONTROL_OFF);
 	return true;
 }
@@ -71,7 +68,8 @@ EditControl::ApplyEdit(BMessage* message)
 			_Target()->SetEnabled(IsOn(fEnabledBox));
 			break;
 		case kValueChanged:
-			_Target()->SetValue(static_cast<int32>(strtol(fValueControl->Text(), nullptr, 10)));
+			_Target()->SetValue(NumberFromText(fValueControl->Text()));
+			_ShowValue();
 			break;
 		case kMessageChanged:
 			_ApplyMessageCode();
@@ -97,5 +95,14 @@ EditControl::_ApplyMessageCode()
 {
 	if (_Target()->Message() == NULL)
 		_Target()->SetMessage(new BMessage(kNewMessage));
-	_Target()->Message()->what = CodeFromText(fMessageControl->Text());
+	_Target()->Message()->what = TakeCode(fMessageControl);
+}
+
+
+void
+EditControl::_ShowValue()
+{
+	char value[16];
+	snprintf(value, sizeof(value), "%ld", static_cast<long>(_Target()->Value()));
+	fValueControl->SetText(value);
 }

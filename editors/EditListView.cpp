@@ -64,12 +64,10 @@ EditListView::ApplyEdit(BMessage* message)
 			target->Invalidate();
 			break;
 		case kSelectMessageChanged:
-			_Target()->SetSelectionMessage(
-				new BMessage(CodeFromText(selectMessageControl->Text())));
+			_Target()->SetSelectionMessage(new BMessage(TakeCode(selectMessageControl)));
 			break;
 		case kInvokeMessageChanged:
-			_Target()->SetInvocationMessage(
-				new BMessage(CodeFromText(invokeMessageControl->Text())));
+			_Target()->SetInvocationMessage(new BMessage(TakeCode(invokeMessageControl)));
 			break;
 		default:
 			return false;

@@ -293,7 +293,7 @@ EditMenuBar::_ApplyItemEdit(uint32 code)
 			item->SetEnabled(IsOn(enabledCheckBox));
 			break;
 		case kMessageChanged:
-			item->SetMessage(new BMessage(CodeFromText(messageControl->Text())));
+			item->SetMessage(new BMessage(TakeCode(messageControl)));
 			break;
 	}
 	return true;

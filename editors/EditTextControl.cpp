@@ -102,5 +102,5 @@ EditTextControl::_ApplyMessageCode()
 {
 	if (_Target()->ModificationMessage() == NULL)
 		_Target()->SetModificationMessage(new BMessage(kNewMessage));
-	_Target()->ModificationMessage()->what = CodeFromText(fMessageControl->Text());
+	_Target()->ModificationMessage()->what = TakeCode(fMessageControl);
 }

@@ -1,9 +1,8 @@
 #include "editors/IntControl.h"
 
-#include <algorithm>
-#include <climits>
 #include <cstdio>
-#include <cstdlib>
+
+#include "editors/PanelRows.h"
 
 
 IntControl::IntControl(BRect frame, const char* name, const char* label, BMessage* message,
@@ -32,9 +31,7 @@ IntControl::SetValue(int value)
 int
 IntControl::Value() const
 {
-	// A number beyond the type counts as the type's own limit.
-	const long value = strtol(Text(), nullptr, 10);
-	return static_cast<int>(std::clamp<long>(value, INT_MIN, INT_MAX));
+	return NumberFromText(Text());
 }
 
 

@@ -1,5 +1,9 @@
 #include "editors/PanelRows.h"
 
+#include <algorithm>
+#include <cstdint>
+#include <cstdlib>
+
 #include <Button.h>
 #include <CheckBox.h>
 #include <Font.h>
@@ -161,9 +165,17 @@ IsOn(const BCheckBox* box)
 }
 
 
-uint32
-CodeFromText(const char* text)
+int32
+NumberFromText(const char* text)
 {
+	return static_cast<int32>(std::clamp<long>(strtol(text, nullptr, 10), INT32_MIN, INT32_MAX));
+}
+
+
+uint32
+TakeCode(BTextControl* control)
+{
+	const char* text = control->Text();
 	// Characters count with their sign, so one of 0x80 or more sets all higher bits: that is wanted.
 	uint32 code = 0;
 	for (int i = 0; i < 4; i++) {
@@ -172,6 +184,7 @@ CodeFromText(const char* text)
 		if (*text != '\0')
 			text++;
 	}
+	ShowCode(control, code);
 	return code;
 }
 

@@ -53,11 +53,15 @@ int32 Choice(const BMenu* menu); // -1 when nothing is marked
 // A check box's value as a switch.
 bool IsOn(const BCheckBox* box);
 
+// What the text begins with; a number beyond the type counts as the type's own limit.
+int32 NumberFromText(const char* text);
+
 // The code of a message that is made because a code was typed: four question marks.
 constexpr uint32 kNewMessage = 0x3f3f3f3f;
 
-// Four-character codes as text, the most significant byte first.
-uint32 CodeFromText(const char* text);
+// Four-character codes as text, the most significant byte first. What is typed is shown as the code
+// that it was taken for.
+uint32 TakeCode(BTextControl* control);
 void ShowCode(BTextControl* control, uint32 code);
 void ShowMessageCode(BTextControl* control, const BMessage* message); // "----" for NULL
 

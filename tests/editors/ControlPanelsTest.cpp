@@ -18,6 +18,7 @@
 #include <Menu.h>
 #include <OutlineListView.h>
 #include <RadioButton.h>
+#include <Slider.h>
 #include <StringView.h>
 
 #include "PanelFixture.h"
@@ -86,6 +87,38 @@ TEST_F(EditControlTest, ChangesLabelValueAndState)
 }
 
 
+TEST_F(EditControlTest, ShowsWhatWasSetAndNotWhatWasTyped)
+{
+	BSlider* slider = Use(new BSlider(kFrame, "s", "Slide:", NULL, 0, 99));
+	TypeOver("Value: ", "12x");
+	EXPECT_EQ(12, slider->Value());
+	EXPECT_EQ("12", Shown("Value: "));
+	TypeOver("Value: ", "99999999999999999999");
+	EXPECT_EQ(99, slider->Value());
+	EXPECT_EQ("99", Shown("Value: "));
+	TypeOver("Message: ", "abcdef");
+	EXPECT_EQ("abcd", Shown("Message: "));
+}
+
+
+TEST_F(EditControlTest, ABytesSignSpillsIntoTheHigherOnes)
+{
+	BButton* button = Use(new BButton(kFrame, "b", "Label", NULL));
+	TypeOver("Message: ", "a\xc3\xa4z"); // a, c3, a4, z
+	ASSERT_NE(nullptr, button->Message());
+	EXPECT_EQ(0xffffa47au, button->Message()->what);
+}
+
+
+TEST_F(EditControlTest, AnEmptyCodeIsZero)
+{
+	BButton* button = Use(new BButton(kFrame, "b", "Label", new BMessage('abcd')));
+	TypeOver("Message: ", "");
+	EXPECT_EQ(0u, button->Message()->what);
+	EXPECT_EQ("", Shown("Message: "));
+}
+
+
 class EditButtonTest : public PanelFixture<EditButton> {};
 
 
@@ -151,6 +184,35 @@ TEST_F(EditBoxTest, ChangesLabelAndBorder)
 }
 
 
+TEST_F(EditBoxTest, WithoutABorderTheFrameIsGoneAtOnce)
+{
+	BBox* box = Use(new BBox(BRect(20, 20, 160, 90), "b"));
+	const rgb_color ground = window.driver.PixelAt(box, BPoint(70, 40));
+	auto hasFrame = [&] {
+		for (int x = 136; x <= 140; x++) {
+			if (window.driver.PixelAt(box, BPoint(x, 40)).red != ground.red)
+				return true;
+		}
+		return false;
+	};
+	EXPECT_TRUE(hasFrame());
+	Choose("", "B_NO_BORDER");
+	EXPECT_FALSE(hasFrame());
+	Choose("", "B_PLAIN_BORDER");
+	EXPECT_TRUE(hasFrame());
+}
+
+
+TEST_F(EditBoxTest, AnEmptyLabelIsPassedOn)
+{
+	BBox* box = new BBox(kFrame, "b");
+	box->SetLabel("Title");
+	Use(box);
+	TypeOver("Label: ", "");
+	EXPECT_TRUE(box->Label() == NULL || box->Label()[0] == '\0');
+}
+
+
 class EditStringViewTest : public PanelFixture<EditStringView> {};
 
 
@@ -193,6 +255,20 @@ TEST_F(EditTextControlTest, ChangesAlignmentsAndDivider)
 }
 
 
+TEST_F(EditTextControlTest, ShowsWhatTheControlHas)
+{
+	BTextControl* control = new BTextControl(kFrame, "t", "Label", "text", NULL);
+	control->SetAlignment(B_ALIGN_RIGHT, B_ALIGN_CENTER);
+	control->SetDivider(77);
+	control->SetModificationMessage(new BMessage('wxyz'));
+	Use(control);
+	EXPECT_EQ("B_ALIGN_RIGHT", Chosen("Label:"));
+	EXPECT_EQ("B_ALIGN_CENTER", Chosen("Text:"));
+	EXPECT_EQ("77", Shown("Divider:"));
+	EXPECT_EQ("wxyz", Shown("Invocation message:"));
+}
+
+
 TEST_F(EditTextControlTest, EditsTheModificationMessage)
 {
 	BTextControl* control =
@@ -226,7 +302,20 @@ TEST_F(EditInheritedTest, ChangesTheClassNameInTheArchive)
 
 	TypeOver("Class name: ", "");
 	EXPECT_STREQ("", view->ClassName());
+	BMessage unnamed;
+	view->Archive(&unnamed);
+	ASSERT_EQ(B_OK, unnamed.FindString("class", 1, &name));
+	EXPECT_STREQ("", name);
 	ExpectDeclined();
+}
+
+
+TEST_F(EditInheritedTest, TheDrawnNameWaitsForTheNextDrawing)
+{
+	auto view = Use(new Counting<LayoutInheritedView>(kFrame, "p", B_FOLLOW_NONE, B_WILL_DRAW));
+	const int draws = view->draws;
+	TypeOver("Class name: ", "Gadget");
+	EXPECT_EQ(draws, view->draws);
 }
 
 
@@ -248,6 +337,24 @@ TEST_F(EditColorControlTest, ShowsAndAppliesTheLayout)
 	Reload(control);
 	EXPECT_EQ("B_CELLS_4x64", Chosen("Cell layout:"));
 	ExpectDeclined();
+}
+
+
+TEST_F(EditColorControlTest, ShowsAndSetsEveryLayout)
+{
+	BColorControl* control = Use(new BColorControl(BPoint(5, 5), B_CELLS_32x8, 8, "c"));
+	EXPECT_EQ("B_CELLS_32x8", Chosen("Cell layout:"));
+	const struct {
+		const char* label;
+		color_control_layout layout;
+	} kLayouts[] = { { "B_CELLS_4x64", B_CELLS_4x64 }, { "B_CELLS_8x32", B_CELLS_8x32 },
+		{ "B_CELLS_16x16", B_CELLS_16x16 }, { "B_CELLS_32x8", B_CELLS_32x8 } };
+	for (const auto& each : kLayouts) {
+		Choose("Cell layout:", each.label);
+		EXPECT_EQ(each.layout, control->Layout());
+		Reload(control);
+		EXPECT_EQ(each.label, Chosen("Cell layout:"));
+	}
 }
 
 
@@ -283,6 +390,33 @@ TEST_F(EditListViewTest, ChangesTypeAndMessages)
 }
 
 
+TEST_F(EditListViewTest, ShowsWhatTheListHas)
+{
+	BListView* list = new BListView(kFrame, "l", B_SINGLE_SELECTION_LIST);
+	list->SetInvocationMessage(new BMessage('invk'));
+	Use(list);
+	EXPECT_FALSE(IsTicked("Multiple Selection"));
+	EXPECT_EQ("----", Shown("Select Message:"));
+	EXPECT_EQ("invk", Shown("Invoke Message:"));
+	Tick("Multiple Selection");
+	EXPECT_EQ(B_MULTIPLE_SELECTION_LIST, list->ListType());
+}
+
+
+TEST_F(EditListViewTest, ANewCodeDropsTheFieldsOfTheFormerMessage)
+{
+	BMessage* message = new BMessage('abcd');
+	message->AddInt32("dropped", 7);
+	BListView* list = new BListView(kFrame, "l");
+	list->SetSelectionMessage(message);
+	Use(list);
+	TypeOver("Select Message:", "efgh");
+	ASSERT_NE(nullptr, list->SelectionMessage());
+	EXPECT_EQ(uint32('efgh'), list->SelectionMessage()->what);
+	EXPECT_TRUE(list->SelectionMessage()->IsEmpty());
+}
+
+
 class EditMenuFieldTest : public PanelFixture<EditMenuField> {};
 
 
@@ -302,4 +436,44 @@ TEST_F(EditMenuFieldTest, ChangesEverything)
 	Tick("Enabled");
 	EXPECT_FALSE(field->IsEnabled());
 	ExpectDeclined();
+}
+
+
+TEST_F(EditMenuFieldTest, ShowsWhatTheFieldHas)
+{
+	BMenuField* field = new BMenuField(kFrame, "f", "Sounds:", new BMenu("menu"));
+	field->SetAlignment(B_ALIGN_CENTER);
+	field->SetDivider(33);
+	field->SetEnabled(false);
+	Use(field);
+	EXPECT_EQ("B_ALIGN_CENTER", Chosen(""));
+	EXPECT_EQ("33", Shown("Divider:"));
+	EXPECT_FALSE(IsTicked("Enabled"));
+}
+
+
+TEST_F(EditMenuFieldTest, AnEmptyLabelIsPassedOn)
+{
+	BMenuField* field = Use(new BMenuField(kFrame, "f", "Sounds:", new BMenu("menu")));
+	TypeOver("Label: ", "");
+	EXPECT_STREQ("", field->Label());
+}
+
+
+TEST_F(EditMenuFieldTest, EveryChangeDrawsTheFieldAnew)
+{
+	auto field = Use(new Counting<BMenuField>(kFrame, "f", "Sounds:", new BMenu("menu")));
+	int draws = field->draws;
+	auto expectDrawn = [&](const char* what) {
+		EXPECT_GT(field->draws, draws) << what;
+		draws = field->draws;
+	};
+	TypeOver("Label: ", "Colours:");
+	expectDrawn("label");
+	Choose("", "B_ALIGN_RIGHT");
+	expectDrawn("alignment");
+	TypeOver("Divider:", "60");
+	expectDrawn("divider");
+	Tick("Enabled");
+	expectDrawn("enabled");
 }

@@ -17,6 +17,21 @@
 #include "support/TestWindow.h"
 
 
+// A view that counts how often it is drawn.
+template<class Base> class Counting : public Base {
+public:
+	using Base::Base;
+
+	void Draw(BRect updateRect) override
+	{
+		draws++;
+		Base::Draw(updateRect);
+	}
+
+	int draws = 0;
+};
+
+
 template<class Panel> class PanelFixture : public testing::Test {
 protected:
 	PanelFixture() : window(BRect(20, 20, 819, 619))

@@ -6,9 +6,11 @@
 #include <View.h>
 #include <Window.h>
 
+#include "backend/headless/HeadlessBackend.h"
 #include "interface/private/WindowInternals.h"
 #include "kernel/private/Activity.h"
 #include "server/Desktop.h"
+#include "server/DesktopThread.h"
 #include "server/play/Picture.h"
 #include "server/play/ScriptedInput.h"
 
@@ -332,6 +334,19 @@ Driver::ActivateWindow(BWindow* window)
 	BackendEvent event;
 	event.type = BackendEvent::Type::WindowActivated;
 	_Window(window, event);
+}
+
+
+int32
+Driver::CountBeeps()
+{
+	WaitUntilIdle();
+	int32 count = 0;
+	Desktop* desktop = Desktop::Get();
+	desktop->RunOnDisplay([desktop, &count] {
+		count = dynamic_cast<HeadlessBackend&>(desktop->Thread().GetBackend()).CountBeeps();
+	});
+	return count;
 }
 
 

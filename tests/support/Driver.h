@@ -64,6 +64,9 @@ public:
 	// Aborts the test after a minute, as a hang.
 	static void WaitUntilIdle();
 
+	// What the user has heard so far.
+	static int32 CountBeeps();
+
 	rgb_color PixelAt(BPoint screen); // of what the screen shows; scale 1
 	rgb_color PixelAt(BView* view, BPoint where);
 	bool Screenshot(const char* path); // PNG

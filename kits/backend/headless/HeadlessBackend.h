@@ -38,7 +38,7 @@ public:
 	bool ActivatedByPress(const BackendWindow* window) const override { return false; }
 	void SetPointerGrab(BackendWindow* window) override {}
 	void SetCursorHidden(bool hidden) override {}
-	void Beep() override {}
+	void Beep() override { fBeeps++; }
 	void SetDragPicture(const ScreenPicture* picture, BPoint offset) override;
 	bool StartDesktopDrag(const DataOffer& offer, int32 session, uint32 buttons) override;
 
@@ -46,6 +46,8 @@ public:
 	DataOffer Clipboard() override { return fClipboard; }
 	bool OwnsClipboard() const override { return true; }
 	ScreenPicture Picture(BRect screen) override;
+
+	int32 CountBeeps() const { return fBeeps; }
 
 	// For windows.
 	void AddWindow(HeadlessWindow* window);
@@ -64,6 +66,7 @@ private:
 	BackendSink* fSink = nullptr; // borrowed
 	TaskQueue fTasks;
 	bool fStopped = false;
+	int32 fBeeps = 0;
 	int32 fWidth = 1600, fHeight = 1000; // logical
 	float fScale = 1;
 
