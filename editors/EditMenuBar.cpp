@@ -244,8 +244,10 @@ EditMenuBar::_EnableButtons(bool enabled)
 void
 EditMenuBar::_EntrySelected(const BMessage* message)
 {
-	int32 index = -1;
-	message->FindInt32("index", &index);
+	// There is no index when nothing is selected any more.
+	int32 index;
+	if (message->FindInt32("index", &index) != B_OK)
+		index = -1;
 	selectedEntry = dynamic_cast<ZetkaStringItem*>(itemList->ItemAt(index));
 	if (selectedEntry == nullptr)
 		return;

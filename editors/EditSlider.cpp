@@ -96,6 +96,7 @@ EditSlider::ApplyEdit(BMessage* message)
 	switch (message->what) {
 		case kSnoozeChanged:
 			_Target()->SetSnoozeAmount(snoozeControl->Value());
+			snoozeControl->SetValue(_Target()->SnoozeAmount()); // which has limits of its own
 			break;
 		case kKeyIncrementChanged:
 			_Target()->SetKeyIncrementValue(keyIncrementControl->Value());

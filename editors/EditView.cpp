@@ -279,10 +279,10 @@ EditView::LoadFrameValues()
 	TargetLock lock(target);
 
 	const BRect frame = target->ConvertToParent(target->Bounds());
-	fLeftControl->SetFloatValue(frame.left);
-	fTopControl->SetFloatValue(frame.top);
-	fRightControl->SetFloatValue(frame.right);
-	fBottomControl->SetFloatValue(frame.bottom);
+	fLeftControl->ShowFloatValue(frame.left);
+	fTopControl->ShowFloatValue(frame.top);
+	fRightControl->ShowFloatValue(frame.right);
+	fBottomControl->ShowFloatValue(frame.bottom);
 }
 
 
@@ -363,6 +363,7 @@ EditView::_ApplyFrame()
 	target->MoveBy(left - frame.left, top - frame.top);
 	target->ResizeBy(fRightControl->FloatValue() - left - frame.Width(),
 		fBottomControl->FloatValue() - top - frame.Height());
+	LoadFrameValues(); // views lie on whole pixels
 }
 
 

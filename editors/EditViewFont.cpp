@@ -71,15 +71,6 @@ FindLabel(BMenu* menu, const char* label)
 }
 
 
-// A control that shows the value already is left alone, with what is being typed in it.
-void
-Update(FloatControl* control, float value)
-{
-	if (control->FloatValue() != value)
-		control->SetFloatValue(value);
-}
-
-
 } // namespace
 
 
@@ -141,9 +132,9 @@ EditView::FontChanged()
 
 	familyItem->SetMarked(true);
 	_LoadStyles(family, style);
-	Update(fSizeControl, font.Size());
-	Update(fShearControl, font.Shear());
-	Update(fRotationControl, font.Rotation());
+	fSizeControl->ShowFloatValue(font.Size());
+	fShearControl->ShowFloatValue(font.Shear());
+	fRotationControl->ShowFloatValue(font.Rotation());
 }
 
 

@@ -28,6 +28,14 @@ FloatControl::SetFloatValue(float value)
 }
 
 
+void
+FloatControl::ShowFloatValue(float value)
+{
+	if (FloatValue() != value)
+		SetFloatValue(value);
+}
+
+
 float
 FloatControl::FloatValue() const
 {

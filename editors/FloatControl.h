@@ -14,6 +14,9 @@ public:
 	// Clamps and shows; what is not a number counts as the minimum.
 	void SetFloatValue(float value);
 
+	// The same, but a text that says so already is left alone, with what is selected in it.
+	void ShowFloatValue(float value);
+
 	// What the text says; not clamped, 0 for a text without a number at its start.
 	float FloatValue() const;
 

@@ -8,6 +8,8 @@
 #include <MenuField.h>
 #include <MenuItem.h>
 #include <Message.h>
+#include <ScrollBar.h>
+#include <ScrollView.h>
 #include <TextControl.h>
 #include <TextView.h>
 
@@ -197,4 +199,57 @@ TEST_F(EditViewTest, ADeletedTargetIsNotTouched)
 		panel->FrameChanged();
 	});
 	TypeOver("Name: ", "nobody");
+}
+
+
+TEST_F(EditViewTest, ANewTopOrBottomEdgeKeepsTheOtherOne)
+{
+	BView* view = UsePlain();
+	TypeOver("T:", "30");
+	EXPECT_EQ(BRect(10, 30, 109, 79), view->Frame());
+	TypeOver("B:", "99.6");
+	EXPECT_EQ(BRect(10, 30, 109, 100), view->Frame());
+	EXPECT_EQ("100", Shown("B:"));
+}
+
+
+TEST_F(EditViewTest, PreferredKeepsTheCentre)
+{
+	BView* view = Use(new BButton(
+		BRect(100, 150, 250, 190), "b", "x", NULL, B_FOLLOW_H_CENTER | B_FOLLOW_V_CENTER));
+	window.driver.Click(Find<BButton>("preferred"));
+	EXPECT_NE(150, view->Bounds().Width());
+	EXPECT_NEAR(175, (view->Frame().left + view->Frame().right) / 2, 1);
+	EXPECT_NEAR(170, (view->Frame().top + view->Frame().bottom) / 2, 1);
+}
+
+
+TEST_F(EditViewTest, ZoomFillsWhatTheParentCanScrollTo)
+{
+	BView* target = new BView(BRect(0, 0, 99, 99), "target", B_FOLLOW_ALL_SIDES, B_WILL_DRAW);
+	BScrollView* scroll = new BScrollView("scroll", target, B_FOLLOW_NONE, 0, true, true);
+	BView* inner = new BView(BRect(5, 5, 9, 9), "inner", B_FOLLOW_NONE, B_WILL_DRAW);
+	target->AddChild(inner);
+	window.Locked([&] {
+		ground->AddChild(scroll);
+		scroll->ScrollBar(B_HORIZONTAL)->SetRange(0, 70);
+		scroll->ScrollBar(B_VERTICAL)->SetRange(0, 50);
+		EXPECT_TRUE(panel->UseView(inner));
+	});
+	window.driver.Click(Find<BButton>("zoom"));
+	EXPECT_EQ(BRect(0, 0, 169, 149), inner->Frame());
+	window.Locked([&] { target->ScrollTo(BPoint(30, 20)); });
+	window.driver.Click(Find<BButton>("zoom"));
+	EXPECT_EQ(BPoint(-30, -20), inner->Frame().LeftTop());
+}
+
+
+TEST_F(EditViewTest, TheFirstRowsDoNotDrawTheView)
+{
+	auto view = Use(new Counting<BView>(
+		BRect(10, 20, 109, 79), "plain", uint32(B_FOLLOW_NONE), uint32(B_WILL_DRAW)));
+	const int draws = view->draws;
+	TypeOver("Name: ", "other");
+	Choose("Resizing:", "Right");
+	EXPECT_EQ(draws, view->draws);
 }

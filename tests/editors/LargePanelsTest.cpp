@@ -1,14 +1,11 @@
-// The panels of sliders, status bars, scroll views, tab views, text views and menu bars.
+// The panels of sliders, status bars, scroll views, tab views and text views.
 
-#include "editors/EditMenuBar.h"
 #include "editors/EditScrollView.h"
 #include "editors/EditSlider.h"
 #include "editors/EditStatusBar.h"
 #include "editors/EditTabView.h"
 #include "editors/EditTextView.h"
 
-#include <MenuBar.h>
-#include <OutlineListView.h>
 #include <ScrollBar.h>
 #include <ScrollView.h>
 #include <Slider.h>
@@ -33,7 +30,15 @@ IsColor(rgb_color color, uint8 red, uint8 green, uint8 blue)
 } // namespace
 
 
-class EditSliderTest : public PanelFixture<EditSlider> {};
+class EditSliderTest : public PanelFixture<EditSlider> {
+protected:
+	// The box beside the colour control.
+	rgb_color Swatch()
+	{
+		BView* group = Find<BTextControl>("Red:")->Parent()->Parent();
+		return ControlUser::Find<BBox>(group, "")->ViewColor();
+	}
+};
 
 
 TEST_F(EditSliderTest, ShowsAndChangesWhatASliderCanChange)
@@ -99,7 +104,84 @@ TEST_F(EditSliderTest, LoadingDoesNotTouchTheColor)
 }
 
 
-class EditStatusBarTest : public PanelFixture<EditStatusBar> {};
+TEST_F(EditSliderTest, ShowsWhatTheSliderHas)
+{
+	BSlider* slider = new BSlider(kFrame, "s", "Toast:", NULL, 3, 70, B_TRIANGLE_THUMB);
+	slider->SetSnoozeAmount(15000);
+	slider->SetKeyIncrementValue(6);
+	slider->SetHashMarkCount(11);
+	slider->SetHashMarks(B_HASH_MARKS_TOP);
+	slider->SetLimitLabels("light", "dark");
+	slider->SetBarColor(rgb_color { 11, 22, 33, 255 });
+	Use(slider);
+	EXPECT_EQ("15000", Shown("Snooze:"));
+	TypeOver("Snooze:", "5");
+	EXPECT_EQ(std::to_string(slider->SnoozeAmount()), Shown("Snooze:"));
+	EXPECT_EQ("light", Shown("Min Label:"));
+	EXPECT_EQ("dark", Shown("Max Label:"));
+	EXPECT_EQ("3", Shown("Min Value:"));
+	EXPECT_EQ("70", Shown("Max Value:"));
+	EXPECT_EQ("6", Shown("Key Increment:"));
+	EXPECT_EQ("11", Shown("Num Hash Marks:"));
+	EXPECT_EQ("top", Chosen("Hash marks:"));
+	EXPECT_EQ("triangle", Chosen("Thumb:"));
+	EXPECT_EQ("11", Shown("Red:"));
+	EXPECT_EQ("33", Shown("Blue:"));
+	EXPECT_TRUE(IsColor(Swatch(), 11, 22, 33));
+}
+
+
+TEST_F(EditSliderTest, SetsBothLimitLabels)
+{
+	BSlider* slider = Use(new BSlider(kFrame, "s", "Toast:", NULL, 0, 99));
+	TypeOver("Max Label:", "dark");
+	EXPECT_STREQ("", slider->MinLimitLabel());
+	EXPECT_STREQ("dark", slider->MaxLimitLabel());
+	TypeOver("Min Label:", "light");
+	EXPECT_STREQ("light", slider->MinLimitLabel());
+	EXPECT_STREQ("dark", slider->MaxLimitLabel());
+}
+
+
+TEST_F(EditSliderTest, AColorIsTypedOrDragged)
+{
+	BSlider* slider = Use(new BSlider(kFrame, "s", "Toast:", NULL, 0, 99));
+	TypeOver("Red:", "200");
+	EXPECT_EQ(200, slider->BarColor().red);
+	EXPECT_EQ(200, Swatch().red);
+	BView* colors = Find<BTextControl>("Red:")->Parent();
+	window.driver.MoveTo(colors, BPoint(30, 20));
+	window.driver.Press();
+	const rgb_color first = slider->BarColor();
+	window.driver.MoveTo(colors, BPoint(120, 20));
+	const rgb_color second = slider->BarColor();
+	window.driver.Release();
+	EXPECT_FALSE(IsColor(second, first.red, first.green, first.blue));
+	EXPECT_TRUE(IsColor(Swatch(), second.red, second.green, second.blue));
+}
+
+
+TEST_F(EditSliderTest, SnoozeAndKeyIncrementDoNotDrawTheSlider)
+{
+	auto slider = Use(new Counting<BSlider>(kFrame, "s", "Toast:", nullptr, 0, 99));
+	const int draws = slider->draws;
+	TypeOver("Snooze:", "30000");
+	TypeOver("Key Increment:", "4");
+	EXPECT_EQ(30000, slider->SnoozeAmount());
+	EXPECT_EQ(draws, slider->draws);
+	TypeOver("Num Hash Marks:", "7");
+	EXPECT_GT(slider->draws, draws);
+}
+
+
+class EditStatusBarTest : public PanelFixture<EditStatusBar> {
+protected:
+	rgb_color Swatch()
+	{
+		BView* group = Find<BTextControl>("Red:")->Parent()->Parent();
+		return ControlUser::Find<BBox>(group, "")->ViewColor();
+	}
+};
 
 
 TEST_F(EditStatusBarTest, OneTextKeepsTheOthersAndTheValue)
@@ -141,6 +223,65 @@ TEST_F(EditStatusBarTest, ChangesHeightAndColor)
 	EXPECT_EQ(20, bar->BarHeight());
 	Press("Use Default");
 	EXPECT_TRUE(IsColor(bar->BarColor(), 50, 150, 255));
+}
+
+
+TEST_F(EditStatusBarTest, ShowsWhatTheBarHas)
+{
+	BStatusBar* bar = new BStatusBar(kFrame, "s", "Copying:", "left");
+	bar->SetMaxValue(250);
+	bar->SetBarHeight(17);
+	bar->SetBarColor(rgb_color { 11, 22, 33, 255 });
+	Use(bar);
+	window.Locked([&] { bar->Update(120, "file", "12"); });
+	Reload(bar);
+	EXPECT_EQ("Copying:", Shown("Label:"));
+	EXPECT_EQ("left", Shown("Trailing label:"));
+	EXPECT_EQ("file", Shown("Text:"));
+	EXPECT_EQ("12", Shown("Trailing text: "));
+	EXPECT_EQ("120", Shown("Value:"));
+	EXPECT_EQ("250", Shown("Max:"));
+	EXPECT_EQ("17", Shown("Bar height:"));
+	EXPECT_EQ("22", Shown("Green:"));
+	EXPECT_TRUE(IsColor(Swatch(), 11, 22, 33));
+}
+
+
+TEST_F(EditStatusBarTest, SetsEachText)
+{
+	BStatusBar* bar = Use(new BStatusBar(kFrame, "s"));
+	TypeOver("Label:", "Copying:");
+	EXPECT_STREQ("Copying:", bar->Label());
+	TypeOver("Text:", "file");
+	EXPECT_STREQ("file", bar->Text());
+	TypeOver("Trailing text: ", "12");
+	EXPECT_STREQ("12", bar->TrailingText());
+	EXPECT_STREQ("Copying:", bar->Label());
+}
+
+
+TEST_F(EditStatusBarTest, ATextKeepsTheMaximum)
+{
+	BStatusBar* bar = new BStatusBar(kFrame, "s");
+	bar->SetMaxValue(250);
+	Use(bar);
+	TypeOver("Value:", "180");
+	TypeOver("Label:", "Copying:");
+	EXPECT_EQ(250, bar->MaxValue());
+	EXPECT_EQ(180, bar->CurrentValue());
+}
+
+
+TEST_F(EditStatusBarTest, AColorIsTypedOrDragged)
+{
+	BStatusBar* bar = Use(new BStatusBar(kFrame, "s"));
+	TypeOver("Green:", "7");
+	EXPECT_EQ(7, bar->BarColor().green);
+	EXPECT_EQ(7, Swatch().green);
+	BView* colors = Find<BTextControl>("Red:")->Parent();
+	window.driver.Click(colors, BPoint(60, 4));
+	EXPECT_EQ(bar->BarColor().red, bar->BarColor().green);
+	EXPECT_EQ(bar->BarColor().red, Swatch().red);
 }
 
 
@@ -221,6 +362,103 @@ TEST_F(EditScrollViewTest, TogglingABarKeepsTheOther)
 	rebuilt = dynamic_cast<BScrollView*>(ground->ChildAt(0));
 	ASSERT_NE(nullptr, rebuilt);
 	EXPECT_NE(nullptr, rebuilt->ScrollBar(B_VERTICAL));
+}
+
+
+TEST_F(EditScrollViewTest, ShowsTotalsAndSteps)
+{
+	BScrollView* scroll = MakeScrollView(true, true);
+	scroll->ScrollBar(B_HORIZONTAL)->SetRange(0, 170);
+	scroll->ScrollBar(B_HORIZONTAL)->SetSteps(3, 30);
+	scroll->ScrollBar(B_VERTICAL)->SetRange(0, 55);
+	scroll->ScrollBar(B_VERTICAL)->SetSteps(4, 40);
+	scroll->SetBorder(B_NO_BORDER);
+	Use(scroll);
+	EXPECT_EQ("B_NO_BORDER", Chosen("Border style:"));
+	EXPECT_TRUE(IsTicked("Horizontal"));
+	EXPECT_TRUE(IsTicked("Vertical"));
+	EXPECT_EQ(target->Bounds().Width() + 170, std::stof(Shown("Total width:")));
+	EXPECT_EQ(target->Bounds().Height() + 55, std::stof(Shown("Total height:")));
+	EXPECT_EQ("3", Shown("Small step:", 0));
+	EXPECT_EQ("30", Shown("Big step:", 0));
+	EXPECT_EQ("4", Shown("Small step:", 1));
+	EXPECT_EQ("40", Shown("Big step:", 1));
+}
+
+
+TEST_F(EditScrollViewTest, SetsEachStepAndTheTotalHeight)
+{
+	BScrollView* scroll = Use(MakeScrollView(true, true));
+	TypeOver("Small step:", "5", 0);
+	TypeOver("Big step:", "50", 0);
+	TypeOver("Small step:", "6", 1);
+	TypeOver("Big step:", "60", 1);
+	float small, big;
+	scroll->ScrollBar(B_HORIZONTAL)->GetSteps(&small, &big);
+	EXPECT_EQ(5, small);
+	EXPECT_EQ(50, big);
+	scroll->ScrollBar(B_VERTICAL)->GetSteps(&small, &big);
+	EXPECT_EQ(6, small);
+	EXPECT_EQ(60, big);
+	TypeOver("Total height:", "480");
+	float minimum, maximum;
+	scroll->ScrollBar(B_VERTICAL)->GetRange(&minimum, &maximum);
+	EXPECT_EQ(480 - target->Bounds().Height(), maximum);
+	EXPECT_FLOAT_EQ(target->Bounds().Height() / 480, scroll->ScrollBar(B_VERTICAL)->Proportion());
+}
+
+
+TEST_F(EditScrollViewTest, TotalsFollowTheFrame)
+{
+	BScrollView* scroll = Use(MakeScrollView(true, true));
+	window.Locked([&] {
+		scroll->ResizeBy(40, 30);
+		panel->FrameChanged();
+	});
+	float minimum, maximum;
+	scroll->ScrollBar(B_HORIZONTAL)->GetRange(&minimum, &maximum);
+	EXPECT_EQ(target->Bounds().Width() + maximum, std::stof(Shown("Total width:")));
+}
+
+
+TEST_F(EditScrollViewTest, TogglingKeepsTheValueAndTheLook)
+{
+	BScrollView* scroll = MakeScrollView(true, true);
+	scroll->SetHighColor(1, 2, 3);
+	scroll->SetDrawingMode(B_OP_OVER);
+	Use(scroll);
+	window.Locked([&] {
+		scroll->ScrollBar(B_HORIZONTAL)->SetRange(0, 70);
+		scroll->ScrollBar(B_HORIZONTAL)->SetValue(0);
+		scroll->ScrollBar(B_VERTICAL)->SetRange(0, 90);
+		scroll->ScrollBar(B_VERTICAL)->SetValue(45);
+	});
+	const int32 beeps = Driver::CountBeeps();
+	Tick("Horizontal");
+	EXPECT_EQ(beeps + 1, Driver::CountBeeps());
+	BScrollView* rebuilt = dynamic_cast<BScrollView*>(ground->ChildAt(0));
+	ASSERT_NE(nullptr, rebuilt);
+	EXPECT_EQ(nullptr, rebuilt->ScrollBar(B_HORIZONTAL));
+	EXPECT_EQ(45, rebuilt->ScrollBar(B_VERTICAL)->Value());
+	EXPECT_STREQ("scroll", rebuilt->Name());
+	EXPECT_EQ(B_FANCY_BORDER, rebuilt->Border());
+	EXPECT_TRUE(IsColor(rebuilt->HighColor(), 1, 2, 3));
+	EXPECT_EQ(B_OP_OVER, rebuilt->DrawingMode());
+	// The event mask is what the rebuilt view follows by.
+	EXPECT_EQ(0u, rebuilt->ResizingMode());
+}
+
+
+TEST_F(EditScrollViewTest, AToggleThatCannotBeDoneBeepsAndChangesNothing)
+{
+	BScrollView* scroll = new BScrollView(
+		"scroll", NULL, B_FOLLOW_LEFT | B_FOLLOW_TOP, 0, true, true, B_FANCY_BORDER);
+	Use(scroll);
+	const int32 beeps = Driver::CountBeeps();
+	Tick("Vertical");
+	EXPECT_EQ(beeps + 1, Driver::CountBeeps());
+	EXPECT_EQ(scroll, ground->ChildAt(0));
+	EXPECT_NE(nullptr, scroll->ScrollBar(B_VERTICAL));
 }
 
 
@@ -316,6 +554,52 @@ TEST_F(EditTabViewTest, ChangesHeightAndWidth)
 }
 
 
+TEST_F(EditTabViewTest, ShowsHeightAndWidth)
+{
+	BTabView* tabs = MakeTabs({ "A" });
+	window.Locked([&] {
+		tabs->SetTabHeight(27);
+		tabs->SetTabWidth(B_WIDTH_FROM_WIDEST);
+	});
+	Reload(tabs);
+	EXPECT_EQ("27", Shown("Tab height:"));
+	EXPECT_EQ("B_WIDTH_FROM_WIDEST", Chosen("Tab widgh:"));
+}
+
+
+TEST_F(EditTabViewTest, AnInsertedTabFillsTheTabView)
+{
+	BTabView* tabs = Use(new BTabView(BRect(0, 0, 200, 100), "tabs"));
+	TypeOver("Tab height:", "20");
+	Press("insert");
+	ASSERT_EQ(1, tabs->CountTabs());
+	EXPECT_EQ(BRect(3, 2, 196, 75), tabs->ViewForTab(0)->Frame());
+	EXPECT_EQ(216, tabs->ViewForTab(0)->ViewColor().red);
+	EXPECT_STREQ("Tab", tabs->TabAt(0)->Label());
+}
+
+
+TEST_F(EditTabViewTest, WithoutTabsTheButtonsDoNothing)
+{
+	BTabView* tabs = MakeTabs({});
+	for (const char* label : { "forward", "backward", "delete" })
+		Press(label);
+	EXPECT_EQ(0, tabs->CountTabs());
+}
+
+
+TEST_F(EditTabViewTest, MovedTabsKeepTheirContents)
+{
+	BTabView* tabs = MakeTabs({ "A", "B", "C" });
+	BView* second = tabs->ViewForTab(1);
+	Select(tabs, 2);
+	Press("forward");
+	EXPECT_EQ("ACB", Order(tabs));
+	EXPECT_EQ(second, tabs->ViewForTab(2));
+	EXPECT_EQ(3, tabs->ContainerView()->CountChildren() + 2); // the selected tab's view is shown
+}
+
+
 class EditTextViewTest : public PanelFixture<EditTextView> {
 protected:
 	BTextView* UseText()
@@ -386,172 +670,50 @@ TEST_F(EditTextViewTest, TheTextRectangleFollowsTheFrame)
 }
 
 
-class EditMenuBarTest : public PanelFixture<EditMenuBar> {
-protected:
-	BMenuBar* UseBar()
-	{
-		bar = new BMenuBar(BRect(0, 0, 300, 18), "bar");
-		file = new BMenu("File");
-		file->AddItem(new BMenuItem("New", new BMessage('newf')));
-		BMenu* recent = new BMenu("Recent");
-		recent->AddItem(new BMenuItem("One", NULL));
-		file->AddItem(recent);
-		file->AddItem(new BMenuItem("Quit", NULL));
-		bar->AddItem(file);
-		BMenu* edit = new BMenu("Edit");
-		edit->AddItem(new BMenuItem("Undo", NULL));
-		bar->AddItem(edit);
-		Use(bar);
-		list = dynamic_cast<BOutlineListView*>(FindList(panel));
-		return bar;
-	}
-
-	static BView* FindList(BView* view)
-	{
-		for (BView* child = view->ChildAt(0); child != nullptr; child = child->NextSibling()) {
-			if (dynamic_cast<BOutlineListView*>(child) != nullptr)
-				return child;
-			if (BView* found = FindList(child))
-				return found;
-		}
-		return nullptr;
-	}
-
-	std::string Mirror()
-	{
-		std::string text;
-		for (int32 i = 0; i < list->FullListCountItems(); i++) {
-			const BStringItem* item = static_cast<BStringItem*>(list->FullListItemAt(i));
-			text += std::to_string(item->OutlineLevel()) + item->Text() + " ";
-		}
-		return text;
-	}
-
-	void Select(const char* text) { user.ClickEntry(list, text); }
-
-	std::string Selected()
-	{
-		const BStringItem* item = static_cast<BStringItem*>(list->ItemAt(list->CurrentSelection()));
-		return item != nullptr ? item->Text() : "";
-	}
-
-	BMenuBar* bar;
-	BMenu* file;
-	BOutlineListView* list;
-};
-
-
-TEST_F(EditMenuBarTest, MirrorsTheItems)
+TEST_F(EditTextViewTest, ShowsWhatTheTextViewHas)
 {
-	UseBar();
-	EXPECT_EQ("0File 1New 1Recent 2One 1Quit 0Edit 1Undo ", Mirror());
-	EXPECT_TRUE(list->FullListItemAt(0)->IsExpanded());
-	EXPECT_FALSE(list->FullListItemAt(2)->IsExpanded());
-	EXPECT_FALSE(Find<BButton>("Delete")->IsEnabled());
-	ExpectDeclined();
+	BTextView* text = UseText();
+	window.Locked([&] {
+		text->MakeEditable(false);
+		text->MakeSelectable(false);
+		text->SetAutoindent(true);
+		text->SetStylable(true);
+		text->SetWordWrap(false);
+		text->SetMaxBytes(77);
+		text->SetTabWidth(13);
+		text->SetAlignment(B_ALIGN_RIGHT);
+		text->SetColorSpace(static_cast<color_space>(6));
+	});
+	Reload(text);
+	EXPECT_FALSE(IsTicked("Editable"));
+	EXPECT_FALSE(IsTicked("Selectable"));
+	EXPECT_TRUE(IsTicked("Auto Indent"));
+	EXPECT_TRUE(IsTicked("Stylable"));
+	EXPECT_FALSE(IsTicked("Word Wrap"));
+	EXPECT_FALSE(IsTicked("Resizable"));
+	EXPECT_EQ("77", Shown("Max bytes:"));
+	EXPECT_EQ("13", Shown("Tab width:"));
+	EXPECT_EQ("B_ALIGN_RIGHT", Chosen("Text:"));
+	EXPECT_EQ("B_CMAP8", Chosen("Offscreen:"));
+	window.Locked([&] { text->MakeResizable(true, NULL); });
+	Reload(text);
+	EXPECT_TRUE(IsTicked("Resizable"));
 }
 
 
-TEST_F(EditMenuBarTest, LoadsAndEditsTheSelectedItem)
+TEST_F(EditTextViewTest, OnlyTheLooksDrawTheText)
 {
-	UseBar();
-	Select("New");
-	EXPECT_EQ("New", Shown("Label: "));
-	EXPECT_EQ("newf", Shown("Message: "));
-	EXPECT_TRUE(Find<BButton>("Delete")->IsEnabled());
-	TypeOver("Label: ", "Create");
-	EXPECT_STREQ("Create", file->ItemAt(0)->Label());
-	EXPECT_EQ("0File 1Create 1Recent 2One 1Quit 0Edit 1Undo ", Mirror());
-	TypeOver("Message: ", "abcd");
-	EXPECT_EQ(0x61626364u, file->ItemAt(0)->Command());
-	Tick("Enabled");
-	EXPECT_FALSE(file->ItemAt(0)->IsEnabled());
-
-	Select("Quit");
-	EXPECT_EQ("????", Shown("Message: "));
-}
-
-
-TEST_F(EditMenuBarTest, InsertsSiblings)
-{
-	UseBar();
-	Select("Recent");
-	Press("Add After");
-	EXPECT_EQ("0File 1New 1Recent 2One 1new item 1Quit 0Edit 1Undo ", Mirror());
-	EXPECT_EQ("new item", Selected());
-	EXPECT_STREQ("new item", file->ItemAt(2)->Label());
-
-	Select("New");
-	Press("Add Before");
-	EXPECT_EQ("0File 1new item 1New 1Recent 2One 1new item 1Quit 0Edit 1Undo ", Mirror());
-	EXPECT_STREQ("new item", file->ItemAt(0)->Label());
-}
-
-
-TEST_F(EditMenuBarTest, DeletesItems)
-{
-	UseBar();
-	Select("Recent");
-	Press("Delete");
-	EXPECT_EQ("0File 1New 1Quit 0Edit 1Undo ", Mirror());
-	EXPECT_EQ(2, file->CountItems());
-	EXPECT_EQ("Quit", Selected());
-
-	// A menu is never emptied.
-	Select("Undo");
-	Press("Delete");
-	EXPECT_EQ("0File 1New 1Quit 0Edit 1Undo ", Mirror());
-
-	// The last entry gives the selection to the one before.
-	Select("Edit");
-	Press("Delete");
-	EXPECT_EQ("0File 1New 1Quit ", Mirror());
-	EXPECT_EQ(1, bar->CountItems());
-}
-
-
-TEST_F(EditMenuBarTest, TurnsAnItemIntoASubmenu)
-{
-	UseBar();
-	Select("Quit");
-	Press("Add Submenu");
-	EXPECT_EQ("0File 1New 1Recent 2One 1Quit 2sub item 0Edit 1Undo ", Mirror());
-	EXPECT_EQ("sub item", Selected());
-	BMenu* submenu = file->ItemAt(2)->Submenu();
-	ASSERT_NE(nullptr, submenu);
-	EXPECT_STREQ("sub item", submenu->ItemAt(0)->Label());
-
-	// The entry still stands for the item that was taken out.
-	Select("Quit");
-	TypeOver("Label: ", "Leave");
-	EXPECT_STREQ("Quit", file->ItemAt(2)->Label());
-
-	// One that has a submenu gets no second one.
-	Select("Recent");
-	const std::string before = Mirror();
-	Press("Add Submenu");
-	EXPECT_EQ(before, Mirror());
-}
-
-
-TEST_F(EditMenuBarTest, ChangesTheKindOfSelection)
-{
-	UseBar();
-	Select("File");
-	EXPECT_EQ("Normal Selection", Chosen("", 1));
-	Choose("", "Radio & Set Label", 1);
-	EXPECT_TRUE(file->IsLabelFromMarked());
-	Choose("", "Radio Selection", 1);
-	EXPECT_TRUE(file->IsRadioMode());
-	EXPECT_FALSE(file->IsLabelFromMarked());
-	Choose("", "Normal Selection", 1);
-	EXPECT_FALSE(file->IsRadioMode());
-}
-
-
-TEST_F(EditMenuBarTest, ChangesTheBorder)
-{
-	UseBar();
-	Choose("", "B_BORDER_EACH_ITEM");
-	EXPECT_EQ(B_BORDER_EACH_ITEM, bar->Border());
+	auto text = Use(new Counting<BTextView>(
+		kFrame, "t", BRect(2, 2, 198, 98), uint32(B_FOLLOW_NONE), uint32(B_WILL_DRAW)));
+	int draws = text->draws;
+	TypeOver("Max bytes:", "50");
+	EXPECT_EQ(draws, text->draws);
+	Choose("Text:", "B_ALIGN_CENTER");
+	EXPECT_GT(text->draws, draws);
+	draws = text->draws;
+	Tick("Auto Indent");
+	EXPECT_GT(text->draws, draws);
+	draws = text->draws;
+	TypeOver("Tab width:", "60");
+	EXPECT_GT(text->draws, draws);
 }
