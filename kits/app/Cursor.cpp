@@ -2,15 +2,18 @@
 
 #include <string.h>
 
+#include <Bitmap.h>
 #include <Message.h>
 #include <Point.h>
 
 #include "app/private/CursorPrivate.h"
+#include "interface/private/BitmapAccess.h"
 
 namespace {
 
 constexpr uint8 kSide = 16;
 constexpr int32 kDataSize = 68;
+constexpr int32 kLargestSide = 256;
 
 BCursor sSystemDefault(B_CURSOR_ID_SYSTEM_DEFAULT);
 BCursor sIBeam(B_CURSOR_ID_I_BEAM);
@@ -67,6 +70,32 @@ BCursor::BCursor(BMessage* data) : fID(B_CURSOR_ID_SYSTEM_DEFAULT), fStatus(B_BA
 }
 
 
+BCursor::BCursor(const BBitmap* bitmap, const BPoint& hotspot)
+{
+	fStatus = B_BAD_VALUE;
+	const auto pixels = bitmap != nullptr ? BPrivate::BitmapAccess::Pixels(*bitmap) : nullptr;
+	if (pixels == nullptr || pixels->Width() > kLargestSide || pixels->Height() > kLargestSide
+		|| !bitmap->Bounds().Contains(hotspot))
+		return;
+
+	auto picture = std::make_shared<BPrivate::CursorPicture>();
+	picture->width = pixels->Width();
+	picture->height = pixels->Height();
+	picture->hotX = static_cast<int32>(hotspot.x - bitmap->Bounds().left);
+	picture->hotY = static_cast<int32>(hotspot.y - bitmap->Bounds().top);
+	const bool opaque = pixels->Format() == BPrivate::SurfaceFormat::kOpaque;
+	for (int32 y = 0; y < picture->height; y++) {
+		for (int32 x = 0; x < picture->width; x++) {
+			const uint32 pixel = pixels->Row(y)[x];
+			const bool clear = opaque && (pixel & 0xffffff) == 0x777477;
+			picture->pixels.push_back(opaque && !clear ? pixel | 0xff000000 : clear ? 0 : pixel);
+		}
+	}
+	fPicture = std::move(picture);
+	fStatus = B_OK;
+}
+
+
 BCursor::~BCursor() = default;
 
 
@@ -96,6 +125,7 @@ BCursor::operator=(const BCursor& other)
 {
 	memcpy(fData, other.fData, sizeof(fData));
 	fID = other.fID;
+	fPicture = other.fPicture;
 	fStatus = other.fStatus;
 	return *this;
 }
@@ -104,7 +134,7 @@ BCursor::operator=(const BCursor& other)
 bool
 BCursor::operator==(const BCursor& other) const
 {
-	return fID == other.fID && fStatus == other.fStatus
+	return fID == other.fID && fStatus == other.fStatus && fPicture == other.fPicture
 		&& memcmp(fData, other.fData, sizeof(fData)) == 0;
 }
 
@@ -121,6 +151,11 @@ CursorPrivate::Shape(const BCursor& cursor)
 	CursorShape shape;
 	if (cursor.fStatus != B_OK)
 		return shape;
+	if (cursor.fPicture != nullptr) {
+		shape.id = CursorShape::kFromPicture;
+		shape.picture = cursor.fPicture;
+		return shape;
+	}
 	shape.id = cursor.fID != 0 ? cursor.fID : CursorShape::kFromBits;
 	memcpy(shape.bits.data(), cursor.fData, shape.bits.size());
 	return shape;

@@ -1,12 +1,15 @@
 // BCursor: the picture of the pointer.
 #pragma once
 
+#include <memory>
+
 #include <Archivable.h>
 #include <InterfaceDefs.h>
 
 namespace BPrivate {
 class CursorPrivate;
-}
+struct CursorPicture;
+} // namespace BPrivate
 
 class BBitmap;
 class BPoint;
@@ -52,6 +55,7 @@ public:
 	BCursor(const BCursor& other);
 	BCursor(BCursorID id);
 	BCursor(BMessage* data);
+	// Copies the picture, which is 256 pixels wide and high at most. The hot spot lies in it.
 	BCursor(const BBitmap* bitmap, const BPoint& hotspot);
 	virtual ~BCursor();
 
@@ -67,7 +71,8 @@ private:
 	friend class BPrivate::CursorPrivate;
 
 	uint8 fData[68] = {}; // as given; only with an id of 0
-	int32 fID = 0; // a BCursorID, or 0 for own data
+	int32 fID = 0; // a BCursorID, or 0 for own data or an own picture
+	std::shared_ptr<const BPrivate::CursorPicture> fPicture; // shared by copies
 	status_t fStatus = B_OK;
 };
 

@@ -214,6 +214,12 @@ NamedCursor(int32 id)
 QCursor
 cursor_of(const CursorShape& shape)
 {
+	if (shape.id == CursorShape::kFromPicture && shape.picture != nullptr) {
+		const CursorPicture& picture = *shape.picture;
+		const QImage image(reinterpret_cast<const uchar*>(picture.pixels.data()), picture.width,
+			picture.height, QImage::Format_ARGB32);
+		return QCursor(QPixmap::fromImage(image), picture.hotX, picture.hotY);
+	}
 	if (shape.id != CursorShape::kFromBits)
 		return QCursor(NamedCursor(shape.id));
 
