@@ -27,12 +27,12 @@ HasEditor(const BView* panel)
 
 
 bool
-SelectInEditor(const BView* panel, BView* view)
+ReplaceInEditor(const BView* panel, BView* former, BView* view)
 {
 	ViewEditor* editor = EditorOf(panel);
 	if (editor == nullptr)
 		return false;
 
-	editor->SelectView(view);
+	editor->ReplaceView(former, view);
 	return true;
 }

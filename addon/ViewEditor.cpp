@@ -146,9 +146,9 @@ ViewEditor::ExecDataChanged(
 
 
 void
-ViewEditor::SelectView(BView* view)
+ViewEditor::ReplaceView(BView* former, BView* view)
 {
-	fWorkView->SetSelectedView(view);
+	fWorkView->ReplaceView(former, view);
 }
 
 

@@ -29,8 +29,9 @@ public:
 	virtual void ExecDataChanged(const BResEditor::BResourceCollection* collection,
 		BResEditor::BResourceHandle& item, uint32 changes);
 
-	// Selects a view of the edited tree.
-	void SelectView(BView* view);
+	// A view has taken the place of another one in the edited tree: it is selected, and the former
+	// one may be deleted.
+	void ReplaceView(BView* former, BView* view);
 
 	// The view's side.
 	void AllAttached() override;

@@ -304,7 +304,7 @@ EditScrollView::_ToggleBar(const Bar& toggled, const Bar& kept)
 	ColorfulAddChild(parent, scrollView);
 	beep(); // also when all went well
 
-	SelectInEditor(this, scrollView);
+	ReplaceInEditor(this, old, scrollView);
 	TakeTarget(scrollView);
 	delete old;
 }

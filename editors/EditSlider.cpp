@@ -251,7 +251,7 @@ EditSlider::_Rebuild(const std::function<void(BMessage& archive)>& change)
 	change(archive);
 	BSlider* slider = new BSlider(&archive);
 	ColorfulAddChild(parent, slider);
-	SelectInEditor(this, slider);
+	ReplaceInEditor(this, old, slider);
 	TakeTarget(slider);
 	delete old;
 }

@@ -87,19 +87,10 @@ EditView::_AddColorSection(BRect area)
 	const float radioLeft = section->Bounds().right - kInset - kRadioWidth;
 	BRect frame(fColorControl->Frame().right + kGap, kFirstRow, radioLeft - kGap,
 		kFirstRow + kSwatchHeight);
-	BRect radioFrame = FrameAt(radioLeft, kFirstRow, kRadioWidth, kSwatchHeight);
-	auto addRow = [&](BBox*& swatch, BRadioButton*& radio, const char* label, uint32 code) {
-		swatch = AddSwatch(section, frame);
-		radio = new BRadioButton(
-			radioFrame, NULL, label, new BMessage(code), B_FOLLOW_RIGHT, kControlFlags);
-		section->AddChild(radio);
+	for (BBox** swatch : { &fViewSwatch, &fHighSwatch, &fLowSwatch }) {
+		*swatch = AddSwatch(section, frame);
 		frame.OffsetBy(0, kSwatchStep);
-		radioFrame.OffsetBy(0, kSwatchStep);
-	};
-	addRow(fViewSwatch, fViewRadio, "View", kViewChosen);
-	addRow(fHighSwatch, fHighRadio, "High", kHighChosen);
-	addRow(fLowSwatch, fLowRadio, "Low", kLowChosen);
-	fViewRadio->SetValue(B_CONTROL_ON);
+	}
 
 	BRect button = FrameAt(kInset, kButtonTop, kButtonWidth, kButtonHeight);
 	fDefaultButton = AddButton(section, button, "216 Gray", kDefaultPressed);
@@ -107,6 +98,14 @@ EditView::_AddColorSection(BRect area)
 	AddButton(section, button, "Use Parent", kParentPressed);
 	button.OffsetBy(kButtonStep, 0);
 	AddButton(section, button, "Set Children", kChildrenPressed);
+
+	BRect radio = FrameAt(radioLeft, kFirstRow, kRadioWidth, kSwatchHeight);
+	fViewRadio = AddRadioButton(section, radio, "View", kViewChosen, B_FOLLOW_RIGHT);
+	radio.OffsetBy(0, kSwatchStep);
+	fHighRadio = AddRadioButton(section, radio, "High", kHighChosen, B_FOLLOW_RIGHT);
+	radio.OffsetBy(0, kSwatchStep);
+	fLowRadio = AddRadioButton(section, radio, "Low", kLowChosen, B_FOLLOW_RIGHT);
+	fViewRadio->SetValue(B_CONTROL_ON);
 }
 
 

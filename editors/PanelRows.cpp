@@ -11,6 +11,7 @@
 #include <MenuField.h>
 #include <MenuItem.h>
 #include <Message.h>
+#include <RadioButton.h>
 #include <StringView.h>
 #include <TextControl.h>
 
@@ -85,6 +86,16 @@ AddButton(BView* panel, BRect frame, const char* label, uint32 code, uint32 resi
 {
 	BButton* button =
 		new BButton(frame, NULL, label, new BMessage(code), resizingMode, kControlFlags);
+	panel->AddChild(button);
+	return button;
+}
+
+
+BRadioButton*
+AddRadioButton(BView* panel, BRect frame, const char* label, uint32 code, uint32 resizingMode)
+{
+	BRadioButton* button =
+		new BRadioButton(frame, NULL, label, new BMessage(code), resizingMode, kControlFlags);
 	panel->AddChild(button);
 	return button;
 }

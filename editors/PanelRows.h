@@ -10,10 +10,10 @@
 
 class BButton;
 class BCheckBox;
-class BInvoker;
 class BMenu;
 class BMenuField;
 class BMessage;
+class BRadioButton;
 class BTextControl;
 class FloatControl;
 class IntControl;
@@ -38,6 +38,8 @@ FloatControl* AddFloatControl(BView* panel, BRect frame, const char* label, uint
 BCheckBox* AddCheckBox(BView* panel, BRect frame, const char* label, uint32 code);
 BButton* AddButton(BView* panel, BRect frame, const char* label, uint32 code,
 	uint32 resizingMode = kFollowLeftTop);
+BRadioButton* AddRadioButton(
+	BView* panel, BRect frame, const char* label, uint32 code, uint32 resizingMode);
 void AddSentence(BView* panel, BRect frame, const char* text, uint32 resizingMode = kFollowLeftTop);
 void AddSeparator(BView* panel, BRect frame);
 BMenuField* AddMenuField(

@@ -189,6 +189,15 @@ WorkView::SelectedView() const
 }
 
 
+void
+WorkView::ReplaceView(BView* former, BView* view)
+{
+	if (former == fEditView)
+		fEditView = view;
+	SetSelectedView(view);
+}
+
+
 WorkBackgroundView*
 WorkView::Container() const
 {

@@ -37,6 +37,10 @@ public:
 	void SetSelectedView(BView* view);
 	BView* SelectedView() const; // NULL for none, also when the view is gone
 
+	// A view stands in the place of another one, perhaps of the root. It is selected; the former one
+	// is the caller's.
+	void ReplaceView(BView* former, BView* view);
+
 	WorkBackgroundView* Container() const;
 
 	// What the user looks at, in a form that outlives the tree: for a tree that is replaced by one

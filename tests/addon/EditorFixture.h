@@ -11,6 +11,8 @@
 #include <TextControl.h>
 
 #include "addon/ViewEditor.h"
+#include "archive/ViewArchive.h"
+#include "archive/ViewTree.h"
 #include "editors/EditorInterface.h"
 #include "support/ControlUser.h"
 #include "support/TestWindow.h"
@@ -38,6 +40,7 @@ protected:
 		std::unique_ptr<BView> owned(root);
 		BMessage archive;
 		root->Archive(&archive, true);
+		SwapInheritedViews(&archive, 0);
 		return Flatten(archive);
 	}
 
@@ -90,6 +93,28 @@ protected:
 	BView* Find(const char* name) { return Root()->FindView(name); }
 	template<class View> View* Find(const char* name) { return dynamic_cast<View*>(Find(name)); }
 	BView* Column() { return editor->ChildAt(0); }
+
+	// Clicks on a part of the view that no child covers.
+	void Select(BView* view)
+	{
+		const BPoint place = BarePlace(view);
+		driver.Click(view, place);
+		ASSERT_EQ(view, workView->SelectedView());
+	}
+
+	// From the left top, a little inside.
+	BPoint BarePlace(BView* view)
+	{
+		const BRect bounds = view->Bounds();
+		for (float y = bounds.top; y <= bounds.bottom; y += 1) {
+			for (float x = bounds.left; x <= bounds.right; x += 1) {
+				if (PointInView(view, BPoint(x, y), nullptr) == view)
+					return BPoint(x, y);
+			}
+		}
+		ADD_FAILURE() << view->Name() << " is covered by its children";
+		return BPoint();
+	}
 
 	// A panel that is shown, or NULL.
 	BView* Panel(const char* name) { return Column()->FindView(name); }

@@ -142,14 +142,14 @@ constexpr const char* kPanels[] = {
 	"box \"View (background), High, and Low Color\" 6,224,394 1234\n"
 	"\tcolors colr 6,10,279 1212\n"
 	"\tbox \"\" 285,10,322 0204\n"
-	"\tcontrol \"View\" view 328,10,382 0404\n"
 	"\tbox \"\" 285,39,322 0204\n"
-	"\tcontrol \"High\" high 328,39,382 0404\n"
 	"\tbox \"\" 285,68,322 0204\n"
-	"\tcontrol \"Low\" low  328,68,382 0404\n"
 	"\tcontrol \"216 Gray\" dflt 6,59,90 1212\n"
 	"\tcontrol \"Use Parent\" prnt 96,59,180 1212\n"
-	"\tcontrol \"Set Children\" chld 186,59,270 1212\n",
+	"\tcontrol \"Set Children\" chld 186,59,270 1212\n"
+	"\tcontrol \"View\" view 328,10,382 0404\n"
+	"\tcontrol \"High\" high 328,39,382 0404\n"
+	"\tcontrol \"Low\" low  328,68,382 0404\n",
 	// EditControl
 	"EditControl Properties from BControl 70 0,0,400 1214\n"
 	"field \"Label: \" labl 6,16,394 0204 60\n"
