@@ -17,6 +17,7 @@
 #include "interface/private/AlertView.h"
 #include "interface/private/ControlArchive.h"
 #include "interface/private/Look.h"
+#include "interface/private/ViewArchive.h"
 #include "kernel/private/Activity.h"
 
 namespace {
@@ -146,18 +147,28 @@ BAlert::Instantiate(BMessage* archive)
 status_t
 BAlert::Archive(BMessage* archive, bool deep) const
 {
-	status_t status = BWindow::Archive(archive, deep);
-	if (status == B_OK && fTextView != NULL)
-		status = archive->AddString("_text", fTextView->Text());
-	if (status == B_OK)
-		status = archive->AddInt32("_atype", fType);
-	if (status == B_OK)
-		status = archive->AddInt32("_but_width", fButtonWidth);
-	for (int32 i = 0; status == B_OK && i < kMaximumButtons; i++) {
-		if (fKeys[0] != 0 || fKeys[1] != 0 || fKeys[2] != 0)
-			status = archive->AddInt8("_but_key", fKeys[i]);
+	const status_t status = BWindow::Archive(archive, deep);
+	if (status != B_OK)
+		return status;
+	BPrivate::ArchiveWriter writer(archive);
+	writer.String("_text", fTextView != NULL ? fTextView->Text() : NULL, NULL);
+	writer.Int32("_atype", fType, B_INFO_ALERT);
+	writer.Int32("_but_width", fButtonWidth, B_WIDTH_AS_USUAL);
+
+	bool hasKeys = false;
+	bool sameKeys = true;
+	for (int32 i = 0; i < kMaximumButtons; i++) {
+		int8 key;
+		if (writer.Source().FindInt8("_but_key", i, &key) != B_OK)
+			key = 0;
+		hasKeys = hasKeys || fKeys[i] != 0;
+		sameKeys = sameKeys && key == fKeys[i];
 	}
-	return status;
+	if (!writer.Keep("_but_key", sameKeys) && hasKeys) {
+		for (char key : fKeys)
+			archive->AddInt8("_but_key", key);
+	}
+	return writer.Status();
 }
 
 

@@ -387,6 +387,10 @@ BWindow::GetWindowAlignment(window_alignment* mode, int32* h, int32* hOffset, in
 
 BWindow::BWindow(BMessage* archive) : BLooper(archive)
 {
+	auto source = std::make_unique<ArchiveSource>(archive);
+	// Looked up by others, maybe before anybody took notes.
+	for (const char* name : { "class", "_name", "_views" })
+		source->SetKnown(name);
 	BRect frame;
 	if (archive->FindRect("_frame", &frame) != B_OK)
 		frame.Set(100, 100, 300, 300);
@@ -396,6 +400,8 @@ BWindow::BWindow(BMessage* archive) : BLooper(archive)
 	const auto type = static_cast<window_type>(archive->GetInt32("_type", B_UNTYPED_WINDOW));
 	_Init(frame, title, look, feel, archive->GetInt32("_flags", 0),
 		archive->GetInt32("_wspace", B_CURRENT_WORKSPACE), type);
+
+	fInternals->source = std::move(source);
 
 	float limits[4];
 	bool limited = true;
@@ -426,6 +432,7 @@ BWindow::Instantiate(BMessage* archive)
 status_t
 BWindow::Archive(BMessage* archive, bool deep) const
 {
+	begin_archive(fInternals->source.get(), archive);
 	const status_t status = BLooper::Archive(archive, deep);
 	if (status != B_OK)
 		return status;

@@ -241,3 +241,34 @@ TEST(Alert, IsPlacedInTheUpperPartOfTheScreen)
 	EXPECT_EQ(std::floor(screen.Width() / 2 - 150), place.x);
 	EXPECT_EQ(std::floor(screen.Height() / 4 - 30), place.y);
 }
+
+
+TEST(Alert, IsArchivedWithItsPartsAndWhatItDoesNotKnow)
+{
+	ControlFixture fixture;
+	BAlert* alert = NewAlert(B_WIDTH_FROM_LABEL);
+	alert->SetShortcut(0, B_ESCAPE);
+	alert->SetShortcut(2, 'y');
+	BMessage archive = ArchiveOf(*alert);
+	alert->Quit();
+
+	EXPECT_STREQ("Do you want it?", archive.GetString("_text", ""));
+	EXPECT_EQ(B_WARNING_ALERT, archive.GetInt32("_atype", -1));
+	EXPECT_EQ(B_WIDTH_FROM_LABEL, archive.GetInt32("_but_width", -1));
+	EXPECT_EQ(B_ESCAPE, archive.GetInt8("_but_key", 0, 0));
+	EXPECT_EQ('y', archive.GetInt8("_but_key", 2, 0));
+
+	archive.AddString("unknown", "kept");
+	archive.AddInt32("another", 7);
+	std::unique_ptr<BAlert> revived = Revive<BAlert>(archive);
+	ASSERT_NE(nullptr, revived);
+	EXPECT_EQ(B_WARNING_ALERT, revived->Type());
+	EXPECT_EQ('y', revived->Shortcut(2));
+	EXPECT_STREQ("Do you want it?", revived->TextView()->Text());
+	EXPECT_STREQ("Yes", revived->ButtonAt(2)->Label());
+	EXPECT_TRUE(archive.HasSameData(ArchiveOf(*revived), false, true));
+
+	revived->SetShortcut(2, 0);
+	EXPECT_EQ(0, ArchiveOf(*revived).GetInt8("_but_key", 2, 1));
+	EXPECT_STREQ("kept", ArchiveOf(*revived).GetString("unknown", ""));
+}
