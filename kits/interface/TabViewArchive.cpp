@@ -2,13 +2,18 @@
 #include <TabView.h>
 
 #include <algorithm>
+#include <memory>
 
 #include <Message.h>
 
+#include "app/private/MessagePrivate.h"
+#include "app/private/WriteBack.h"
 #include "interface/private/StandInView.h"
 #include "interface/private/ViewArchive.h"
 
 using BPrivate::ArchiveWriter;
+using BPrivate::MessagePrivate;
+using BPrivate::WriteBack;
 
 
 BArchivable*
@@ -153,10 +158,8 @@ BTabView::_ArchiveTabs(BMessage* archive, const BMessage& source) const
 		return status;
 	if (fPagePlace == PagePlace::kInContainer)
 		status = PutPages(&container, "_views", 0, pages);
-	else {
-		container.RemoveName("_views");
+	else
 		_RestoreContainer(&container, source);
-	}
 	if (status == B_OK)
 		status = archive->ReplaceMessage("_views", 0, &container);
 	if (status == B_OK && fPagePlace == PagePlace::kBesideContainer)
@@ -165,14 +168,18 @@ BTabView::_ArchiveTabs(BMessage* archive, const BMessage& source) const
 }
 
 
-// What an archive had in the container besides its list stays there.
+// What an archive had in the container besides its list stays there, and in its place.
 void
 BTabView::_RestoreContainer(BMessage* container, const BMessage& source) const
 {
+	container->RemoveName("_views");
 	BMessage read;
-	if (source.FindMessage("_views", 0, &read) != B_OK)
+	if (source.FindMessage("_views", 0, &read) != B_OK || read.IsEmpty())
 		return;
+	MessagePrivate(container).SetWriteBack(
+		std::make_unique<WriteBack>(MessagePrivate(&read).Data()));
 	BMessage copy;
 	for (int32 i = 0; read.FindMessage("_views", i, &copy) == B_OK; i++)
 		container->AddMessage("_views", &copy);
+	MessagePrivate(container).SetWriteBack(nullptr);
 }

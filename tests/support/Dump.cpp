@@ -268,6 +268,49 @@ difference(const BMessage& message, const DumpMessage& dump)
 
 
 std::string
+first_difference(const BMessage& read, const BMessage& written)
+{
+	if (read.what != written.what)
+		return ": what";
+	char* name;
+	type_code type;
+	int32 count;
+	for (int32 i = 0; read.GetInfo(B_ANY_TYPE, i, &name, &type, &count) == B_OK; i++) {
+		char* otherName = nullptr;
+		type_code otherType;
+		int32 otherCount;
+		if (written.GetInfo(B_ANY_TYPE, i, &otherName, &otherType, &otherCount) != B_OK)
+			return std::string(": no field ") + name;
+		if (strcmp(name, otherName) != 0)
+			return std::string(": ") + otherName + " in the place of " + name;
+		if (type != otherType || count != otherCount)
+			return std::string(": type or count of ") + name;
+		for (int32 k = 0; k < count; k++) {
+			const std::string path = std::string(".") + name + "[" + std::to_string(k) + "]";
+			BMessage a, b;
+			if (type == B_MESSAGE_TYPE && read.FindMessage(name, k, &a) == B_OK
+				&& written.FindMessage(name, k, &b) == B_OK) {
+				const std::string nested = first_difference(a, b);
+				if (!nested.empty())
+					return path + nested;
+				continue;
+			}
+			const void* data;
+			const void* otherData;
+			ssize_t size, otherSize;
+			read.FindData(name, type, k, &data, &size);
+			written.FindData(name, type, k, &otherData, &otherSize);
+			if (size != otherSize || memcmp(data, otherData, size) != 0)
+				return path + ": bytes";
+		}
+	}
+	if (written.GetInfo(B_ANY_TYPE, read.CountNames(B_ANY_TYPE), &name, &type, &count) == B_OK)
+		return std::string(": new field ") + name;
+	return "";
+}
+
+
+std::string
 samples_folder()
 {
 	const char* folder = getenv("ARCHWAY_SAMPLES");

@@ -45,6 +45,10 @@ std::vector<DumpResource> read_dump(const std::string& path);
 // Empty when the message is what the dump says, else where the two differ.
 std::string difference(const BMessage& message, const DumpMessage& dump);
 
+// The first difference of two messages, the order of their fields included, as a path; empty when
+// there is none.
+std::string first_difference(const BMessage& read, const BMessage& written);
+
 // The sample folder, or an empty text when the environment names none.
 std::string samples_folder();
 // Paths of all resource files among the samples that have a dump beside them.

@@ -18,50 +18,6 @@
 
 namespace {
 
-// The first difference of two messages, as a path; empty when there is none.
-std::string
-first_difference(const BMessage& read, const BMessage& written)
-{
-	if (read.what != written.what)
-		return ": what";
-	char* name;
-	type_code type;
-	int32 count;
-	for (int32 i = 0; read.GetInfo(B_ANY_TYPE, i, &name, &type, &count) == B_OK; i++) {
-		char* otherName = nullptr;
-		type_code otherType;
-		int32 otherCount;
-		if (written.GetInfo(B_ANY_TYPE, i, &otherName, &otherType, &otherCount) != B_OK)
-			return std::string(": no field ") + name;
-		if (std::strcmp(name, otherName) != 0)
-			return std::string(": ") + otherName + " in the place of " + name;
-		if (type != otherType || count != otherCount)
-			return std::string(": type or count of ") + name;
-		for (int32 k = 0; k < count; k++) {
-			const std::string path = std::string(".") + name + "[" + std::to_string(k) + "]";
-			BMessage a, b;
-			if (type == B_MESSAGE_TYPE && read.FindMessage(name, k, &a) == B_OK
-				&& written.FindMessage(name, k, &b) == B_OK) {
-				const std::string nested = first_difference(a, b);
-				if (!nested.empty())
-					return path + nested;
-				continue;
-			}
-			const void* data;
-			const void* otherData;
-			ssize_t size, otherSize;
-			read.FindData(name, type, k, &data, &size);
-			written.FindData(name, type, k, &otherData, &otherSize);
-			if (size != otherSize || std::memcmp(data, otherData, size) != 0)
-				return path + ": bytes";
-		}
-	}
-	if (written.GetInfo(B_ANY_TYPE, read.CountNames(B_ANY_TYPE), &name, &type, &count) == B_OK)
-		return std::string(": new field ") + name;
-	return "";
-}
-
-
 struct Archive {
 	std::string where;
 	BMessage message;
@@ -118,13 +74,13 @@ TEST(ViewArchive, SamplesComeOutAsTheyWereRead)
 			continue;
 		BMessage unattached;
 		ASSERT_EQ(B_OK, view->Archive(&unattached));
-		EXPECT_EQ("", first_difference(archive.message, unattached)) << archive.where;
+		EXPECT_EQ("", test::first_difference(archive.message, unattached)) << archive.where;
 
 		window.Add(view.get());
 		window.Locked([&] { view->RemoveSelf(); });
 		BMessage shown;
 		ASSERT_EQ(B_OK, view->Archive(&shown));
-		EXPECT_EQ("", first_difference(archive.message, shown)) << archive.where << ", shown";
+		EXPECT_EQ("", test::first_difference(archive.message, shown)) << archive.where << ", shown";
 		tested++;
 	}
 	EXPECT_GT(tested, 20);
@@ -256,7 +212,7 @@ TEST(ViewArchive, MissingAndStrangeFieldsGiveTheDefaults)
 	view->GetFont(&font);
 	EXPECT_EQ(be_plain_font->Size(), font.Size());
 	EXPECT_EQ(100, font.Shear());
-	EXPECT_EQ("", first_difference(archive, archive_of(*view)));
+	EXPECT_EQ("", test::first_difference(archive, archive_of(*view)));
 
 	view->SetName("new");
 	view->SetFlags(B_WILL_DRAW);
@@ -280,7 +236,7 @@ TEST(ViewArchive, OnlyWhatWasChangedIsWrittenAnewAndInItsPlace)
 	archive.AddInt32("after", 3);
 	std::unique_ptr<BView> view = revive(archive);
 	EXPECT_EQ(BRect(0, 0, 10, 10), view->Frame());
-	EXPECT_EQ("", first_difference(archive, archive_of(*view)));
+	EXPECT_EQ("", test::first_difference(archive, archive_of(*view)));
 
 	view->MoveTo(5, 5);
 	BMessage expected('what');
@@ -293,9 +249,9 @@ TEST(ViewArchive, OnlyWhatWasChangedIsWrittenAnewAndInItsPlace)
 	expected.AddInt32("_flags", 0);
 	expected.AddString("_name", "n");
 	expected.AddInt32("after", 3);
-	EXPECT_EQ("", first_difference(expected, archive_of(*view)));
+	EXPECT_EQ("", test::first_difference(expected, archive_of(*view)));
 	view->MoveTo(0, 0);
-	EXPECT_EQ("", first_difference(archive, archive_of(*view)));
+	EXPECT_EQ("", test::first_difference(archive, archive_of(*view)));
 }
 
 
@@ -311,7 +267,7 @@ TEST(ViewArchive, AColourThatFollowsTheInterfaceStopsWhenItIsSet)
 		archive.AddFloat("_uitint", 1);
 	std::unique_ptr<BView> view = revive(archive);
 	EXPECT_EQ((rgb_color { 216, 216, 216, 255 }), view->ViewColor());
-	EXPECT_EQ("", first_difference(archive, archive_of(*view)));
+	EXPECT_EQ("", test::first_difference(archive, archive_of(*view)));
 	view->SetViewColor(1, 2, 3);
 	BMessage changed = archive_of(*view);
 	EXPECT_EQ(0x11111111, changed.FindInt32("_color", 0));
@@ -378,14 +334,14 @@ TEST(ViewArchive, AnUnknownClassIsStoodInForAndWrittenBack)
 	EXPECT_EQ(BRect(5, 5, 50, 50), view->ChildAt(0)->Frame());
 	EXPECT_EQ(1, view->ChildAt(0)->CountChildren());
 	window.Locked([&] {
-		EXPECT_EQ("", first_difference(archive, archive_of(*view)));
+		EXPECT_EQ("", test::first_difference(archive, archive_of(*view)));
 		view->ChildAt(0)->MoveTo(6, 6);
 		BMessage changed = archive_of(*view);
 		BMessage written;
 		ASSERT_EQ(B_OK, changed.FindMessage("_views", 0, &written));
 		BMessage expected(child);
 		expected.ReplaceRect("_frame", BRect(6, 6, 51, 51));
-		EXPECT_EQ("", first_difference(expected, written));
+		EXPECT_EQ("", test::first_difference(expected, written));
 	});
 }
 
@@ -405,7 +361,7 @@ TEST(ViewArchive, ChildrenThatComeAndGoAreWritten)
 	BMessage written = archive_of(*view);
 	BMessage second;
 	ASSERT_EQ(B_OK, written.FindMessage("_views", 1, &second));
-	EXPECT_EQ("", first_difference(child, second));
+	EXPECT_EQ("", test::first_difference(child, second));
 	char* name;
 	type_code type;
 	ASSERT_EQ(B_OK, written.GetInfo(B_ANY_TYPE, written.CountNames(B_ANY_TYPE) - 1, &name, &type));

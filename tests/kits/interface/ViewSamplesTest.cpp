@@ -16,48 +16,6 @@
 
 namespace {
 
-// Names the fields that differ, those of nested messages by their path.
-void
-describe_difference(const BMessage& before, const BMessage& after, const std::string& path)
-{
-	char* name;
-	type_code type;
-	int32 count;
-	for (int32 i = 0; before.GetInfo(B_ANY_TYPE, i, &name, &type, &count) == B_OK; i++) {
-		type_code newType;
-		int32 newCount;
-		if (after.GetInfo(name, &newType, &newCount) != B_OK) {
-			ADD_FAILURE() << path << name << " is gone";
-			continue;
-		}
-		if (newType != type || newCount != count) {
-			ADD_FAILURE() << path << name << " has " << newCount << " instead of " << count
-						  << " entries, or another type";
-			continue;
-		}
-		for (int32 j = 0; j < count; j++) {
-			const void* a;
-			const void* b;
-			ssize_t sizeA, sizeB;
-			BMessage inner, newInner;
-			if (type == B_MESSAGE_TYPE && before.FindMessage(name, j, &inner) == B_OK
-				&& after.FindMessage(name, j, &newInner) == B_OK) {
-				describe_difference(
-					inner, newInner, path + name + "[" + std::to_string(j) + "] > ");
-			} else if (before.FindData(name, type, j, &a, &sizeA) != B_OK
-				|| after.FindData(name, type, j, &b, &sizeB) != B_OK || sizeA != sizeB
-				|| memcmp(a, b, sizeA) != 0) {
-				ADD_FAILURE() << path << name << "[" << j << "] differs";
-			}
-		}
-	}
-	for (int32 i = 0; after.GetInfo(B_ANY_TYPE, i, &name, &type, &count) == B_OK; i++) {
-		if (before.GetInfo(name, &type, &count) != B_OK)
-			ADD_FAILURE() << path << name << " is new";
-	}
-}
-
-
 std::string
 flatten(const BMessage& message)
 {
@@ -104,10 +62,9 @@ TEST(ViewSamples, ShownAndArchivedAgainTheyAreTheSame)
 			});
 			delete view;
 			if (flatten(after) != before) {
-				ADD_FAILURE() << "not the same bytes";
 				BMessage clean;
 				clean.Unflatten(before.c_str());
-				describe_difference(clean, after, "");
+				ADD_FAILURE() << "not the same bytes" << test::first_difference(clean, after);
 			}
 		}
 	}
