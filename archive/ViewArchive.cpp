@@ -42,10 +42,13 @@ SameEntries(const BMessage* a, const BMessage* b, const char* name, type_code ty
 	for (int32 i = 0; i < count; i++) {
 		if (type == B_MESSAGE_TYPE) {
 			BMessage nestedA, nestedB;
-			if (a->FindMessage(name, i, &nestedA) != B_OK
-				|| b->FindMessage(name, i, &nestedB) != B_OK || !Equal(&nestedA, &nestedB))
+			const bool readA = a->FindMessage(name, i, &nestedA) == B_OK;
+			const bool readB = b->FindMessage(name, i, &nestedB) == B_OK;
+			if (readA != readB || (readA && !Equal(&nestedA, &nestedB)))
 				return false;
-			continue;
+			if (readA)
+				continue;
+			// What nobody can read is still the same when its bytes are.
 		}
 
 		const void* dataA;

@@ -126,9 +126,12 @@ BApplication::~BApplication()
 }
 
 
+// A program that opens archives already is an application, and a second one would end it.
 BArchivable*
 BApplication::Instantiate(BMessage* data)
 {
+	if (be_app != NULL)
+		return NULL;
 	return validate_instantiation(data, "BApplication") ? new BApplication(data) : nullptr;
 }
 

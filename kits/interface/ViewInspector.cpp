@@ -54,11 +54,12 @@ struct Windows {
 };
 
 
+// Never destroyed: windows' threads outlive main() in a program that just returns from it.
 Windows&
 windows()
 {
-	static Windows sWindows;
-	return sWindows;
+	static Windows* const sWindows = new Windows;
+	return *sWindows;
 }
 
 

@@ -194,6 +194,21 @@ TEST(Equal, SeesAMissingFieldATypeAndACount)
 }
 
 
+TEST(Equal, ComparesUnreadableArchivesByTheirBytes)
+{
+	BMessage a, b, c, d;
+	a.AddData("_views", B_MESSAGE_TYPE, "no archive", 10, false);
+	b.AddData("_views", B_MESSAGE_TYPE, "no archive", 10, false);
+	c.AddData("_views", B_MESSAGE_TYPE, "no Archive", 10, false);
+	const BMessage nested;
+	d.AddMessage("_views", &nested);
+	EXPECT_TRUE(Equal(&a, &b));
+	EXPECT_FALSE(Equal(&a, &c));
+	EXPECT_FALSE(Equal(&a, &d));
+	EXPECT_FALSE(Equal(&d, &a));
+}
+
+
 TEST(Equal, DescendsIntoNestedArchives)
 {
 	BMessage inner(1), otherInner(1);

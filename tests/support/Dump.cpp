@@ -295,12 +295,15 @@ first_difference(const BMessage& read, const BMessage& written)
 					return path + nested;
 				continue;
 			}
-			const void* data;
-			const void* otherData;
-			ssize_t size, otherSize;
-			read.FindData(name, type, k, &data, &size);
-			written.FindData(name, type, k, &otherData, &otherSize);
-			if (size != otherSize || memcmp(data, otherData, size) != 0)
+			const void* data = nullptr;
+			const void* otherData = nullptr;
+			ssize_t size = 0;
+			ssize_t otherSize = 0;
+			const status_t status = read.FindData(name, type, k, &data, &size);
+			if (written.FindData(name, type, k, &otherData, &otherSize) != status)
+				return path + ": there in one only";
+			// Of two fields with one name the second cannot be asked for.
+			if (status == B_OK && (size != otherSize || memcmp(data, otherData, size) != 0))
 				return path + ": bytes";
 		}
 	}

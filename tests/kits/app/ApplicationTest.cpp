@@ -88,6 +88,18 @@ TEST(Application, IsTheOnlyOne)
 }
 
 
+TEST(Application, AnArchiveMakesNoSecondOne)
+{
+	BApplication application(kSignature);
+	BMessage archive;
+	ASSERT_EQ(B_OK, application.Archive(&archive));
+	DebuggerCatcher catcher;
+	EXPECT_EQ(NULL, instantiate_object(&archive));
+	EXPECT_TRUE(catcher.Take().empty());
+	EXPECT_EQ(&application, be_app);
+}
+
+
 TEST(Application, RunsInTheCallersThreadAndHearsOfItsStartFirst)
 {
 	TestApplication app;

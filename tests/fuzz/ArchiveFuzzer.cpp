@@ -1,0 +1,149 @@
+// Any message as the archive of a view: revived, shown in a window, and archived again. Whatever it
+// is, looking at it changes nothing, unknown fields stay, and what was written is read and written
+// the same. (That a sound archive is written as it was read, the tests of the samples show.)
+
+#include <stdio.h>
+#include <stdlib.h>
+#include <string.h>
+
+#include <memory>
+
+#include <Application.h>
+#include <Message.h>
+#include <MessageForm.h>
+#include <View.h>
+#include <Window.h>
+
+#include "archive/ViewArchive.h"
+#include "tests/support/Dump.h"
+
+namespace {
+
+void
+Require(bool holds, const char* what)
+{
+	if (holds)
+		return;
+	fprintf(stderr, "not so: %s\n", what);
+	abort();
+}
+
+
+// One window for all runs, never deleted: an application ends with the process.
+BWindow*
+Stage()
+{
+	static BWindow* sWindow = NULL;
+	if (sWindow == NULL) {
+		setenv("ARCHWAY_BACKEND", "headless", 0);
+		setenv("QT_QPA_PLATFORM", "offscreen", 0);
+		new BApplication("application/x-vnd.Archway-fuzzer");
+		sWindow = new BWindow(BRect(0, 0, 119, 89), "stage", B_TITLED_WINDOW, 0);
+		sWindow->Show();
+	}
+	return sWindow;
+}
+
+
+void
+RequireEqual(const BMessage& expected, const BMessage& given, const char* what)
+{
+	if (Equal(&expected, &given))
+		return;
+	fprintf(stderr, "archive%s\n", test::first_difference(expected, given).c_str());
+	Require(false, what);
+}
+
+
+// The fields that no class knows.
+void
+RequireStrangers(const BMessage& read, const BMessage& written)
+{
+	BMessage before;
+	BMessage after;
+	for (const BMessage* message : { &read, &written }) {
+		char* name;
+		type_code type;
+		for (int32 i = 0; message->GetInfo(B_ANY_TYPE, i, &name, &type) == B_OK; i++) {
+			if (strncmp(name, "stranger", 8) != 0)
+				continue;
+			const void* data;
+			ssize_t size;
+			for (int32 k = 0; message->FindData(name, type, k, &data, &size) == B_OK; k++)
+				(message == &read ? before : after).AddData(name, type, data, size, false);
+		}
+	}
+	RequireEqual(before, after, "unknown fields are written back");
+}
+
+
+std::unique_ptr<BView>
+Revive(BMessage* archive)
+{
+	BArchivable* object = InstantiateAsChild(archive);
+	BView* view = dynamic_cast<BView*>(object);
+	if (view == NULL)
+		delete object;
+	return std::unique_ptr<BView>(view);
+}
+
+
+BMessage
+ArchiveOf(const BView& view, uint32 what)
+{
+	BMessage archive(what);
+	Require(view.Archive(&archive) == B_OK, "a view can be archived");
+	archive.what = what;
+	return archive;
+}
+
+
+void
+Show(BView* view)
+{
+	BWindow* window = Stage();
+	window->Lock();
+	window->AddChild(view);
+	window->UpdateIfNeeded();
+	Require(view->RemoveSelf(), "a view leaves its window");
+	window->Unlock();
+}
+
+} // namespace
+
+
+extern "C" int
+LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
+{
+	BMessage archive;
+	if (unflatten_message(&archive, data, size) != B_OK)
+		return 0;
+	const uint32 what = archive.what;
+	SwapInheritedViews(&archive, 0);
+	// With two fields of one name only the first can be asked for.
+	if (!Equal(&archive, &archive))
+		return 0;
+	Stage();
+
+	BMessage read(archive);
+	const std::unique_ptr<BView> view = Revive(&archive);
+	RequireEqual(read, archive, "reviving leaves the archive as it is");
+	if (view == NULL)
+		return 0;
+	BMessage written = ArchiveOf(*view, what);
+	RequireStrangers(read, written);
+
+	Show(view.get());
+	BMessage shown = ArchiveOf(*view, what);
+	// What a class makes that its archive lacks looks for its colours when it is shown.
+	if (Equal(&read, &written))
+		RequireEqual(written, shown, "showing changes nothing");
+
+	const BMessage expected(shown);
+	const std::unique_ptr<BView> second = Revive(&shown);
+	Require(second != NULL, "what was written can be revived");
+	Show(second.get());
+	const BMessage again = ArchiveOf(*second, what);
+	RequireEqual(expected, again, "what was written is read and written");
+	return 0;
+}
