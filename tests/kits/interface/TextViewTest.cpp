@@ -476,6 +476,68 @@ TEST(TextView, DrawnTextAppearsAndSelectionIsInverted)
 }
 
 
+// How many dark pixels the view shows: the caret, where there is no text.
+static int32
+dark_pixels(Editor& editor)
+{
+	int32 dark = 0;
+	for (int32 y = 0; y < 30; y++) {
+		for (int32 x = 0; x < 10; x++)
+			dark += editor.driver.PixelAt(editor.view, BPoint(x, y)).red < 128 ? 1 : 0;
+	}
+	return dark;
+}
+
+
+TEST(TextView, TheCaretBlinksByThePulse)
+{
+	Editor editor;
+	editor.Locked([&] { editor.Window()->SetPulseRate(50000); });
+	// Both ends of the change come by themselves; a caret that stays is a hang.
+	while (dark_pixels(editor) == 0)
+		Driver::WaitUntilIdle();
+	while (dark_pixels(editor) != 0)
+		Driver::WaitUntilIdle();
+	editor.driver.Key("Left");
+	EXPECT_NE(0, dark_pixels(editor)); // every key shows it anew
+	editor.Locked([&] { editor.view->MakeFocus(false); });
+	EXPECT_EQ(0, dark_pixels(editor));
+}
+
+
+TEST(TextView, APointerHeldBelowTheViewScrollsAndSelects)
+{
+	Editor editor;
+	std::string text;
+	for (int32 line = 0; line < 100; line++)
+		text += "line " + std::to_string(line) + "\n";
+	editor.Locked([&] { editor.view->SetText(text.c_str()); });
+	int32 pressed = 0;
+	editor.Locked([&] { pressed = editor.view->OffsetAt(BPoint(20, 20)); });
+	editor.driver.MoveTo(editor.view, BPoint(20, 20));
+	editor.driver.Press();
+	editor.driver.MoveTo(editor.view, BPoint(20, 220));
+
+	const auto bottom = [&] {
+		float result = 0;
+		editor.Locked([&] { result = editor.view->Bounds().bottom; });
+		return result;
+	};
+	float end = 0;
+	editor.Locked([&] { end = editor.view->PointAt(editor.view->TextLength()).y; });
+	while (bottom() < end)
+		Driver::WaitUntilIdle();
+	editor.driver.Release();
+	int32 from, to;
+	editor.view->GetSelection(&from, &to);
+	EXPECT_EQ(pressed, from);
+	EXPECT_EQ(static_cast<int32>(text.size()), to);
+	const float rested = bottom();
+	Driver::WaitUntilIdle();
+	EXPECT_EQ(rested, bottom());
+}
+
+
 TEST(TextView, RunArraysSurviveFlattening)
 {
 	BApplication app("application/x-vnd.Archway-test");
