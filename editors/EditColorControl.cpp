@@ -68,7 +68,7 @@ EditColorControl::UseView(BView* view)
 		return false;
 
 	MarkChoice(fLayoutMenu, IndexOfLayout(_Target()->Layout()));
-	fCellSizeControl->SetValue(static_cast<int>(_Target()->CellSize()));
+	fCellSizeControl->SetValue(WholeNumber(_Target()->CellSize()));
 	return true;
 }
 

@@ -71,6 +71,7 @@ EditMenuField::ApplyEdit(BMessage* message)
 			break;
 		case kDividerChanged:
 			_Target()->SetDivider(dividerControl->FloatValue());
+			dividerControl->ShowFloatValue(_Target()->Divider()); // which is a whole number
 			break;
 		case kEnabledChanged:
 			_Target()->SetEnabled(IsOn(enabledCheckBox));

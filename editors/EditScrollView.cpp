@@ -234,8 +234,8 @@ EditScrollView::_LoadExtent(Bar& bar)
 	bar.total->SetMax(FLT_MAX);
 	bar.total->SetMin(extent);
 	bar.total->SetFloatValue(extent + maximum);
-	bar.smallStep->SetValue(static_cast<int>(std::lround(smallStep)));
-	bar.bigStep->SetValue(static_cast<int>(std::lround(bigStep)));
+	bar.smallStep->SetValue(WholeNumber(std::round(smallStep)));
+	bar.bigStep->SetValue(WholeNumber(std::round(bigStep)));
 }
 
 

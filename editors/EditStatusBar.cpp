@@ -168,10 +168,14 @@ EditStatusBar::_ApplyTexts()
 }
 
 
+// The value changes by a difference, which may be too coarse for a small number the first time.
 void
 EditStatusBar::_ApplyValue()
 {
-	_Target()->Update(fValueControl->FloatValue() - _Target()->CurrentValue());
+	const float value = fValueControl->FloatValue();
+	_Target()->Update(value - _Target()->CurrentValue());
+	if (_Target()->CurrentValue() != value)
+		_Target()->Update(value - _Target()->CurrentValue());
 }
 
 

@@ -77,6 +77,7 @@ EditTextControl::ApplyEdit(BMessage* message)
 			break;
 		case kDividerChanged:
 			_Target()->SetDivider(fDividerControl->FloatValue());
+			fDividerControl->ShowFloatValue(_Target()->Divider()); // which is a whole number
 			break;
 		case kMessageChanged:
 			_ApplyMessageCode();

@@ -183,6 +183,16 @@ NumberFromText(const char* text)
 }
 
 
+int32
+WholeNumber(float number)
+{
+	// The largest float that is no greater than the type's limit is less than it.
+	if (number >= static_cast<float>(INT32_MAX))
+		return INT32_MAX;
+	return number > static_cast<float>(INT32_MIN) ? static_cast<int32>(number) : INT32_MIN;
+}
+
+
 uint32
 TakeCode(BTextControl* control)
 {

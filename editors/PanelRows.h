@@ -58,6 +58,9 @@ bool IsOn(const BCheckBox* box);
 // What the text begins with; a number beyond the type counts as the type's own limit.
 int32 NumberFromText(const char* text);
 
+// A number without its fraction, or the type's limit where it is beyond that.
+int32 WholeNumber(float number);
+
 // The code of a message that is made because a code was typed: four question marks.
 constexpr uint32 kNewMessage = 0x3f3f3f3f;
 

@@ -226,9 +226,9 @@ void
 BColorControl::_WriteFields()
 {
 	for (int32 i = 0; i < 3; i++) {
-		const int32 amount = ComponentOf(Value(), i);
-		if (atoi(fFields[i]->Text()) != amount || fFields[i]->Text()[0] == '\0')
-			fFields[i]->SetText(std::to_string(amount).c_str());
+		const std::string amount = std::to_string(ComponentOf(Value(), i));
+		if (fFields[i]->Text() != amount)
+			fFields[i]->SetText(amount.c_str());
 	}
 }
 
@@ -255,8 +255,10 @@ BColorControl::SetValue(int32 colorValue)
 {
 	// The lowest byte means nothing.
 	colorValue &= ~0xff;
-	if (colorValue == Value())
+	if (colorValue == Value()) {
+		_WriteFields(); // where the same was typed in another way
 		return;
+	}
 	SetValueNoUpdate(colorValue);
 	_WriteFields();
 	Invalidate(_PaletteFrame());

@@ -3,6 +3,7 @@
 
 #include <string>
 #include <string_view>
+#include <vector>
 
 #include <View.h>
 
@@ -38,7 +39,24 @@ public:
 		return _Find<Control>(root, label, n);
 	}
 
+	// Every view of a class below a view, in the order of the children.
+	template<class View> static std::vector<View*> All(BView* root)
+	{
+		std::vector<View*> views;
+		_Collect(root, views);
+		return views;
+	}
+
 private:
+	template<class View> static void _Collect(BView* root, std::vector<View*>& views)
+	{
+		for (BView* child = root->ChildAt(0); child != nullptr; child = child->NextSibling()) {
+			if (View* view = dynamic_cast<View*>(child))
+				views.push_back(view);
+			_Collect(child, views);
+		}
+	}
+
 	template<class Control> static Control* _Find(BView* root, const std::string& label, int& n)
 	{
 		for (BView* child = root->ChildAt(0); child != nullptr; child = child->NextSibling()) {
