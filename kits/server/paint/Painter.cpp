@@ -331,11 +331,14 @@ Painter::_AddDamage(const clipping_rect& deviceRect)
 		fSurface.LogicalAt(deviceRect.top), fSurface.LogicalAt(deviceRect.right),
 		fSurface.LogicalAt(deviceRect.bottom) };
 
+	// Most of what is painted lies in what has been painted already.
+	for (int32 i = 0; i < fDamageCount; i++) {
+		if (Includes(fDamage[i], rect))
+			return;
+	}
 	int32 best = -1;
 	int64 leastWaste = INT64_MAX;
 	for (int32 i = fDamageCount - 1; i >= 0; i--) {
-		if (Includes(fDamage[i], rect))
-			return;
 		const int64 waste = Area(Union(fDamage[i], rect)) - Area(fDamage[i]) - Area(rect);
 		if (waste < leastWaste) {
 			leastWaste = waste;
