@@ -3,6 +3,7 @@
 #include <poll.h>
 #include <unistd.h>
 
+#include <algorithm>
 #include <chrono>
 
 #include <gtest/gtest.h>
@@ -125,6 +126,24 @@ RealScreen::WaitForWindow(const std::string& title) const
 	});
 	EXPECT_TRUE(found) << title;
 	return window.substr(0, window.find('\n'));
+}
+
+
+bool
+RealScreen::WaitForCount(const std::string& title, int count) const
+{
+	return Poll([&] {
+		const std::string windows =
+			Run({ "xdotool", "search", "--onlyvisible", "--name", title }, Environment()).output;
+		return std::count(windows.begin(), windows.end(), '\n') == count;
+	});
+}
+
+
+bool
+RealScreen::WaitForChange(int x, int y, const std::string& before) const
+{
+	return Poll([&] { return PixelOfScreen(x, y) != before; });
 }
 
 

@@ -29,6 +29,13 @@ public:
 	// The window whose title matches the regular expression, as soon as it is shown.
 	std::string WaitForWindow(const std::string& title) const;
 
+	// Whether so many windows with a title that matches are shown in time.
+	bool WaitForCount(const std::string& title, int count) const;
+
+	// What the screen shows there, and whether it shows something else in time.
+	std::string PixelOfScreen(int x, int y) const { return _Pixel("root", x, y); }
+	bool WaitForChange(int x, int y, const std::string& before) const;
+
 	// Whether the pixel of the window's contents becomes that colour ("#rrggbb") in time.
 	bool WaitForPixel(const std::string& window, int x, int y, const std::string& color) const;
 
