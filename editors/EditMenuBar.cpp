@@ -290,6 +290,9 @@ EditMenuBar::_ApplyItemEdit(uint32 code)
 			selectedEntry->SetText(labelControl->Text());
 			itemList->InvalidateItem(itemList->IndexOf(selectedEntry));
 			item->SetLabel(labelControl->Text());
+			// A revived item takes its label from there.
+			if (item->Submenu() != NULL)
+				item->Submenu()->SetName(labelControl->Text());
 			break;
 		case kEnabledChanged:
 			item->SetEnabled(IsOn(enabledCheckBox));

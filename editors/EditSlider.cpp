@@ -27,7 +27,6 @@ constexpr uint32 kHashMarksChosen = 'hash';
 constexpr uint32 kThumbChosen = 'styl';
 constexpr uint32 kKeyIncrementChanged = 'kinc';
 constexpr uint32 kMarkCountChanged = 'mark';
-constexpr uint32 kDefaultPressed = 'dflt';
 
 constexpr float kPanelHeight = 232;
 constexpr float kGroupHeight = 70;
@@ -56,9 +55,7 @@ EditSlider::EditSlider() : EditorInterface("EditSlider", "Properties from BSlide
 
 	row.OffsetBy(0, kRowStep);
 	row.bottom = row.top + kGroupHeight;
-	const BarColorGroup group = AddBarColorGroup(this, row, BPoint(4, 12), kDefaultPressed);
-	barColorControl = group.control;
-	barColorSwatch = group.swatch;
+	fBarColor = AddBarColorGroup(this, row, BPoint(4, 12));
 }
 
 
@@ -75,7 +72,7 @@ EditSlider::UseView(BView* view)
 
 	const BSlider* slider = _Target();
 	snoozeControl->SetValue(slider->SnoozeAmount());
-	barColorControl->SetValue(slider->BarColor());
+	ShowBarColor(fBarColor, slider->BarColor());
 	minLabelControl->SetText(slider->MinLimitLabel());
 	maxLabelControl->SetText(slider->MaxLimitLabel());
 	int32 minimum, maximum;
@@ -101,15 +98,10 @@ EditSlider::ApplyEdit(BMessage* message)
 		case kKeyIncrementChanged:
 			_Target()->SetKeyIncrementValue(keyIncrementControl->Value());
 			break;
-		case kDefaultPressed:
-			barColorControl->SetValue(kDefaultColor);
-			_ApplyBarColor();
-			break;
 		case kLiveColorChanged:
-			_ApplyBarColor();
-			break;
 		case kColorComponentTyped:
-			barColorControl->SetValueFromComponents();
+		case kDefaultColorPressed:
+			_ApplyBarColor(message->what);
 			break;
 		case kMinLabelChanged:
 		case kMaxLabelChanged:
@@ -195,15 +187,12 @@ EditSlider::_ApplyMarks(uint32 code)
 }
 
 
-// Loading the control reports the colour that the slider has; that is not set again.
 void
-EditSlider::_ApplyBarColor()
+EditSlider::_ApplyBarColor(uint32 code)
 {
-	const rgb_color color = barColorControl->ValueAsColor();
-	ShowSwatch(barColorSwatch, color);
-	if (SameRGB(color, _Target()->BarColor()))
+	if (!TakeBarColor(fBarColor, code, kDefaultColor, _Target()->BarColor()))
 		return;
-	_Target()->SetBarColor(color);
+	_Target()->SetBarColor(fBarColor.control->ValueAsColor());
 	target->Invalidate();
 }
 

@@ -4,12 +4,12 @@
 #include <functional>
 
 #include "editors/EditorInterface.h"
+#include "editors/PanelRows.h"
 
 class BMenu;
 class BSlider;
 class BTextControl;
 class IntControl;
-class LiveColorControl;
 
 
 // What a slider cannot change once it is made is changed in its archive, and a new slider takes the
@@ -32,14 +32,13 @@ private:
 	void _AddMenuRow(BRect row);
 	void _AddMarksRow(BRect row);
 	bool _ApplyMarks(uint32 code);
-	void _ApplyBarColor();
+	void _ApplyBarColor(uint32 code);
 	void _ApplyLimitLabels();
 	void _ApplyLimits();
 	void _Rebuild(const std::function<void(BMessage& archive)>& change);
 
 	IntControl* snoozeControl;
-	LiveColorControl* barColorControl;
-	BBox* barColorSwatch;
+	BarColorGroup fBarColor;
 	BTextControl* minLabelControl;
 	IntControl* minValueControl;
 	BTextControl* maxLabelControl;

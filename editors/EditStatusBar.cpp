@@ -21,7 +21,6 @@ constexpr uint32 kTrailingTextChanged = 'ttxt';
 constexpr uint32 kValueChanged = 'valu';
 constexpr uint32 kMaxChanged = 'max ';
 constexpr uint32 kBarHeightChanged = 'barh';
-constexpr uint32 kDefaultPressed = 'dflt';
 
 constexpr float kPanelHeight = 177;
 constexpr float kGroupTop = 84; // below the first row's top
@@ -49,9 +48,7 @@ EditStatusBar::EditStatusBar() :
 	_AddNumberRow(row);
 
 	row.Set(area.left, area.top + kGroupTop, area.right, Bounds().bottom - area.left);
-	const BarColorGroup group = AddBarColorGroup(this, row, BPoint(12, 12), kDefaultPressed);
-	fColorControl = group.control;
-	fSwatch = group.swatch;
+	fBarColor = AddBarColorGroup(this, row, BPoint(12, 12));
 }
 
 
@@ -75,7 +72,7 @@ EditStatusBar::UseView(BView* view)
 	fValueControl->SetMax(bar->MaxValue());
 	fValueControl->SetFloatValue(bar->CurrentValue());
 	fBarHeightControl->SetFloatValue(bar->BarHeight());
-	fColorControl->SetValue(bar->BarColor());
+	ShowBarColor(fBarColor, bar->BarColor());
 	return true;
 }
 
@@ -100,15 +97,10 @@ EditStatusBar::ApplyEdit(BMessage* message)
 		case kBarHeightChanged:
 			_ApplyBarHeight();
 			break;
-		case kColorComponentTyped:
-			fColorControl->SetValueFromComponents();
-			break;
-		case kDefaultPressed:
-			fColorControl->SetValue(kDefaultColor);
-			_ApplyBarColor();
-			break;
 		case kLiveColorChanged:
-			_ApplyBarColor();
+		case kColorComponentTyped:
+		case kDefaultColorPressed:
+			_ApplyBarColor(message->what);
 			break;
 		default:
 			return false;
@@ -197,14 +189,11 @@ EditStatusBar::_ApplyBarHeight()
 }
 
 
-// Loading the control reports the colour that the bar has; that is not set again.
 void
-EditStatusBar::_ApplyBarColor()
+EditStatusBar::_ApplyBarColor(uint32 code)
 {
-	const rgb_color color = fColorControl->ValueAsColor();
-	ShowSwatch(fSwatch, color);
-	if (SameRGB(color, _Target()->BarColor()))
+	if (!TakeBarColor(fBarColor, code, kDefaultColor, _Target()->BarColor()))
 		return;
-	_Target()->SetBarColor(color);
+	_Target()->SetBarColor(fBarColor.control->ValueAsColor());
 	target->Invalidate();
 }

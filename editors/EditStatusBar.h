@@ -2,11 +2,11 @@
 #pragma once
 
 #include "editors/EditorInterface.h"
+#include "editors/PanelRows.h"
 
 class BStatusBar;
 class BTextControl;
 class FloatControl;
-class LiveColorControl;
 
 
 class EditStatusBar : public EditorInterface {
@@ -29,7 +29,7 @@ private:
 	void _ApplyValue();
 	void _ApplyMax();
 	void _ApplyBarHeight();
-	void _ApplyBarColor();
+	void _ApplyBarColor(uint32 code);
 
 	BTextControl* fLabelControl;
 	BTextControl* fTrailingLabelControl;
@@ -38,6 +38,5 @@ private:
 	FloatControl* fValueControl;
 	FloatControl* fMaxControl;
 	FloatControl* fBarHeightControl;
-	LiveColorControl* fColorControl;
-	BBox* fSwatch;
+	BarColorGroup fBarColor;
 };

@@ -25,6 +25,20 @@ namespace {
 constexpr uint32 kNoMessageCode = '----';
 
 
+// A box takes its parent's colour whenever it is attached, and a panel is attached often.
+class Swatch : public BBox {
+public:
+	using BBox::BBox;
+
+	void AttachedToWindow() override
+	{
+		const rgb_color color = ViewColor();
+		BBox::AttachedToWindow();
+		SetViewColor(color);
+	}
+};
+
+
 } // namespace
 
 
@@ -234,7 +248,7 @@ SameRGB(rgb_color a, rgb_color b)
 
 
 BarColorGroup
-AddBarColorGroup(BView* panel, BRect frame, BPoint origin, uint32 defaultCode)
+AddBarColorGroup(BView* panel, BRect frame, BPoint origin)
 {
 	BBox* group = new BBox(frame, NULL, B_FOLLOW_ALL_SIDES, kGroupFlags, B_PLAIN_BORDER);
 	group->SetFont(be_plain_font, B_FONT_ALL);
@@ -252,8 +266,30 @@ AddBarColorGroup(BView* panel, BRect frame, BPoint origin, uint32 defaultCode)
 
 	right.top = right.bottom + 4;
 	right.bottom = right.top + 2; // the button takes its own height
-	AddButton(group, right, "Use Default", defaultCode, B_FOLLOW_LEFT_RIGHT);
+	AddButton(group, right, "Use Default", kDefaultColorPressed, B_FOLLOW_LEFT_RIGHT);
 	return parts;
+}
+
+
+void
+ShowBarColor(const BarColorGroup& group, rgb_color color)
+{
+	group.control->SetValue(color);
+	ShowSwatch(group.swatch, color);
+}
+
+
+bool
+TakeBarColor(const BarColorGroup& group, uint32 code, rgb_color defaultColor, rgb_color present)
+{
+	if (code == kDefaultColorPressed)
+		group.control->SetValue(defaultColor);
+	else if (code == kColorComponentTyped)
+		group.control->SetValueFromComponents();
+
+	const rgb_color color = group.control->ValueAsColor();
+	ShowSwatch(group.swatch, color);
+	return !SameRGB(color, present);
 }
 
 
@@ -268,7 +304,7 @@ ShowSwatch(BBox* swatch, rgb_color color)
 BBox*
 AddSwatch(BView* panel, BRect frame)
 {
-	BBox* swatch = new BBox(frame, "", B_FOLLOW_LEFT_RIGHT, kGroupFlags, B_FANCY_BORDER);
+	BBox* swatch = new Swatch(frame, "", B_FOLLOW_LEFT_RIGHT, kGroupFlags, B_FANCY_BORDER);
 	panel->AddChild(swatch);
 	return swatch;
 }

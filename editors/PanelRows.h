@@ -73,12 +73,19 @@ void ShowMessageCode(BTextControl* control, const BMessage* message); // "----" 
 bool SameRGB(rgb_color a, rgb_color b);
 
 // The group with which a bar's colour is chosen: the control, a swatch that shows the colour, and a
-// button for the default.
+// button for the default. What they send is kLiveColorChanged, kColorComponentTyped and:
+constexpr uint32 kDefaultColorPressed = 'dflt';
 struct BarColorGroup {
 	LiveColorControl* control;
 	BBox* swatch;
 };
 // The origin is the colour control's, in the group.
-BarColorGroup AddBarColorGroup(BView* panel, BRect frame, BPoint origin, uint32 defaultCode);
+BarColorGroup AddBarColorGroup(BView* panel, BRect frame, BPoint origin);
+// Loads both parts. The control's message comes to nothing while the panel is not shown.
+void ShowBarColor(const BarColorGroup& group, rgb_color color);
+// Carries out one of the codes. Returns whether the control's colour is now another than the bar's:
+// loading the control reports the present colour too, which is not set again.
+bool TakeBarColor(
+	const BarColorGroup& group, uint32 code, rgb_color defaultColor, rgb_color present);
 void ShowSwatch(BBox* swatch, rgb_color color);
 BBox* AddSwatch(BView* panel, BRect frame);

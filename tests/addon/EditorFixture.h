@@ -94,9 +94,11 @@ protected:
 	template<class View> View* Find(const char* name) { return dynamic_cast<View*>(Find(name)); }
 	BView* Column() { return editor->ChildAt(0); }
 
-	// Clicks on a part of the view that no child covers.
+	// Clicks on a part of the view that no child covers. A selected view would be taken along.
 	void Select(BView* view)
 	{
+		if (view == workView->SelectedView())
+			return;
 		const BPoint place = BarePlace(view);
 		driver.Click(view, place);
 		ASSERT_EQ(view, workView->SelectedView());

@@ -109,14 +109,21 @@ ControlUser::Choose(BMenuField* field, const char* label)
 void
 ControlUser::ClickEntry(BOutlineListView* list, const char* text)
 {
+	fDriver.Click(PlaceOfEntry(list, text));
+}
+
+
+BPoint
+ControlUser::PlaceOfEntry(BOutlineListView* list, const char* text)
+{
+	constexpr float kBesideTheLatch = 100;
 	while (_Expand(list))
 		;
 	for (int32 i = 0; i < list->CountItems(); i++) {
 		if (std::string_view(static_cast<BStringItem*>(list->ItemAt(i))->Text()) != text)
 			continue;
 		_ScrollTo(list, i);
-		fDriver.Click(list, BPoint(100, MiddleOf(list->ItemFrame(i)).y));
-		return;
+		return Driver::PointIn(list, BPoint(kBesideTheLatch, MiddleOf(list->ItemFrame(i)).y));
 	}
 	Fail("no entry", text);
 }

@@ -33,6 +33,9 @@ public:
 	// Opens everything and clicks on the entry.
 	void ClickEntry(BOutlineListView* list, const char* text);
 
+	// The same without the click: where the entry is on the screen.
+	BPoint PlaceOfEntry(BOutlineListView* list, const char* text);
+
 	// The n-th control of a class with that label below a view, in the order of the children.
 	template<class Control> static Control* Find(BView* root, const std::string& label, int n = 0)
 	{
