@@ -30,60 +30,46 @@ constexpr rgb_color kBarFillColor = { 240, 240, 240, 255 };
 constexpr rgb_color kBarLightColor = { 255, 255, 255, 255 };
 
 
-struct ColorPair {
+struct SavedColors {
+	BView* owner; // borrowed
 	rgb_color view;
 	rgb_color low;
 };
 
 
-// The page of the selected tab is a child of the container only while the tab view is attached, so
-// it is saved in the container's place: where the restoring walk will meet it. A tab view that has
-// no selection takes its first tab when it is attached.
+// The pages of a tab view are in its tree only while they are shown, and which one is shown may
+// change when it is attached; so all of them are saved.
 void
-SaveColors(BView* view, std::vector<ColorPair>& colors)
+SaveColors(BView* view, std::vector<SavedColors>& colors)
 {
-	colors.push_back({ view->ViewColor(), view->LowColor() });
+	colors.push_back({ view, view->ViewColor(), view->LowColor() });
 
-	BTabView* tabView = dynamic_cast<BTabView*>(view);
-	BView* container = tabView != nullptr ? tabView->ContainerView() : nullptr;
-	for (BView* child = view->ChildAt(0); child != nullptr; child = child->NextSibling()) {
-		if (child != container) {
-			SaveColors(child, colors);
-			continue;
+	if (BTabView* tabView = dynamic_cast<BTabView*>(view)) {
+		for (int32 i = 0; i < tabView->CountTabs(); i++) {
+			BView* page = tabView->ViewForTab(i);
+			if (page != nullptr && page->Parent() == nullptr)
+				SaveColors(page, colors);
 		}
-		colors.push_back({ container->ViewColor(), container->LowColor() });
-		if (BView* page = tabView->ViewForTab(std::max<int32>(tabView->Selection(), 0)))
-			SaveColors(page, colors);
 	}
-}
-
-
-void
-RestoreColors(BView* view, const std::vector<ColorPair>& colors, size_t& next)
-{
-	if (next >= colors.size())
-		return;
-
-	view->SetViewColor(colors[next].view);
-	view->SetLowColor(colors[next].low);
-	next++;
 	for (BView* child = view->ChildAt(0); child != nullptr; child = child->NextSibling())
-		RestoreColors(child, colors, next);
+		SaveColors(child, colors);
 }
 
 
-template<class Parent>
+template<class Parent, class... Before>
 BView*
-AddKeepingColors(Parent* parent, BView* child)
+AddKeepingColors(Parent* parent, BView* child, Before*... before)
 {
 	if (child == nullptr)
 		return nullptr;
 
-	std::vector<ColorPair> colors;
+	std::vector<SavedColors> colors;
 	SaveColors(child, colors);
-	parent->AddChild(child);
-	size_t next = 0;
-	RestoreColors(child, colors, next);
+	parent->AddChild(child, before...);
+	for (const SavedColors& saved : colors) {
+		saved.owner->SetViewColor(saved.view);
+		saved.owner->SetLowColor(saved.low);
+	}
 	return child;
 }
 
@@ -168,9 +154,9 @@ DrawFlatScrollBar(BView* bar)
 
 
 BView*
-ColorfulAddChild(BView* parent, BView* child)
+ColorfulAddChild(BView* parent, BView* child, BView* before)
 {
-	return AddKeepingColors(parent, child);
+	return AddKeepingColors(parent, child, before);
 }
 
 
@@ -440,7 +426,10 @@ DrawView(BView* view)
 		return;
 	}
 
+	// As in an update, what a view sets for its drawing does not stay: it would be archived.
+	view->PushState();
 	view->Draw(view->Bounds());
+	view->PopState();
 	for (BView* child = view->ChildAt(0); child != nullptr; child = child->NextSibling()) {
 		DrawView(child);
 		child->Sync();

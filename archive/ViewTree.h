@@ -22,8 +22,9 @@ class BWindow;
 constexpr bool kFramesFollowScrolling = false;
 
 // Adds the child and keeps the view and low colours of its whole tree, which attaching would
-// change to the parent's. Returns the child; does nothing for NULL.
-BView* ColorfulAddChild(BView* parent, BView* child);
+// change to the parent's. Returns the child; does nothing for NULL. It goes before that sibling, or
+// to the end.
+BView* ColorfulAddChild(BView* parent, BView* child, BView* before = nullptr);
 BView* ColorfulAddChild(BWindow* window, BView* child);
 BView* ColorfulAddChild(BBitmap* bitmap, BView* child);
 

@@ -124,6 +124,7 @@ WorkView::MouseUp(BPoint where)
 void
 WorkView::SetEditView(BView* view)
 {
+	fTaken.reset();
 	if (fEditView != nullptr) {
 		fSelectedView.Set(nullptr);
 		fContainer->RemoveChild(fEditView);
@@ -306,6 +307,9 @@ WorkView::_BeginMove(BView* view, BPoint where, bool copy)
 {
 	BView* parent = view->Parent();
 	SetSelectedView(parent);
+	fTakenFrom.Set(parent);
+	fTakenBefore.Set(view->NextSibling());
+	fTakenAt = view->ConvertToScreen(where);
 	parent->RemoveChild(view);
 	const BPoint leftTop = view->Frame().LeftTop();
 	view->MoveTo(0, 0);
@@ -317,13 +321,15 @@ WorkView::_BeginMove(BView* view, BPoint where, bool copy)
 	MakeDragMessage(view, &drag);
 	DragMessage(&drag, image, B_OP_ALPHA, where, this);
 
+	fTaken.reset();
+	fTakenLeftTop = leftTop;
 	if (copy) {
 		if (kFramesFollowScrolling)
 			MoveScrolledViews(view, true);
 		view->MoveTo(leftTop);
 		ColorfulAddChild(parent, view);
 	} else
-		delete view;
+		fTaken.reset(view);
 }
 
 

@@ -1,6 +1,7 @@
 // WorkView: the design surface, where the edited views are shown, selected, moved and resized.
 #pragma once
 
+#include <memory>
 #include <vector>
 
 #include <ScrollView.h>
@@ -68,6 +69,7 @@ private:
 	bool _MayMove(const BView* view) const;
 	void _BeginResize(BPoint where);
 	void _BeginMove(BView* view, BPoint where, bool copy);
+	bool _PutBack(BMessage* drop);
 	void _AddDropped(BMessage* message, BView* target, BView* view);
 	void _ReplaceTree(BView* view);
 	void _DeleteSelection();
@@ -86,4 +88,12 @@ private:
 	HiliteView* fHiliteView; // child of the scroll target
 	ViewWatch fSelectedView;
 	int32 fFieldsLeft; // whose text may still be on its way to the panels
+
+	// What our last drag took away, for the case that it is dropped where it was: two clicks must
+	// not change even what an archive does not hold. NULL when the drag copied.
+	std::unique_ptr<BView> fTaken;
+	ViewWatch fTakenFrom; // its parent
+	ViewWatch fTakenBefore; // its next sibling, if any
+	BPoint fTakenLeftTop;
+	BPoint fTakenAt; // where the drag began, on the screen
 };

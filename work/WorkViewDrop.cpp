@@ -1,5 +1,6 @@
 // WorkView: what is dropped on it, and what becomes of its own drags.
 
+#include <cmath>
 #include <memory>
 
 #include <Alert.h>
@@ -44,6 +45,17 @@ MakeBitmapView(BBitmap* bitmap, const char* name)
 }
 
 
+// What tells how the view has come is not to be archived with the view from now on.
+void
+ForgetDrop(BMessage* archive)
+{
+	if (archive->what == kDroppedView || archive->what == kDroppedProperty)
+		archive->what = 0;
+	for (const char* field : { "_drop_point_", "_drop_offset_", "buttons" })
+		archive->RemoveName(field);
+}
+
+
 // A picture, or a file that a view was dragged into. NULL when it is neither.
 BArchivable*
 ObjectFromFile(const entry_ref& ref)
@@ -64,6 +76,7 @@ ObjectFromFile(const entry_ref& ref)
 	BMessage archive;
 	if (archive.Unflatten(&bytes) != B_OK)
 		return NULL;
+	ForgetDrop(&archive);
 	return instantiate_object(&archive);
 }
 
@@ -71,15 +84,28 @@ ObjectFromFile(const entry_ref& ref)
 BArchivable*
 ObjectFromDrop(BMessage* message)
 {
-	if (message->what != B_SIMPLE_DATA)
-		return instantiate_object(message);
+	if (message->what != B_SIMPLE_DATA) {
+		BMessage archive(*message);
+		ForgetDrop(&archive);
+		return instantiate_object(&archive);
+	}
 
 	BMessage archive;
-	if (message->FindMessage(kDroppedViewField, &archive) == B_OK)
+	if (message->FindMessage(kDroppedViewField, &archive) == B_OK) {
+		ForgetDrop(&archive);
 		return InstantiateAsChild(&archive); // a view that was dragged out of a design is not lost
+	}
 
 	entry_ref ref;
 	return message->FindRef("refs", &ref) == B_OK ? ObjectFromFile(ref) : NULL;
+}
+
+
+// Points are converted back and forth, so the last bits may differ.
+bool
+IsSamePixel(BPoint a, BPoint b)
+{
+	return std::fabs(a.x - b.x) < 0.5f && std::fabs(a.y - b.y) < 0.5f;
 }
 
 
@@ -119,6 +145,8 @@ void
 WorkView::HandleFilteredDrop(BMessage* message, BView* target)
 {
 	DumpMessage(message, 0);
+	if (_PutBack(message))
+		return;
 
 	BArchivable* object = ObjectFromDrop(message);
 	BView* view = dynamic_cast<BView*>(object);
@@ -132,6 +160,31 @@ WorkView::HandleFilteredDrop(BMessage* message, BView* target)
 		_ReplaceTree(view);
 	else
 		_AddDropped(message, target, view);
+}
+
+
+// A view that is dropped where its drag began goes back to its place, whatever else lies there.
+// Returns whether it is such a drop.
+bool
+WorkView::_PutBack(BMessage* drop)
+{
+	BPoint where;
+	if (fTaken == nullptr || drop->ReturnAddress() != BMessenger(this)
+		|| drop->FindPoint("_drop_point_", &where) != B_OK)
+		return false;
+
+	std::unique_ptr<BView> taken = std::move(fTaken);
+	BView* parent = fTakenFrom.View();
+	if (!IsSamePixel(where, fTakenAt) || LiveViewAttached(fEditView, parent) == nullptr)
+		return false;
+
+	BView* before = fTakenBefore.View();
+	if (before != nullptr && before->Parent() != parent)
+		before = nullptr;
+	taken->MoveTo(fTakenLeftTop);
+	SetSelectedView(ColorfulAddChild(parent, taken.release(), before));
+	Window()->Activate();
+	return true;
 }
 
 

@@ -98,22 +98,22 @@ BColorControl::BColorControl(BPoint leftTop, color_control_layout layout, float 
 	const char* name, BMessage* message, bool useOffscreen) :
 	BControl(BRect(leftTop, leftTop), name, NULL, message, B_FOLLOW_LEFT | B_FOLLOW_TOP,
 		B_WILL_DRAW | B_NAVIGABLE),
-	fFields {}, fLayout(CheckedLayout(layout)), fCellSize(std::max(cellSize, kMinimumCellSize)),
+	fLayout(CheckedLayout(layout)), fCellSize(std::max(cellSize, kMinimumCellSize)),
 	fUseOffscreen(useOffscreen), fTrackedRamp(-1), fFocusedRamp(kGreyRamp)
 {
-	_FindFields();
+	_CreateFields();
 	ResizeToPreferred();
 }
 
 
 BColorControl::BColorControl(BMessage* archive) :
-	BControl(archive), fFields {}, fLayout(ReadLayout(archive)), fCellSize(ReadCellSize(archive)),
+	BControl(archive), fLayout(ReadLayout(archive)), fCellSize(ReadCellSize(archive)),
 	fUseOffscreen(false), fTrackedRamp(-1), fFocusedRamp(kGreyRamp)
 {
 	bool useOffscreen;
 	if (archive->FindBool("_use_off", &useOffscreen) == B_OK)
 		fUseOffscreen = useOffscreen;
-	_FindFields();
+	_CreateFields();
 }
 
 
@@ -149,30 +149,35 @@ BColorControl::Archive(BMessage* archive, bool deep) const
 // #pragma mark - text fields
 
 
-// Takes the fields of an archive and makes those that it does not have.
+// Those that an archive does not have.
 void
-BColorControl::_FindFields()
+BColorControl::_CreateFields()
 {
-	for (BView* child = ChildAt(0); child != NULL; child = child->NextSibling()) {
-		BTextControl* field = dynamic_cast<BTextControl*>(child);
-		for (int32 i = 0; field != NULL && field->Name() != NULL && i < 3; i++) {
-			if (fFields[i] == NULL && strcmp(field->Name(), kFieldNames[i]) == 0)
-				fFields[i] = field;
-		}
-	}
-
 	bool created = false;
 	for (int32 i = 0; i < 3; i++) {
-		if (fFields[i] != NULL)
+		if (_Field(i) != NULL)
 			continue;
-		fFields[i] = _CreateField(i);
-		AddChild(fFields[i]);
+		AddChild(_CreateField(i));
 		created = true;
 	}
 	if (created) {
 		_PlaceFields();
 		_WriteFields();
 	}
+}
+
+
+// A field is a view like others: it may be taken out, and another one put in its place.
+BTextControl*
+BColorControl::_Field(int32 component) const
+{
+	for (BView* child = ChildAt(0); child != NULL; child = child->NextSibling()) {
+		BTextControl* field = dynamic_cast<BTextControl*>(child);
+		if (field != NULL && field->Name() != NULL
+			&& strcmp(field->Name(), kFieldNames[component]) == 0)
+			return field;
+	}
+	return NULL;
 }
 
 
@@ -214,9 +219,11 @@ BColorControl::_PlaceFields()
 		step = ramp;
 		top = std::floor(_RampFrame(1).top + (ramp - kFieldHeight) / 2);
 	}
-	for (BTextControl* field : fFields) {
-		field->MoveTo(left, top);
-		field->ResizeTo(field->Bounds().Width(), kFieldHeight);
+	for (int32 i = 0; i < 3; i++) {
+		if (BTextControl* field = _Field(i)) {
+			field->MoveTo(left, top);
+			field->ResizeTo(field->Bounds().Width(), kFieldHeight);
+		}
 		top += step;
 	}
 }
@@ -227,8 +234,9 @@ BColorControl::_WriteFields()
 {
 	for (int32 i = 0; i < 3; i++) {
 		const std::string amount = std::to_string(ComponentOf(Value(), i));
-		if (fFields[i]->Text() != amount)
-			fFields[i]->SetText(amount.c_str());
+		BTextControl* field = _Field(i);
+		if (field != NULL && field->Text() != amount)
+			field->SetText(amount.c_str());
 	}
 }
 
@@ -237,9 +245,11 @@ BColorControl::_WriteFields()
 void
 BColorControl::_TakeFields()
 {
-	int32 value = 0;
-	for (int32 i = 0; i < 3; i++)
-		value = WithComponent(value, i, std::clamp(atoi(fFields[i]->Text()), 0, 255));
+	int32 value = Value();
+	for (int32 i = 0; i < 3; i++) {
+		if (const BTextControl* field = _Field(i))
+			value = WithComponent(value, i, std::clamp(atoi(field->Text()), 0, 255));
+	}
 	SetValue(value);
 	// A number above 255 leaves the colour at 255 but must not stay to be seen.
 	_WriteFields();
@@ -285,8 +295,10 @@ void
 BColorControl::SetEnabled(bool enabled)
 {
 	BControl::SetEnabled(enabled);
-	for (BTextControl* field : fFields)
-		field->SetEnabled(enabled);
+	for (int32 i = 0; i < 3; i++) {
+		if (BTextControl* field = _Field(i))
+			field->SetEnabled(enabled);
+	}
 }
 
 
@@ -396,9 +408,13 @@ BColorControl::GetPreferredSize(float* _width, float* _height)
 {
 	const BRect palette = _PaletteFrame();
 	if (_width != NULL)
-		*_width = palette.right + kBevel + kFieldGap + fFields[0]->Bounds().Width();
+		*_width = palette.right + kBevel;
 	if (_height != NULL)
-		*_height = std::max(palette.bottom + kBevel, fFields[2]->Frame().bottom);
+		*_height = palette.bottom + kBevel;
+	if (const BTextControl* field = _Field(0); field != NULL && _width != NULL)
+		*_width += kFieldGap + field->Bounds().Width();
+	if (const BTextControl* field = _Field(2); field != NULL && _height != NULL)
+		*_height = std::max(*_height, field->Frame().bottom);
 }
 
 
@@ -594,8 +610,10 @@ void
 BColorControl::AttachedToWindow()
 {
 	BControl::AttachedToWindow();
-	for (BTextControl* field : fFields)
-		field->SetTarget(this);
+	for (int32 i = 0; i < 3; i++) {
+		if (BTextControl* field = _Field(i))
+			field->SetTarget(this);
+	}
 }
 
 

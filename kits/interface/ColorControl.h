@@ -68,7 +68,8 @@ private:
 	BColorControl(const BColorControl&) = delete;
 	BColorControl& operator=(const BColorControl&) = delete;
 
-	void _FindFields();
+	void _CreateFields();
+	BTextControl* _Field(int32 component) const; // NULL when it has been taken out
 	BTextControl* _CreateField(int32 component);
 	void _PlaceFields();
 	void _WriteFields();
@@ -83,7 +84,6 @@ private:
 	void _ChangeRamp(int32 ramp, int32 value);
 	void _DrawRamp(int32 ramp, BRect updateRect);
 
-	BTextControl* fFields[3]; // children: red, green, blue
 	color_control_layout fLayout;
 	float fCellSize;
 	bool fUseOffscreen;

@@ -64,12 +64,8 @@ BMenuField::BMenuField(BMessage* archive) : BView(archive)
 	if (archive->FindBool("be:dmark", &flag) == B_OK)
 		fPopUpMarker = flag;
 
-	BView* bar = FindView(kBarName);
-	if (bar == NULL) {
+	if (FindView(kBarName) == NULL)
 		_CreateBar(new BMenu(""));
-	} else if ((fMenuBar = dynamic_cast<BMenuBar*>(bar)) != NULL) {
-		fMenu = fMenuBar->SubmenuAt(0);
-	}
 }
 
 
@@ -83,8 +79,6 @@ void
 BMenuField::_Init()
 {
 	fLabel = NULL;
-	fMenu = NULL;
-	fMenuBar = NULL;
 	fAlignment = B_ALIGN_LEFT;
 	fDivider = 0;
 	fEnabled = true;
@@ -121,9 +115,7 @@ BMenuField::Archive(BMessage* archive, bool deep) const
 void
 BMenuField::_CreateBar(BMenu* menu)
 {
-	fMenu = menu;
 	_BMCMenuBar_* bar = new _BMCMenuBar_(_BarFrame(), fFixedSize);
-	fMenuBar = bar;
 	AddChild(bar);
 	if (menu != NULL)
 		bar->AddItem(menu);
@@ -148,17 +140,18 @@ BMenuField::_BarFrame() const
 void
 BMenuField::_FitBar()
 {
-	if (fMenuBar == NULL)
+	BMenuBar* bar = MenuBar();
+	if (bar == NULL)
 		return;
 	const BRect room = _BarFrame();
 	float width, height;
-	fMenuBar->GetPreferredSize(&width, &height);
+	bar->GetPreferredSize(&width, &height);
 	if (fFixedSize)
 		width = room.Width();
 	else
 		width = std::min(width, room.Width());
-	fMenuBar->MoveTo(room.LeftTop());
-	fMenuBar->ResizeTo(width, height);
+	bar->MoveTo(room.LeftTop());
+	bar->ResizeTo(width, height);
 }
 
 
@@ -178,12 +171,13 @@ void
 BMenuField::AllAttached()
 {
 	BView::AllAttached();
-	if (is_revived(this) || fMenuBar == NULL)
+	BMenuBar* bar = MenuBar();
+	if (is_revived(this) || bar == NULL)
 		return;
 	_FitBar();
-	ResizeTo(Bounds().Width(), fMenuBar->Bounds().Height() + 2 * kMargin);
+	ResizeTo(Bounds().Width(), bar->Bounds().Height() + 2 * kMargin);
 	if (fFixedSize)
-		fMenuBar->SetResizingMode(B_FOLLOW_LEFT_RIGHT | B_FOLLOW_TOP);
+		bar->SetResizingMode(B_FOLLOW_LEFT_RIGHT | B_FOLLOW_TOP);
 }
 
 
@@ -241,8 +235,8 @@ BMenuField::GetPreferredSize(float* _width, float* _height)
 {
 	float width = 0;
 	float height = 0;
-	if (fMenuBar != NULL)
-		fMenuBar->GetPreferredSize(&width, &height);
+	if (BMenuBar* bar = MenuBar())
+		bar->GetPreferredSize(&width, &height);
 	font_height label;
 	GetFontHeight(&label);
 	if (_width != NULL) {
@@ -262,17 +256,18 @@ BMenuField::GetPreferredSize(float* _width, float* _height)
 void
 BMenuField::Draw(BRect)
 {
+	const BMenuBar* menuBar = MenuBar();
 	if (fLabel == NULL) {
-		if (fMenuBar != NULL && IsFocus() && Window()->IsActive()) {
+		if (menuBar != NULL && IsFocus() && Window()->IsActive()) {
 			SetHighColor(Look::NavigationColor());
-			StrokeRect(fMenuBar->Frame().InsetByCopy(-1, -1));
+			StrokeRect(menuBar->Frame().InsetByCopy(-1, -1));
 		}
 		return;
 	}
 	font_height height;
 	GetFontHeight(&height);
 	// On the baseline of what the bar shows.
-	const BRect bar = fMenuBar != NULL ? fMenuBar->Frame() : Bounds();
+	const BRect bar = menuBar != NULL ? menuBar->Frame() : Bounds();
 	const float text = std::ceil(height.ascent) + std::ceil(height.descent);
 	const float baseline =
 		bar.top + std::floor((bar.Height() + 1 - text) / 2) + std::ceil(height.ascent);
@@ -316,13 +311,14 @@ BMenuField::KeyDown(const char* bytes, int32 numBytes)
 void
 BMenuField::_OpenMenu(bool byKey)
 {
-	if (fMenuBar == NULL || !IsEnabled())
+	BMenuBar* bar = MenuBar();
+	if (bar == NULL || !IsEnabled())
 		return;
-	BMenuItem* item = fMenuBar->ItemAt(0);
+	BMenuItem* item = bar->ItemAt(0);
 	if (item == NULL)
 		return;
 	MenuTracker::Request request;
-	request.bar = fMenuBar;
+	request.bar = bar;
 	request.barItem = item;
 	request.sticky = byKey;
 	request.staysOnClick = true;
@@ -392,21 +388,29 @@ BMenuField::AllDetached()
 BMenu*
 BMenuField::Menu() const
 {
-	return fMenu;
+	const BMenuBar* bar = MenuBar();
+	return bar != NULL ? bar->SubmenuAt(0) : NULL;
 }
 
 
 BMenuBar*
 BMenuField::MenuBar() const
 {
-	return fMenuBar;
+	// The bar is a view like others: it may be taken out, and another one put in its place.
+	for (BView* child = ChildAt(0); child != NULL; child = child->NextSibling()) {
+		BMenuBar* bar = dynamic_cast<BMenuBar*>(child);
+		if (bar != NULL && bar->Name() != NULL && strcmp(bar->Name(), kBarName) == 0)
+			return bar;
+	}
+	return NULL;
 }
 
 
 BMenuItem*
 BMenuField::MenuItem() const
 {
-	return fMenuBar != NULL ? fMenuBar->ItemAt(0) : NULL;
+	const BMenuBar* bar = MenuBar();
+	return bar != NULL ? bar->ItemAt(0) : NULL;
 }
 
 
@@ -435,9 +439,9 @@ BMenuField::SetEnabled(bool enabled)
 	if (fEnabled == enabled)
 		return;
 	fEnabled = enabled;
-	if (fMenuBar != NULL) {
-		fMenuBar->SetEnabled(enabled);
-		fMenuBar->Invalidate();
+	if (BMenuBar* bar = MenuBar()) {
+		bar->SetEnabled(enabled);
+		bar->Invalidate();
 	}
 	Invalidate();
 }
@@ -468,8 +472,8 @@ void
 BMenuField::ShowPopUpMarker()
 {
 	fPopUpMarker = true;
-	if (fMenuBar != NULL)
-		fMenuBar->Invalidate();
+	if (BMenuBar* bar = MenuBar())
+		bar->Invalidate();
 }
 
 
@@ -477,8 +481,8 @@ void
 BMenuField::HidePopUpMarker()
 {
 	fPopUpMarker = false;
-	if (fMenuBar != NULL)
-		fMenuBar->Invalidate();
+	if (BMenuBar* bar = MenuBar())
+		bar->Invalidate();
 }
 
 

@@ -76,8 +76,6 @@ private:
 	float _LabelWidth() const;
 
 	char* fLabel; // owned
-	BMenu* fMenu; // owned by the bar's item; NULL if an archive has none
-	BMenuBar* fMenuBar; // child
 	alignment fAlignment;
 	float fDivider;
 	bool fEnabled;

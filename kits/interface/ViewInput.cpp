@@ -240,6 +240,7 @@ BView::_StartDrag(BMessage* message, BBitmap* bitmap, drawing_mode mode, BRect r
 		image.width = static_cast<int32>(std::ceil(rect.Width())) + 1;
 		image.height = static_cast<int32>(std::ceil(rect.Height())) + 1;
 	}
+	internals.AwaitDrag();
 	desktop->StartDrag(*internals.server, std::move(dragged), image);
 	return true;
 }

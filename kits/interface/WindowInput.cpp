@@ -51,6 +51,22 @@ pointer_options(const BView* view)
 
 
 bool
+is_key(uint32 what)
+{
+	return what == B_KEY_DOWN || what == B_KEY_UP || what == B_UNMAPPED_KEY_DOWN
+		|| what == B_UNMAPPED_KEY_UP || what == B_MODIFIERS_CHANGED;
+}
+
+
+bool
+is_pointer_input(uint32 what)
+{
+	return what == B_MOUSE_DOWN || what == B_MOUSE_UP || what == B_MOUSE_MOVED
+		|| what == B_MOUSE_WHEEL_CHANGED;
+}
+
+
+bool
 has_mask(const BView* view, uint32 bit)
 {
 	const ViewExtras* extras = ViewPrivate(view).Extras();
@@ -75,7 +91,14 @@ WindowInternals::Route(BMessage* message, BHandler* target)
 		_Deliver(message, target);
 		return;
 	}
+	if (_KeepBack(message))
+		return;
 	switch (message->what) {
+		case kDragDecided:
+			delete message;
+			_DragDecided();
+			break;
+
 		case B_MOUSE_DOWN:
 		case B_MOUSE_UP:
 			_RoutePress(message);
@@ -112,6 +135,43 @@ void
 WindowInternals::_Deliver(BMessage* message, BHandler* target)
 {
 	LooperPrivate(&window).Deliver(message, target);
+}
+
+
+// #pragma mark - input behind a drag
+
+
+void
+WindowInternals::AwaitDrag()
+{
+	awaitedDrags++;
+}
+
+
+// The rest of the present press passes. Takes the message if it is kept.
+bool
+WindowInternals::_KeepBack(BMessage* message)
+{
+	if (awaitedDrags == 0)
+		return false;
+	const uint32 what = message->what;
+	const bool begins = what == B_MOUSE_DOWN || is_key(what);
+	if (!begins && (keptInput.empty() || !is_pointer_input(what)))
+		return false;
+	keptInput.emplace_back(message);
+	return true;
+}
+
+
+void
+WindowInternals::_DragDecided()
+{
+	awaitedDrags--;
+	while (awaitedDrags == 0 && !keptInput.empty()) {
+		BMessage* message = keptInput.front().release();
+		keptInput.pop_front();
+		Route(message, &window);
+	}
 }
 
 

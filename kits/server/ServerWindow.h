@@ -24,6 +24,10 @@ constexpr uint32 kMenuWindowFeel = 1025;
 // another or outside; such a message concerns views with an event mask, and a view to be left.
 constexpr const char* kPointerElsewhere = "be:elsewhere";
 
+// The answer to Desktop::StartDrag(): the drag has begun, or is over because the button had been
+// released before; then its drop came first.
+constexpr uint32 kDragDecided = '_DDC';
+
 
 // Receives the events of one window, on the display thread.
 class WindowClient {

@@ -92,6 +92,20 @@ Driver::_Wait() const
 }
 
 
+void
+Driver::SetSpacing(bigtime_t spacing)
+{
+	fInput->SetSpacing(spacing);
+}
+
+
+bigtime_t
+Driver::DoubleClickTime()
+{
+	return Desktop::Get()->DoubleClickTime();
+}
+
+
 // #pragma mark - mouse
 
 

@@ -6,6 +6,7 @@
 #include <string_view>
 
 #include <GraphicsDefs.h>
+#include <OS.h>
 #include <Point.h>
 #include <Rect.h>
 #include <SupportDefs.h>
@@ -51,6 +52,11 @@ public:
 	void Key(const char* name, uint32 modifiers = 0, int32 times = 1);
 	void KeyDown(const char* name, uint32 modifiers = 0);
 	void KeyUp(const char* name, uint32 modifiers = 0);
+
+	// The times that the events carry: each that much later than the one before, in microseconds,
+	// whatever the clock says; 0 for the time when they are entered.
+	void SetSpacing(bigtime_t spacing);
+	static bigtime_t DoubleClickTime();
 
 	// As by the window's frame, from the desktop.
 	void ResizeWindow(BWindow* window, float width, float height); // right - left, bottom - top

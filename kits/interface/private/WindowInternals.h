@@ -1,6 +1,7 @@
 // WindowInternals: a window's views, its input and its updates.
 #pragma once
 
+#include <deque>
 #include <memory>
 #include <string>
 #include <vector>
@@ -69,6 +70,9 @@ public:
 	// hook; false when none waits. Then GetPointer() tells the present state.
 	bool TakePointer(BPoint* _screen, uint32* _buttons);
 	void GetPointer(BPoint* _screen, uint32* _buttons) const;
+	// A drag was asked for: until the desktop has answered, later presses and keys are kept back.
+	// If the button is up already, the drop comes before them, as it would have in time.
+	void AwaitDrag();
 	void SetFocus(BView* view);
 	void Navigate(const BView* from, bool backwards, bool byGroups);
 	// Whether the key belongs to the window: a shortcut, or a key with Command held.
@@ -121,6 +125,9 @@ public:
 	BView* leftView = nullptr;
 	BView* enteredView = nullptr;
 
+	int32 awaitedDrags = 0;
+	std::deque<std::unique_ptr<BMessage>> keptInput; // from the first press or key on
+
 	std::vector<Shortcut> shortcuts;
 	std::unique_ptr<BMessageRunner> pulseRunner;
 	bigtime_t pulseRate = 500000;
@@ -129,6 +136,8 @@ public:
 	std::unique_ptr<ArchiveSource> source;
 
 private:
+	bool _KeepBack(BMessage* message);
+	void _DragDecided();
 	void _RoutePress(BMessage* message);
 	void _RouteMove(BMessage* message);
 	void _RouteWheel(BMessage* message);

@@ -4,12 +4,22 @@
 
 #include "server/DesktopThread.h"
 #include "server/DragOffer.h"
+#include "server/ServerWindow.h"
 
 namespace BPrivate {
 
 
 void
 PointerInput::StartDrag(const WindowReference& source, int32 serial, const DragReference& session)
+{
+	_StartDrag(serial, session);
+	if (source != nullptr)
+		source->Deliver(std::make_unique<BMessage>(kDragDecided));
+}
+
+
+void
+PointerInput::_StartDrag(int32 serial, const DragReference& session)
 {
 	const PressRecord* press = fHistory.Find(serial);
 	if (press == nullptr || fSession != nullptr)

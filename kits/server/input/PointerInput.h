@@ -63,6 +63,7 @@ private:
 	void _DeliverRelease(const BackendEvent& event, const WindowReference& under);
 	void _SetState(const BackendEvent& event);
 
+	void _StartDrag(int32 press, const DragReference& session);
 	void _BeginSession(const DragReference& session);
 	void _Replay(const PressRecord& press, const DragSession& session);
 	void _Drop(const DragSession& session, const BackendEvent& event, const WindowReference& under);

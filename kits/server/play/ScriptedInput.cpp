@@ -18,7 +18,10 @@ constexpr bigtime_t kBetweenEvents = 1000;
 BackendEvent
 ScriptedInput::_Event(BackendEvent::Type type)
 {
-	fTime = std::max(system_time(), fTime + kBetweenEvents);
+	if (fSpacing > 0)
+		fTime += fSpacing;
+	else
+		fTime = std::max(system_time(), fTime + kBetweenEvents);
 
 	BackendEvent event;
 	event.type = type;

@@ -21,6 +21,9 @@ public:
 
 	// Modifiers as the platform's bits; they are held until another call says otherwise.
 	void SetModifiers(uint32 modifiers);
+	// Whatever the clock says, the next events follow each other at exactly that distance in
+	// microseconds; 0 lets them have the time when they are entered.
+	void SetSpacing(bigtime_t spacing) { fSpacing = spacing; }
 	void BeginGesture();
 	void Move(BPoint screen);
 	void Leave(); // off all windows, with the button as it is
@@ -43,6 +46,7 @@ private:
 	uint32 fButtons = 0;
 	uint32 fModifiers = 0;
 	bigtime_t fTime = 0;
+	bigtime_t fSpacing = 0;
 };
 
 

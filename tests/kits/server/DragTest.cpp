@@ -13,6 +13,7 @@
 
 #include "app/private/Delivery.h"
 #include "kernel/private/Activity.h"
+#include "server/ServerWindow.h"
 
 namespace BPrivate {
 
@@ -183,10 +184,11 @@ TEST_F(Drag, DragOfAFinishedPressDropsWhereItWasReleased)
 	StartDrag();
 
 	const Messages replayed = source->Take();
-	ASSERT_EQ(2u, replayed.size());
+	ASSERT_EQ(3u, replayed.size());
 	ExpectDragIn(*replayed[0]);
 	EXPECT_EQ(BPoint(70, 50), replayed[0]->FindPoint("where"));
 	EXPECT_TRUE(IsElsewhere(*replayed[1]));
+	EXPECT_EQ(kDragDecided, replayed[2]->what);
 	const Messages messages = target->Take();
 	ASSERT_EQ(2u, messages.size());
 	ExpectDragIn(*messages[0]);
