@@ -221,6 +221,7 @@ ViewTree::ViewAt(BPoint point) const
 		const ServerView* hit = nullptr;
 		for (const ServerView* child = view->FirstChild(); child != nullptr;
 			 child = child->Next()) {
+			fCountHitTested++;
 			if (child->HideCount() <= 0 && child->Frame().Contains(where)) {
 				hit = child;
 				break;

@@ -74,6 +74,8 @@ public:
 	void Update();
 	// Counts for tests and benchmarks.
 	int64 CountDrawn() const { return fCountDrawn; }
+	int64 CountClippings() const { return fCountClippings; } // made for a view that draws
+	int64 CountHitTested() const { return fCountHitTested; } // views asked for a point
 
 	// Makes the view the one that the painter draws for; NULL when nothing of it can be painted.
 	// The constraint is in its own coordinates and asked for only when clipping is made anew.
@@ -148,6 +150,8 @@ private:
 	const RegionIndex* fUpdateRegion = nullptr; // during an update
 	uint32 fAttachVersion = 0;
 	int64 fCountDrawn = 0;
+	int64 fCountClippings = 0;
+	mutable int64 fCountHitTested = 0;
 };
 
 

@@ -155,6 +155,7 @@ ViewTree::_PaintBackground(const ServerView& view, const Step& step, const BRegi
 void
 ViewTree::_SetCurrent(const ServerView& view, const BRegion* constraint)
 {
+	fCountClippings++;
 	fCurrent = { &view, false, BRegion() };
 	if (fPainter == nullptr)
 		return;
