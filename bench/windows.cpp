@@ -6,7 +6,6 @@
 #include <unistd.h>
 
 #include <atomic>
-#include <thread>
 #include <vector>
 
 #include <QApplication>
@@ -91,6 +90,7 @@ public:
 			UpdateIfNeeded();
 		}
 		done++;
+		done.notify_all();
 	}
 
 	void Work(int32 times)
@@ -108,8 +108,8 @@ public:
 void
 WaitFor(BusyWindow* window, int done)
 {
-	while (window->done < done)
-		std::this_thread::yield();
+	for (int now = window->done; now < done; now = window->done)
+		window->done.wait(now);
 }
 
 

@@ -62,15 +62,31 @@ FillBits(uint32* row, const uint8* bits, int32 count, const Ink& ink)
 }
 
 
+// Behind the uncovered pixel at `i` and those that follow it, as far as eight at a time tell.
+inline int32
+SkipUncovered(const uint8* coverage, int32 i, int32 count)
+{
+	i++;
+	uint64 eight;
+	while (i + 8 <= count && (memcpy(&eight, coverage + i, 8), eight) == 0)
+		i += 8;
+	return i;
+}
+
+
 template<drawing_mode kMode>
 void
 MaskRow(uint32* row, const uint8* coverage, int32 count, bool bit, const Ink& ink)
 {
 	if (!bit && LeavesClearBits(kMode))
 		return;
-	for (int32 i = 0; i < count; i++) {
-		if (coverage[i] != 0)
-			row[i] = Cover(row[i], BlendBit<kMode>(row[i], bit, ink), coverage[i], ink);
+	for (int32 i = 0; i < count;) {
+		if (coverage[i] == 0) {
+			i = SkipUncovered(coverage, i, count);
+			continue;
+		}
+		row[i] = Cover(row[i], BlendBit<kMode>(row[i], bit, ink), coverage[i], ink);
+		i++;
 	}
 }
 
