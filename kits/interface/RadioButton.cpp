@@ -1,25 +1,12 @@
 #include <RadioButton.h>
 
-#include <cmath>
-
 #include <Box.h>
 #include <Message.h>
 #include <Window.h>
 
-#include "interface/private/Label.h"
 #include "interface/private/Look.h"
-#include "interface/private/ViewArchive.h"
-
-namespace Look = BPrivate::Look;
-
-using BPrivate::LabelMetrics;
 
 namespace {
-
-const BPoint kBoxPlace(1, 3);
-constexpr float kLabelLeft = 20;
-constexpr float kHorizontalPadding = 22;
-constexpr float kVerticalPadding = 6;
 
 bool
 IsLabelOfBox(const BView* view)
@@ -55,13 +42,12 @@ AsGroupMember(BView* view)
 
 BRadioButton::BRadioButton(BRect frame, const char* name, const char* label, BMessage* message,
 	uint32 resizingMode, uint32 flags) :
-	BControl(frame, name, label, message, resizingMode, flags),
-	fPressed(false)
+	_BMarkedControl_(frame, name, label, message, resizingMode, flags)
 {
 }
 
 
-BRadioButton::BRadioButton(BMessage* archive) : BControl(archive), fPressed(false)
+BRadioButton::BRadioButton(BMessage* archive) : _BMarkedControl_(archive)
 {
 }
 
@@ -76,168 +62,6 @@ BRadioButton::Instantiate(BMessage* archive)
 {
 	return validate_instantiation(archive, "BRadioButton") ? new BRadioButton(archive) : NULL;
 }
-
-
-status_t
-BRadioButton::Archive(BMessage* archive, bool deep) const
-{
-	return BControl::Archive(archive, deep);
-}
-
-
-void
-BRadioButton::Draw(BRect updateRect)
-{
-	uint32 state = IsEnabled() ? Look::kNormal : Look::kDisabled;
-	if (fPressed)
-		state |= Look::kPressed;
-	if (Value() != B_CONTROL_OFF)
-		state |= Look::kOn;
-	Look::DrawRadioButton(this, kBoxPlace, Look::BaseColor(this), state);
-	if (Label() == NULL)
-		return;
-
-	const float baseline = BPrivate::centered_baseline(
-		LabelMetrics(this), kBoxPlace.y, kBoxPlace.y + Look::kCheckBoxSize - 1);
-	BPrivate::draw_label(this, Label(), BPoint(kLabelLeft, baseline), IsEnabled());
-	if (IsFocus() && IsEnabled() && Window()->IsActive()) {
-		Look::DrawFocusLine(
-			this, kLabelLeft, kLabelLeft + BPrivate::label_width(this, Label()) - 1, baseline);
-	}
-}
-
-
-// #pragma mark - mouse and keys
-
-
-void
-BRadioButton::MouseDown(BPoint where)
-{
-	if (!IsEnabled())
-		return;
-
-	fPressed = true;
-	Invalidate();
-	SetTracking(true);
-	SetMouseEventMask(B_POINTER_EVENTS, B_LOCK_WINDOW_FOCUS | B_NO_POINTER_HISTORY);
-}
-
-
-void
-BRadioButton::MouseMoved(BPoint where, uint32 transit, const BMessage* dragMessage)
-{
-	if (!IsTracking() || fPressed == Bounds().Contains(where))
-		return;
-	fPressed = !fPressed;
-	Invalidate();
-}
-
-
-void
-BRadioButton::MouseUp(BPoint where)
-{
-	if (!IsTracking())
-		return;
-
-	SetTracking(false);
-	if (fPressed) {
-		fPressed = false;
-		Invalidate();
-	}
-	if (Bounds().Contains(where))
-		_Choose();
-}
-
-
-void
-BRadioButton::KeyDown(const char* bytes, int32 numBytes)
-{
-	if (IsEnabled() && numBytes == 1 && (bytes[0] == B_SPACE || bytes[0] == B_ENTER)) {
-		_Choose();
-		return;
-	}
-	BControl::KeyDown(bytes, numBytes);
-}
-
-
-void
-BRadioButton::_Choose()
-{
-	if (Value() == B_CONTROL_ON)
-		return;
-	SetValue(B_CONTROL_ON);
-	Invoke();
-}
-
-
-// #pragma mark - hooks
-
-
-void
-BRadioButton::AttachedToWindow()
-{
-	BControl::AttachedToWindow();
-}
-
-
-void
-BRadioButton::DetachedFromWindow()
-{
-	fPressed = false;
-	BControl::DetachedFromWindow();
-}
-
-
-void
-BRadioButton::AllAttached()
-{
-	BControl::AllAttached();
-}
-
-
-void
-BRadioButton::AllDetached()
-{
-	BControl::AllDetached();
-}
-
-
-void
-BRadioButton::MessageReceived(BMessage* message)
-{
-	BControl::MessageReceived(message);
-}
-
-
-void
-BRadioButton::WindowActivated(bool active)
-{
-	BControl::WindowActivated(active);
-}
-
-
-void
-BRadioButton::FrameMoved(BPoint newPosition)
-{
-	BControl::FrameMoved(newPosition);
-}
-
-
-void
-BRadioButton::FrameResized(float newWidth, float newHeight)
-{
-	BControl::FrameResized(newWidth, newHeight);
-}
-
-
-void
-BRadioButton::MakeFocus(bool focused)
-{
-	BControl::MakeFocus(focused);
-}
-
-
-// #pragma mark - properties
 
 
 void
@@ -256,46 +80,21 @@ BRadioButton::SetValue(int32 value)
 
 
 void
-BRadioButton::GetPreferredSize(float* _width, float* _height)
+BRadioButton::Choose()
 {
-	if (_width != NULL)
-		*_width = kHorizontalPadding + BPrivate::label_width(this, Label());
-	if (_height != NULL)
-		*_height = LabelMetrics(this).lineHeight + kVerticalPadding;
+	if (Value() == B_CONTROL_ON)
+		return;
+	SetValue(B_CONTROL_ON);
+	Invoke();
 }
 
 
+// There is no half way.
 void
-BRadioButton::ResizeToPreferred()
+BRadioButton::DrawMark(BPoint leftTop, rgb_color base, uint32 state)
 {
-	BControl::ResizeToPreferred();
-}
-
-
-status_t
-BRadioButton::Invoke(BMessage* message)
-{
-	return BControl::Invoke(message);
-}
-
-
-BHandler*
-BRadioButton::ResolveSpecifier(
-	BMessage* message, int32 index, BMessage* specifier, int32 what, const char* property)
-{
-	return BControl::ResolveSpecifier(message, index, specifier, what, property);
-}
-
-
-status_t
-BRadioButton::GetSupportedSuites(BMessage* message)
-{
-	return BControl::GetSupportedSuites(message);
-}
-
-
-status_t
-BRadioButton::Perform(perform_code code, void* data)
-{
-	return BControl::Perform(code, data);
+	namespace Look = BPrivate::Look;
+	if ((state & Look::kPartlyOn) != 0)
+		state = (state & ~static_cast<uint32>(Look::kPartlyOn)) | Look::kOn;
+	Look::DrawRadioButton(this, leftTop, base, state);
 }
