@@ -3,9 +3,11 @@
 #include <cstdio>
 #include <cstdlib>
 
+#include <Message.h>
 #include <View.h>
 #include <Window.h>
 
+#include "backend/FolderDrop.h"
 #include "backend/headless/HeadlessBackend.h"
 #include "interface/private/WindowInternals.h"
 #include "kernel/private/Activity.h"
@@ -216,6 +218,22 @@ Driver::Drag(BView* from, BPoint fromWhere, BView* to, BPoint toWhere, int32 ste
 	_Wait();
 	const BPoint start = PointIn(from, fromWhere);
 	Drag(start, PointIn(to, toWhere), steps);
+}
+
+
+void
+Driver::DropFile(const char* path, BPoint screen)
+{
+	const std::string list = uri_of_path(path) + "\r\n";
+	BMessage data;
+	data.AddData(
+		"text/uri-list", B_MIME_TYPE, list.data(), static_cast<ssize_t>(list.size()), false);
+	MoveTo(screen);
+	for (const BackendEvent::Type type : { BackendEvent::Type::DragEntered,
+			 BackendEvent::Type::DragMoved, BackendEvent::Type::Dropped }) {
+		fInput->ForeignDrag(type, data);
+		_Wait();
+	}
 }
 
 

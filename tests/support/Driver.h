@@ -44,6 +44,7 @@ public:
 	void Click(BView* view, BPoint where, int32 times = 1, uint32 button = 1, uint32 modifiers = 0);
 	void Drag(BPoint from, BPoint to, int32 steps = 10, uint32 button = 1, uint32 modifiers = 0);
 	void Drag(BView* from, BPoint fromWhere, BView* to, BPoint toWhere, int32 steps = 10);
+	void DropFile(const char* path, BPoint screen); // from another program
 	void Wheel(BPoint screen, float deltaX, float deltaY);
 	void Wheel(BView* view, float deltaX, float deltaY);
 
