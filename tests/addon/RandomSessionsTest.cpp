@@ -173,7 +173,9 @@ private:
 			else if (typeid(*view) == typeid(BView) || dynamic_cast<BBox*>(view) != nullptr)
 				parents.push_back(view);
 		}
-		return ArchiveOf(root.get());
+		BMessage archive = ArchiveOf(root.get());
+		SwapInheritedViews(&archive, 0);
+		return archive;
 	}
 
 	WorkView* Work() { return fScene.Work(); }
@@ -264,6 +266,9 @@ private:
 		fInput.Click(where, times, button, modifiers);
 		fInput.SetWaiting(true);
 		Driver::WaitUntilIdle();
+		// The other buttons reach the view; one with a menu has opened it.
+		if (button != B_PRIMARY_MOUSE_BUTTON)
+			fInput.Key("Escape");
 	}
 
 	void _Drag()
@@ -374,7 +379,8 @@ private:
 		for (const BPoint& point : edge) {
 			const rgb_color color = fInput.PixelAt(point);
 			EXPECT_TRUE(color.red == 0 && color.green == 0 && color.blue == 255)
-				<< "no highlight at " << point.x << ", " << point.y;
+				<< "no highlight at " << point.x << ", " << point.y << " of "
+				<< typeid(*selection).name();
 		}
 	}
 
