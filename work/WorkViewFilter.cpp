@@ -24,10 +24,61 @@ IsDropCode(uint32 what)
 
 
 bool
+IsKey(uint32 what)
+{
+	return what == B_KEY_DOWN || what == B_KEY_UP;
+}
+
+
+bool
 IsOfInterest(uint32 what)
 {
-	return what == B_MOUSE_DOWN || what == B_MOUSE_MOVED || what == kWindowUpdate
+	return what == B_MOUSE_DOWN || what == B_MOUSE_MOVED || what == kWindowUpdate || IsKey(what)
 		|| IsDropCode(what);
+}
+
+
+bool
+ShowsAt(const BView* view, BPoint inParent)
+{
+	return !view->IsHidden() && view->Bounds().Contains(view->ConvertFromParent(inParent));
+}
+
+
+// Whether the place, in the view's coordinates, is in the view and neither in a child of it nor
+// another view's of the tree: where views overlap, the one that was added first gets the mouse.
+bool
+IsUnderPointer(BView* view, BPoint where, const BView* top)
+{
+	for (BView* child = view->ChildAt(0); child != nullptr; child = child->NextSibling()) {
+		if (ShowsAt(child, where))
+			return false;
+	}
+	for (; view != nullptr && view != top; view = view->Parent()) {
+		if (!view->Bounds().Contains(where))
+			return false;
+		where = view->ConvertToParent(where);
+		for (BView* other = view->PreviousSibling(); other != nullptr;
+			 other = other->PreviousSibling()) {
+			if (ShowsAt(other, where))
+				return false;
+		}
+	}
+	return true;
+}
+
+
+// Whether the view hears of a press or a key only because its archive asks for all of them.
+bool
+Overhears(const WorkView* workView, const BMessage* message, BView* view)
+{
+	if (IsKey(message->what))
+		return (view->EventMask() & B_KEYBOARD_EVENTS) != 0 && !view->IsFocus();
+
+	BPoint where;
+	return (view->EventMask() & B_POINTER_EVENTS) != 0
+		&& message->FindPoint("where", &where) == B_OK
+		&& !IsUnderPointer(view, where, workView->Container());
 }
 
 
@@ -88,6 +139,10 @@ WorkViewFilter(BMessage* message, BHandler** target, BMessageFilter* filter)
 	if (view == workView->Container())
 		return B_DISPATCH_MESSAGE;
 
+	if (message->what == B_MOUSE_DOWN || IsKey(message->what)) {
+		if (Overhears(workView, message, view))
+			return B_SKIP_MESSAGE;
+	}
 	if (message->what == B_MOUSE_DOWN)
 		return FilterPress(workView, message, view);
 

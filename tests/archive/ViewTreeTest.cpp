@@ -98,6 +98,28 @@ TEST(ColorfulAddChild, KeepsTheColorsOfTheSelectedPage)
 }
 
 
+// A revived tab view without a selection takes none when it is attached.
+TEST(ColorfulAddChild, KeepsTheColorsBesideATabViewThatShowsNoPage)
+{
+	TestWindow window;
+	BTabView tabs(BRect(0, 0, 99, 99), "tabs");
+	tabs.AddTab(new BView(BRect(0, 0, 50, 50), "page", B_FOLLOW_NONE, B_WILL_DRAW));
+	BMessage archive;
+	tabs.Archive(&archive, true);
+	archive.ReplaceInt32("_sel", -1);
+
+	BView* parent = new BView(BRect(0, 0, 299, 299), "parent", B_FOLLOW_NONE, B_WILL_DRAW);
+	window.Add(parent);
+	BView* group = new BView(BRect(0, 0, 199, 199), "group", B_FOLLOW_NONE, B_WILL_DRAW);
+	group->AddChild(new BTabView(&archive));
+	BView* last = new BView(BRect(100, 0, 199, 99), "last", B_FOLLOW_NONE, B_WILL_DRAW);
+	last->SetLowColor(1, 2, 3);
+	group->AddChild(last);
+	window.Locked([&] { ColorfulAddChild(parent, group); });
+	EXPECT_EQ(2, last->LowColor().green);
+}
+
+
 TEST(ColorfulAddChild, DoesNothingForNull)
 {
 	TestWindow window;

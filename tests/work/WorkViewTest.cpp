@@ -52,8 +52,10 @@ public:
 	}
 
 	void MouseDown(BPoint) override { presses++; }
+	void KeyDown(const char*, int32) override { keys++; }
 
 	int presses = 0;
+	int keys = 0;
 };
 
 
@@ -249,6 +251,29 @@ TEST_F(WorkViewTest, APressWithoutAPlaceIsIgnored)
 	window.Window()->PostMessage(&press, plain);
 	Driver::WaitUntilIdle();
 	EXPECT_EQ(root, workView->SelectedView());
+}
+
+
+// A design may ask for all presses and keys.
+TEST_F(WorkViewTest, AViewThatOverhearsEverythingActsOnNothing)
+{
+	window.Locked([&] { plain->SetEventMask(B_POINTER_EVENTS | B_KEYBOARD_EVENTS); });
+	window.driver.Click(plain);
+	window.driver.Drag(workView->Container(), BPoint(340, 230), workView->Container(),
+		BPoint(360, 250)); // right of the view and below it
+	EXPECT_EQ(BRect(20, 20, 119, 79), plain->Frame());
+	window.driver.Click(button);
+	EXPECT_EQ(button, workView->SelectedView());
+	window.driver.Key("Right");
+	EXPECT_EQ(21, button->Frame().left);
+	EXPECT_EQ(0, plain->keys);
+	EXPECT_EQ(0, plain->presses);
+
+	// It can still be used itself.
+	window.driver.Click(plain);
+	EXPECT_EQ(plain, workView->SelectedView());
+	window.driver.Drag(plain, FromCorner(plain, 3, 3), plain, FromCorner(plain, -17, -7));
+	EXPECT_EQ(BRect(20, 20, 139, 89), plain->Frame());
 }
 
 
