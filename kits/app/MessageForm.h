@@ -1,6 +1,8 @@
 // The forms in which a message can be written as bytes: a small extension of BMessage.
 #pragma once
 
+#include <vector>
+
 #include <Message.h>
 
 enum message_form {
@@ -33,6 +35,13 @@ status_t get_message_form(const void* data, size_t size, message_form_info* _inf
 // and *_damage says where; it may be NULL. *_used gets the bytes that the message takes up.
 status_t unflatten_message(BMessage* message, const void* data, size_t size,
 	message_damage* _damage = NULL, size_t* _used = NULL);
+
+// Reads what can be read of a damaged message: a list's items before the damage, the fields in front
+// of it and, where the form tells their places, behind it; of messages inside it the same. An error
+// when nothing can be read. *_damages gets all that was left out; it may be NULL. A message inside
+// that was put together from its remains may have its fields in part.
+status_t salvage_message(BMessage* message, const void* data, size_t size,
+	std::vector<message_damage>* _damages = NULL);
 
 // Keeps the buffer instead of copying it: free it with the message's last copy only. The keeper is
 // called once, from any thread, when nothing refers to the bytes any more.

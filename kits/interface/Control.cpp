@@ -86,8 +86,12 @@ BControl::Archive(BMessage* archive, bool deep) const
 	BPrivate::write_text(writer, archive, "_label", fLabel);
 	writer.Int32("_val", fValue, B_CONTROL_OFF, fValue != B_CONTROL_OFF);
 	writer.Bool("_disable", !fEnabled, false, !fEnabled);
-	// Read for those who write it; the flags say the same for ours.
-	writer.Keep("be:wants_nav", true);
+	// Without the field the flags answer, which a disabled control has no longer.
+	const bool navigable = (Flags() & B_NAVIGABLE) != 0;
+	bool said = navigable;
+	writer.Source().FindBool("be:wants_nav", &said);
+	if (!writer.Keep("be:wants_nav", said == fWantsNavigation) && fWantsNavigation != navigable)
+		archive->AddBool("be:wants_nav", fWantsNavigation);
 	return writer.Status();
 }
 

@@ -1,7 +1,9 @@
 #include <ResourceForm.h>
 
 #include <bit>
+#include <map>
 #include <string>
+#include <utility>
 
 #include <DataIO.h>
 #include <Resources.h>
@@ -10,6 +12,26 @@
 #include "storage/private/ResourceReader.h"
 
 using namespace BPrivate;
+
+namespace {
+
+// For a type and id that is taken, the first id behind it that may be free.
+typedef std::map<std::pair<type_code, int32>, int32> FreeIds;
+
+
+int32
+FreeId(BResources& resources, type_code type, int32 id, FreeIds& freeIds)
+{
+	if (!resources.HasResource(type, id))
+		return id;
+	int32& next = freeIds.emplace(std::pair(type, id), id).first->second;
+	do {
+		next = static_cast<int32>(static_cast<uint32>(next) + 1);
+	} while (resources.HasResource(type, next));
+	return next;
+}
+
+} // namespace
 
 
 status_t
@@ -27,7 +49,10 @@ examine_resource_file(BPositionIO* file, resource_file_info* _info,
 		*_damages = std::move(reader.Damages());
 
 	const bool swapped = reader.Info().big_endian != (std::endian::native == std::endian::big);
+	if (_places != NULL)
+		_places->reserve(_places->size() + reader.Items().size());
 	std::string bytes;
+	FreeIds freeIds;
 	for (const auto& item : reader.Items()) {
 		if (_places != NULL)
 			_places->push_back(
@@ -40,9 +65,9 @@ examine_resource_file(BPositionIO* file, resource_file_info* _info,
 			continue;
 		if (swapped)
 			SwapResource(item->type, bytes.data(), bytes.size());
-		if (!readable->HasResource(item->type, item->id))
-			readable->AddResource(item->type, item->id, bytes.data(), bytes.size(),
-				item->named ? item->name.c_str() : NULL);
+		const int32 id = FreeId(*readable, item->type, item->id, freeIds);
+		readable->AddResource(
+			item->type, id, bytes.data(), bytes.size(), item->named ? item->name.c_str() : NULL);
 	}
 	return status;
 }

@@ -44,7 +44,12 @@ struct resource_damage {
 // The status that BResources::SetTo() would answer. With B_OK *_places lists all resources in
 // their order, and the damages are at most oddities. Otherwise as much as can be read is listed,
 // and *_damages says what is wrong; an item whose type was lost is listed as B_RAW_TYPE. All but
-// `file` may be NULL. `readable` gets a copy of the listed resources that are wholly there.
+// `file` may be NULL. `readable` gets a copy of the listed resources that are wholly there; the
+// second of two with one type and id gets the next free id.
 status_t examine_resource_file(BPositionIO* file, resource_file_info* _info,
 	std::vector<resource_place>* _places, std::vector<resource_damage>* _damages,
 	BResources* readable = NULL);
+
+// The bytes of the resource that GetResourceInfo() tells about by this index, also where an earlier
+// one has the same type and id. They stay the resources' own, as those of LoadResource().
+const void* load_resource(BResources* resources, int32 index, size_t* _size);

@@ -256,6 +256,27 @@ BResources::LoadResource(type_code type, const char* name, size_t* _size)
 }
 
 
+const void*
+load_resource(BResources* resources, int32 index, size_t* _size)
+{
+	return resources->_LoadAt(index, _size);
+}
+
+
+const void*
+BResources::_LoadAt(int32 index, size_t* _size)
+{
+	if (index < 0 || index >= fState->table.Count())
+		return NULL;
+	const ResourceItem* item = fState->Load(fState->table.At(index), fFile._Fd());
+	if (item == NULL)
+		return NULL;
+	if (_size != NULL)
+		*_size = item->size;
+	return item->data;
+}
+
+
 status_t
 BResources::PreloadResourceType(type_code type)
 {

@@ -69,6 +69,8 @@ public:
 	void* FindResource(type_code type, const char* name, size_t* _length);
 
 private:
+	friend const void* load_resource(BResources* resources, int32 index, size_t* _size);
+
 	BResources(const BResources&);
 	BResources& operator=(const BResources&);
 
@@ -78,7 +80,7 @@ private:
 	status_t _Read(BFile& file);
 	status_t _Save();
 	status_t _CheckChange() const;
-	const void* _Load(void* item);
+	const void* _LoadAt(int32 index, size_t* _size);
 
 	BFile fFile; // shares its descriptor with the caller's, so that both follow a save
 	std::unique_ptr<State> fState; // never NULL

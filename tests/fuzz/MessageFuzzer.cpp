@@ -5,6 +5,7 @@
 #include <cstdlib>
 #include <cstring>
 #include <string>
+#include <vector>
 
 #include <DataIO.h>
 #include <Message.h>
@@ -143,6 +144,11 @@ LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
 	require((status == B_OK) == (streamStatus == B_OK));
 	if (status != B_OK) {
 		require(message.IsEmpty());
+		// What can be salvaged is sound.
+		std::vector<message_damage> damages;
+		if (salvage_message(&message, data, size, &damages) == B_OK)
+			write_and_read(message);
+		require(!damages.empty());
 		return 0;
 	}
 	require(used <= size && size_t(stream.Position()) == used);

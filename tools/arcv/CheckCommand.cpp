@@ -2,7 +2,11 @@
 
 #include <sys/stat.h>
 
+#include <algorithm>
+#include <map>
 #include <memory>
+#include <set>
+#include <utility>
 
 #include <File.h>
 #include <TypeConstants.h>
@@ -28,22 +32,63 @@ struct Finding {
 	std::string text;
 };
 
+// What could be read of a damaged message, in the form that it had.
+struct Remains {
+	std::string where; // the item; empty for a file that is one message
+	std::vector<std::string> fields;
+	std::string bytes;
+	std::string name;
+};
+
 struct Report {
 	resource_file_info info = {};
 	std::vector<resource_place> places;
 	std::vector<Finding> findings;
-	std::string text; // of the readable items
+	std::map<std::pair<type_code, int32>, Remains> remains;
+	std::string text; // of a file that is one message, when it is whole
 	bool recognized = false;
+	bool isMessage = false;
 };
+
+
+// Notes all that is wrong with a damaged message, and what is left of it.
+void
+CheckRemains(const char* data, size_t size, off_t start, const std::string& prefix,
+	const resource_place& place, Report& report)
+{
+	BMessage message;
+	std::vector<message_damage> damages;
+	const status_t status = salvage_message(&message, data, size, &damages);
+	for (const message_damage& damage : damages)
+		report.findings.push_back(
+			{ start + static_cast<off_t>(damage.offset), prefix + damage.reason });
+	if (damages.empty())
+		report.findings.push_back({ start, prefix + "the message is damaged" });
+	if (status != B_OK || message.IsEmpty())
+		return;
+
+	Remains remains;
+	remains.where = report.isMessage ? "" : ItemText(place.type, place.id);
+	remains.name = place.name.String();
+	char* name;
+	type_code type;
+	for (int32 i = 0; message.GetInfo(B_ANY_TYPE, i, &name, &type) == B_OK; i++)
+		remains.fields.push_back(name);
+	message_form_info info;
+	const bool isHaiku = get_message_form(data, size, &info) == B_OK && info.form == B_HAIKU_FORM;
+	const message_form form = isHaiku ? B_HAIKU_FORM : B_R5_FORM;
+	remains.bytes.resize(std::max<ssize_t>(flattened_message_size(message, form), 0));
+	if (flatten_message(message, form, remains.bytes.data(), remains.bytes.size()) == B_OK)
+		report.remains.emplace(std::pair(place.type, place.id), std::move(remains));
+}
 
 
 // A message inside the file has its own damages.
 void
-CheckMessage(const char* data, size_t size, off_t start, const std::string& prefix, bool expected,
-	Report& report)
+CheckMessage(const char* data, size_t size, off_t start, const std::string& prefix,
+	const resource_place& place, bool expected, Report& report)
 {
 	message_form_info info;
-	message_damage damage = {};
 	BMessage message;
 	if (get_message_form(data, size, &info) != B_OK) {
 		if (expected)
@@ -51,9 +96,8 @@ CheckMessage(const char* data, size_t size, off_t start, const std::string& pref
 		return;
 	}
 	size_t used = 0;
-	if (unflatten_message(&message, data, size, &damage, &used) != B_OK) {
-		const char* reason = damage.reason != NULL ? damage.reason : "the message is damaged";
-		report.findings.push_back({ start + static_cast<off_t>(damage.offset), prefix + reason });
+	if (unflatten_message(&message, data, size, NULL, &used) != B_OK) {
+		CheckRemains(data, size, start, prefix, place, report);
 		return;
 	}
 	if (!info.checksum_matches)
@@ -70,20 +114,33 @@ CheckItem(BFile& file, const resource_place& place, Report& report)
 	const std::string prefix = ItemText(place.type, place.id) + ": ";
 	off_t fileSize = 0;
 	file.GetSize(&fileSize);
-	if (place.offset + static_cast<off_t>(place.size) > fileSize) {
+	const off_t there = std::max<off_t>(fileSize - place.offset, 0);
+	const bool isCut = there < static_cast<off_t>(place.size);
+	if (isCut)
 		report.findings.push_back({ place.offset,
-			prefix + "only the first " + std::to_string(std::max<off_t>(fileSize - place.offset, 0))
-				+ " of " + std::to_string(place.size) + " bytes are there" });
-		return;
-	}
-	std::string bytes(place.size, '\0');
+			prefix + "only the first " + std::to_string(there) + " of " + std::to_string(place.size)
+				+ " bytes are there" });
+	std::string bytes(std::min<off_t>(there, place.size), '\0');
 	if (file.ReadAt(place.offset, bytes.data(), bytes.size())
 		!= static_cast<ssize_t>(bytes.size())) {
 		report.findings.push_back({ place.offset, prefix + "its bytes cannot be read" });
 		return;
 	}
-	const bool expected = place.type == 'ARCV' || place.type == B_MESSAGE_TYPE;
-	CheckMessage(bytes.data(), bytes.size(), place.offset, prefix, expected, report);
+	const bool expected = !isCut && (place.type == 'ARCV' || place.type == B_MESSAGE_TYPE);
+	CheckMessage(bytes.data(), bytes.size(), place.offset, prefix, place, expected, report);
+}
+
+
+// Programs find only the first of two items with one type and id.
+void
+CheckTwins(Report& report)
+{
+	std::set<std::pair<type_code, int32>> seen;
+	for (const resource_place& place : report.places) {
+		if (!seen.emplace(place.type, place.id).second)
+			report.findings.push_back({ place.offset,
+				ItemText(place.type, place.id) + ": there is one of this type and id already" });
+	}
 }
 
 
@@ -91,7 +148,7 @@ CheckItem(BFile& file, const resource_place& place, Report& report)
 bool
 CheckWholeMessage(BFile& file, Report& report)
 {
-	char start[64];
+	char start[128]; // more than any form needs to be told
 	const ssize_t read = file.ReadAt(0, start, sizeof(start));
 	message_form_info info;
 	if (read <= 0 || get_message_form(start, read, &info) != B_OK)
@@ -101,14 +158,47 @@ CheckWholeMessage(BFile& file, Report& report)
 	std::string bytes(size, '\0');
 	if (file.ReadAt(0, bytes.data(), bytes.size()) != size)
 		return false;
-	CheckMessage(bytes.data(), bytes.size(), 0, "", true, report);
+	report.isMessage = true;
 	report.recognized = true;
+	CheckMessage(bytes.data(), bytes.size(), 0, "", resource_place(), true, report);
+	if (report.remains.empty())
+		report.text = std::move(bytes);
 	return true;
 }
 
 
+// The readable items, with what is left of damaged messages in the place of those.
+status_t
+WriteItems(BFile& file, Report& report, BResources& readable)
+{
+	BResources items;
+	type_code type;
+	int32 id;
+	const char* name;
+	size_t size;
+	for (int32 i = 0; readable.GetResourceInfo(i, &type, &id, &name, &size); i++) {
+		const void* data = readable.LoadResource(type, id, &size);
+		const auto remains = report.remains.find({ type, id });
+		if (remains == report.remains.end()) {
+			items.AddResource(type, id, data, size, name[0] != '\0' ? name : NULL);
+			continue;
+		}
+		const std::string& bytes = remains->second.bytes;
+		items.AddResource(type, id, bytes.data(), bytes.size(), name[0] != '\0' ? name : NULL);
+	}
+	// Items of which the file has only the start.
+	for (const auto& [key, remains] : report.remains) {
+		if (!items.HasResource(key.first, key.second))
+			items.AddResource(key.first, key.second, remains.bytes.data(), remains.bytes.size(),
+				remains.name.empty() ? NULL : remains.name.c_str());
+	}
+	return items.WriteTo(&file);
+}
+
+
 bool
-WriteRepaired(const std::string& original, const std::string& path, BResources& readable)
+WriteRepaired(
+	const std::string& original, const std::string& path, Report& report, BResources& readable)
 {
 	struct stat first;
 	struct stat second;
@@ -120,8 +210,15 @@ WriteRepaired(const std::string& original, const std::string& path, BResources& 
 	}
 	BFile file(path.c_str(), B_READ_WRITE | B_CREATE_FILE | B_FAIL_IF_EXISTS);
 	status_t status = file.InitCheck();
-	if (status == B_OK)
-		status = readable.WriteTo(&file);
+	if (status == B_OK && !report.isMessage)
+		status = WriteItems(file, report, readable);
+	else if (status == B_OK) {
+		const std::string& bytes =
+			report.remains.empty() ? report.text : report.remains.begin()->second.bytes;
+		const ssize_t written = file.Write(bytes.data(), bytes.size());
+		if (written != static_cast<ssize_t>(bytes.size()))
+			status = written < 0 ? static_cast<status_t>(written) : B_DEVICE_FULL;
+	}
 	if (status == B_FILE_EXISTS)
 		Complain(path, "there is a file already");
 	else if (status != B_OK)
@@ -135,7 +232,14 @@ PrintReport(const Report& report, const std::string& file)
 {
 	for (const Finding& finding : report.findings)
 		Print(file + ": offset " + std::to_string(finding.offset) + ": " + finding.text + "\n");
-	if (report.findings.empty())
+	for (const auto& [key, remains] : report.remains) {
+		Print((remains.where.empty() ? "" : remains.where + ": ")
+			+ std::to_string(remains.fields.size()) + " fields can be read:");
+		for (const std::string& field : remains.fields)
+			Print(" " + field);
+		Print("\n");
+	}
+	if (report.findings.empty() || report.isMessage)
 		return;
 	Print(std::to_string(report.places.size()) + " items were found\n");
 	for (const resource_place& place : report.places)
@@ -178,6 +282,20 @@ PrintJson(const Report& report)
 		json.CloseObject();
 	}
 	json.CloseArray();
+	json.Name("remains");
+	json.OpenArray();
+	for (const auto& [key, remains] : report.remains) {
+		json.OpenObject(true);
+		json.Name("item");
+		json.String(remains.where);
+		json.Name("fields");
+		json.OpenArray(true);
+		for (const std::string& field : remains.fields)
+			json.Text(field);
+		json.CloseArray();
+		json.CloseObject();
+	}
+	json.CloseArray();
 	json.CloseObject();
 	Print(json.Finish());
 }
@@ -205,6 +323,7 @@ RunCheck(const CheckOptions& options)
 			report.findings.push_back({ damage.offset, damage.reason });
 		if (status != B_OK && damages.empty())
 			report.findings.push_back({ 0, StatusText(status) });
+		CheckTwins(report);
 		for (const resource_place& place : report.places)
 			CheckItem(file, place, report);
 	}
@@ -213,7 +332,8 @@ RunCheck(const CheckOptions& options)
 		PrintJson(report);
 	else
 		PrintReport(report, options.file);
-	if (!options.repaired.empty() && !WriteRepaired(options.file, options.repaired, readable))
+	if (!options.repaired.empty()
+		&& !WriteRepaired(options.file, options.repaired, report, readable))
 		return kUnreadable;
 	if (!report.recognized)
 		return kUnreadable;

@@ -54,6 +54,12 @@ ConvertItems(BResources& resources, const ConvertOptions& options)
 	size_t size;
 	BResources converted;
 	for (int32 i = 0; resources.GetResourceInfo(i, &type, &id, &name, &size); i++) {
+		if (converted.HasResource(type, id)) {
+			Complain(options.file,
+				"there are two of " + ItemText(type, id)
+					+ "; arcv check --repair tells them apart");
+			return kUnreadable;
+		}
 		const void* data = resources.LoadResource(type, id, &size);
 		BMessage message;
 		message_form form;

@@ -4,6 +4,7 @@
 
 #include <map>
 #include <memory>
+#include <tuple>
 
 #include "tools/arcv/Command.h"
 #include "tools/arcv/Input.h"
@@ -57,18 +58,38 @@ CompareBytes(const Item& item, const void* oldData, size_t oldSize, const void* 
 }
 
 
+// For each item how many before it have its type and id: normally 0.
+std::vector<int32>
+TwinNumbers(const std::vector<Item>& items)
+{
+	std::map<std::pair<type_code, int32>, int32> counts;
+	std::vector<int32> numbers;
+	for (const Item& item : items)
+		numbers.push_back(counts[{ item.type, item.id }]++);
+	return numbers;
+}
+
+
 // False after a complaint.
 bool
 CompareItems(Input& oldInput, Input& newInput, std::vector<ItemDifference>* _differences)
 {
-	using Key = std::pair<type_code, int32>;
+	using Key = std::tuple<type_code, int32, int32>;
+	const std::vector<int32> oldTwins = TwinNumbers(oldInput.Items());
+	const std::vector<int32> newTwins = TwinNumbers(newInput.Items());
+	const auto oldKey = [&](const Item& item) {
+		return Key(item.type, item.id, oldTwins[item.index]);
+	};
+	const auto newKey = [&](const Item& item) {
+		return Key(item.type, item.id, newTwins[item.index]);
+	};
 	std::map<Key, const Item*> news;
 	for (const Item& item : newInput.Items())
-		news.emplace(Key(item.type, item.id), &item);
+		news.emplace(newKey(item), &item);
 
 	std::vector<Key> oldOrder;
 	for (const Item& item : oldInput.Items()) {
-		const Key key(item.type, item.id);
+		const Key key = oldKey(item);
 		const auto found = news.find(key);
 		if (found == news.end()) {
 			_differences->push_back({ ItemText(item.type, item.id), "removed",
@@ -90,8 +111,8 @@ CompareItems(Input& oldInput, Input& newInput, std::vector<ItemDifference>* _dif
 
 	std::vector<Key> newOrder;
 	for (const Item& item : newInput.Items()) {
-		if (news.count(Key(item.type, item.id)) == 0)
-			newOrder.push_back(Key(item.type, item.id));
+		if (news.count(newKey(item)) == 0)
+			newOrder.push_back(newKey(item));
 		else
 			_differences->push_back({ ItemText(item.type, item.id), "added",
 				"\"" + item.name + "\", " + std::to_string(item.size) + " bytes", {} });

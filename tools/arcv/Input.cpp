@@ -13,7 +13,7 @@ namespace Arcv {
 
 namespace {
 
-constexpr size_t kMessageStart = 64; // enough to know a flattened message
+constexpr size_t kMessageStart = 128; // enough to know a flattened message
 
 } // namespace
 
@@ -80,6 +80,7 @@ Input::Open(const std::string& path)
 	const char* name;
 	for (int32 i = 0; fResources.GetResourceInfo(i, &item.type, &item.id, &name, &item.size); i++) {
 		item.name = name;
+		item.index = i;
 		fItems.push_back(item);
 	}
 	return true;
@@ -90,7 +91,7 @@ const void*
 Input::Load(const Item& item)
 {
 	size_t size;
-	const void* data = fResources.LoadResource(item.type, item.id, &size);
+	const void* data = load_resource(&fResources, item.index, &size);
 	if (data == NULL)
 		Complain(fPath, "the bytes of " + ItemText(item.type, item.id) + " cannot be read");
 	return data;

@@ -19,6 +19,7 @@ struct Item {
 	int32 id;
 	std::string name;
 	size_t size;
+	int32 index; // in the file: two items may have one type and id
 };
 
 // A file opened for reading. Only what is asked for is read.

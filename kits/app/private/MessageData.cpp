@@ -64,6 +64,15 @@ hash_name(const char* name, size_t length)
 }
 
 
+// Whether that many fields find their places in the index quickly. A message of thousands of tiny
+// fields should take no more memory than they are worth.
+bool
+is_roomy(uint32 slots, uint32 fields)
+{
+	return uint64(slots) * 2 >= uint64(fields) * 3;
+}
+
+
 void
 put_item(uint8* to, const ItemContents& item)
 {
@@ -102,20 +111,33 @@ MessageData::CreateFrom(SharedBytes* source, const uint8* base, const MessageFie
 	}
 	if (count > 0)
 		memcpy(data->fFields, fields, count * sizeof(MessageField));
-	for (uint32 i = 0; i < count; i++)
-		data->fNameBits |= name_bit(fields[i].key);
 	data->fCount = count;
-	data->fSource = source;
-	data->fSourceBase = base;
-	data->fBodySize = bodySize;
-	data->fStoreIsBody = false;
-	data->fLevel = int16(level);
-	data->fPlain.store(-1, std::memory_order_relaxed);
-	if (count > kFewFields && !data->_BuildIndex()) {
-		data->Release();
+	if (data->_InitFrom(source, base, level, bodySize))
+		return data;
+	data->Release();
+	return nullptr;
+}
+
+
+MessageData*
+MessageData::CreateAround(SharedBytes* source, const uint8* base, MessageField* fields,
+	uint32 count, int32 level, uint32 bodySize)
+{
+	MessageData* data = _CreateWithRoom(0);
+	if (data == nullptr) {
+		for (uint32 i = 0; i < count; i++)
+			free(fields[i].table);
+		free(fields);
+		source->Release();
 		return nullptr;
 	}
-	return data;
+	data->fFields = fields;
+	data->fCount = count;
+	data->fFieldRoom = count;
+	if (data->_InitFrom(source, base, level, bodySize))
+		return data;
+	data->Release();
+	return nullptr;
 }
 
 
@@ -391,17 +413,19 @@ MessageData::AddField(
 	if (item.size > kLargestStore)
 		return B_NO_MEMORY;
 	const size_t bytes = fixed ? item.size : padded_item_size(item.size);
-	const uint32 header = r5_field_header_length(1, bytes, B_R5_FORM);
+	// The R5 form has a byte for the length of a name; longer ones come from the other form.
+	const bool compact = length <= UINT8_MAX;
+	const uint32 header = compact ? r5_field_header_length(1, bytes, B_R5_FORM) : 0;
 	if (!_ReserveStore(header + length + bytes) || !_ReserveFields(1))
 		return B_NO_MEMORY;
 	_Changed();
-	fStoreIsBody = fStoreIsBody && fBodySize == 0;
+	fStoreIsBody = fStoreIsBody && fBodySize == 0 && compact;
 	fBodySize = 0;
 	_NoteNested(type, item);
 
 	MessageField& field = fFields[fCount];
-	field.start = fStoreSize;
-	field.name = fStoreSize + header;
+	const uint32 start = fStoreSize;
+	field.name = start + header;
 	field.data = field.name + uint32(length);
 	field.size = uint32(bytes);
 	field.count = 1;
@@ -410,9 +434,11 @@ MessageData::AddField(
 	field.key = name_key(name, length);
 	field.table = nullptr;
 	field.nameLength = uint16(length);
-	field.flags = MessageField::kCompact | (bytes > 255 ? MessageField::kWide : 0)
-		| (fixed ? MessageField::kFixed : 0);
-	write_r5_field_head(fStore + field.start, field, bytes, B_R5_FORM);
+	field.flags = fixed ? MessageField::kFixed : 0;
+	if (compact) {
+		field.flags |= MessageField::kCompact | (bytes > 255 ? MessageField::kWide : 0);
+		write_r5_field_head(fStore + start, field, bytes, B_R5_FORM);
+	}
 	memcpy(fStore + field.name, name, length);
 	if (fixed)
 		memcpy(fStore + field.data, item.data, item.size);
@@ -788,7 +814,7 @@ MessageData::FlatSize() const
 	for (uint32 i = 0; i < fCount; i++) {
 		const MessageField& field = fFields[i];
 		if (field.Has(MessageField::kCompact)) {
-			size += field.data + field.size - field.start;
+			size += field.data + field.size - field.Start();
 			continue;
 		}
 		const size_t bytes = padded_field_size(*this, field);
@@ -854,7 +880,7 @@ MessageData::WritePlain(uint32 what, uint8* to) const
 	for (uint32 i = 0; i < fCount; i++) {
 		const MessageField& field = fFields[i];
 		if (field.Has(MessageField::kCompact)) {
-			const uint8* start = Base(field) + field.start;
+			const uint8* start = Base(field) + field.Start();
 			if (start != runEnd) {
 				to = append_bytes(to, run, runEnd);
 				run = start;
@@ -896,6 +922,22 @@ MessageData::_CreateWithRoom(uint32 fields)
 	data->fFields = reinterpret_cast<MessageField*>(data + 1);
 	data->fFieldRoom = fields;
 	return data;
+}
+
+
+// What is the same for all messages that were read, once their fields are there.
+bool
+MessageData::_InitFrom(SharedBytes* source, const uint8* base, int32 level, uint32 bodySize)
+{
+	for (uint32 i = 0; i < fCount; i++)
+		fNameBits |= name_bit(fFields[i].key);
+	fSource = source;
+	fSourceBase = base;
+	fBodySize = bodySize;
+	fStoreIsBody = false;
+	fLevel = int16(level);
+	fPlain.store(-1, std::memory_order_relaxed);
+	return fCount <= kFewFields || _BuildIndex();
 }
 
 
@@ -964,7 +1006,7 @@ MessageData::_AddToIndex(uint32 number)
 	fNameBits |= name_bit(fFields[number].key);
 	if (fIndex == nullptr && number < kFewFields)
 		return;
-	if (fIndex == nullptr || (number + 1) * 2 > fIndexMask) {
+	if (fIndex == nullptr || !is_roomy(fIndexMask + 1, number + 1)) {
 		// Without memory for an index the look-up becomes a walk.
 		_BuildIndex();
 		return;
@@ -987,7 +1029,7 @@ bool
 MessageData::_BuildIndex()
 {
 	uint32 slots = 64;
-	while (slots < fCount * 4)
+	while (!is_roomy(slots, fCount))
 		slots *= 2;
 	free(fIndex);
 	fIndex = static_cast<uint32*>(calloc(slots, sizeof(uint32)));
@@ -1077,6 +1119,7 @@ MessageData::_Lengthen(MessageField& field, uint32 bytes)
 {
 	const size_t newSize = size_t(field.size) + bytes;
 	uint32 shift = 0;
+	const uint32 start = field.Has(MessageField::kCompact) ? field.Start() : 0;
 	if (field.Has(MessageField::kCompact)) {
 		shift = r5_field_header_length(field.count + 1, newSize, B_R5_FORM)
 			- r5_field_header_length(field.count, field.size, B_R5_FORM);
@@ -1095,7 +1138,7 @@ MessageData::_Lengthen(MessageField& field, uint32 bytes)
 	field.size = uint32(newSize);
 	field.count++;
 	if (field.Has(MessageField::kCompact)) {
-		write_r5_field_head(fStore + field.start, field, field.size, B_R5_FORM);
+		write_r5_field_head(fStore + start, field, field.size, B_R5_FORM);
 		const bool mini = field.size <= 255 && field.count <= 255;
 		field.flags &= uint16(~MessageField::kWide);
 		field.flags |= mini ? 0 : MessageField::kWide;
@@ -1243,7 +1286,7 @@ MessageData::_Body(size_t* _size) const
 		return fStore != nullptr ? fStore : reinterpret_cast<const uint8*>("");
 	}
 	*_size = fBodySize;
-	return fBodySize > 0 ? fSourceBase + fFields[0].start : nullptr;
+	return fBodySize > 0 ? fSourceBase + fFields[0].Start() : nullptr;
 }
 
 

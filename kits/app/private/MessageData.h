@@ -25,14 +25,14 @@ struct MessageField {
 		kInSource = 0x02, // offsets count in the bytes that were read, else in the store
 		kNameInSource = 0x04,
 		kPacked = 0x08, // variable items without padding between them, as the Haiku form has them
-		kCompact = 0x10, // what lies from start on is this field in the compact R5 form
+		kCompact =
+			0x10, // what lies in front of the name is the field's head in the compact R5 form
 		kWide = 0x20, // the same for the wide R5 form
 		kScattered = 0x40, // only the table tells where the items are
 		kCarried = 0x80, // put in by a WriteBack; the first item that is added replaces it
 	};
 
 	uint32 name; // offset
-	uint32 start; // offset of the encoded field; the data ends it
 	uint32 data; // offset of the first item (of its size, if variable)
 	uint32 size; // bytes of all items; scattered items count as padded
 	uint32 count;
@@ -45,6 +45,7 @@ struct MessageField {
 
 	bool Has(uint16 flag) const { return (flags & flag) != 0; }
 	uint32 ItemSize() const { return size / count; } // of a fixed field
+	uint32 Start() const; // offset of the encoded field, if it is compact; the data ends it
 };
 
 
@@ -87,6 +88,9 @@ public:
 	// after another in the compact form, bodySize is the sum of their bytes, else 0.
 	static MessageData* CreateFrom(SharedBytes* source, const uint8* base,
 		const MessageField* fields, uint32 count, int32 level, uint32 bodySize);
+	// The same for an array from malloc(), which is taken over too.
+	static MessageData* CreateAround(SharedBytes* source, const uint8* base, MessageField* fields,
+		uint32 count, int32 level, uint32 bodySize);
 	MessageData* Clone() const;
 
 	void Acquire() { fReferences.fetch_add(1, std::memory_order_relaxed); }
@@ -165,6 +169,7 @@ private:
 	void operator delete(void* block) { free(block); }
 
 	static MessageData* _CreateWithRoom(uint32 fields);
+	bool _InitFrom(SharedBytes* source, const uint8* base, int32 level, uint32 bodySize);
 	void _Changed();
 	void _ForgetDerived();
 	bool _ReserveFields(uint32 count);
@@ -234,6 +239,21 @@ inline void
 write_uint32(void* to, uint32 value)
 {
 	memcpy(to, &value, sizeof(value));
+}
+
+
+inline uint32
+r5_field_header_length(uint32 count, size_t size, message_form form)
+{
+	const bool mini = form == B_R5_FORM && count <= 255 && size <= 255;
+	return 1 + 4 + (count == 1 ? 0 : (mini ? 1 : 4)) + (mini ? 1 : 4) + 1;
+}
+
+
+inline uint32
+MessageField::Start() const
+{
+	return name - r5_field_header_length(count, size, B_R5_FORM);
 }
 
 

@@ -12,6 +12,7 @@ namespace BPrivate {
 namespace {
 
 constexpr uint32 kFewItems = 8; // as many are found without a table
+constexpr uint32 kFewFields = 32; // as many have room in the reader itself
 
 enum R5MessageFlag : uint8 {
 	kR5HasTarget = 0x02,
@@ -135,9 +136,10 @@ MessageReader::MessageReader(SharedBytes* source, const uint8* bytes, size_t siz
 
 MessageReader::~MessageReader()
 {
-	const MessageField* fields = fManyFields.empty() ? fFewFields : fManyFields.data();
+	const MessageField* fields = fManyFields == nullptr ? fFewFields : fManyFields;
 	for (uint32 i = 0; i < fFieldCount; i++)
 		free(fields[i].table);
+	free(fManyFields);
 	if (fBuilt != nullptr)
 		fBuilt->Release();
 	if (fSource != nullptr)
@@ -206,15 +208,23 @@ MessageReader::_ReadR5()
 	}
 
 	const size_t start = position;
-	fIsCompact = true;
+	fIsCompact = fDamages == nullptr;
 	Field field;
 	while (position < fSize && (fBytes[position] & kR5Valid) != 0) {
-		if (!_ReadR5Field(&position, &field) || !_Take(field))
+		if (fFieldCount == kFewFields && !_ReserveFields(kFewFields + _CountR5Fields(position)))
+			return nullptr;
+		if (!_ReadR5Field(&position, &field)) {
+			if (!_LeaveOut())
+				return nullptr;
+			return _Finish();
+		}
+		if (_KeepWholeItems(&field) && !_Take(field) && !_LeaveOut())
 			return nullptr;
 	}
 	if (position >= fSize) {
 		_Fail(B_BAD_VALUE, fSize, "the fields do not end before the message does");
-		return nullptr;
+		if (!_LeaveOut())
+			return nullptr;
 	}
 	fBodySize = uint32(position - start);
 	return _Finish();
@@ -227,11 +237,15 @@ MessageReader::_ReadR5Header()
 {
 	if (fSize < kR5HeaderSize + 1)
 		return _Fail(B_BAD_VALUE, fSize, "the header is cut short");
-	const uint32 size = _Number32(fBytes + 8);
+	size_t size = _Number32(fBytes + 8);
 	if (size < kR5HeaderSize + 1)
 		return _Fail(B_BAD_VALUE, size_t(8), "the size of the message is less than its header");
-	if (size > fSize)
-		return _Fail(B_BAD_VALUE, size_t(8), "the size of the message is more than there is");
+	if (size > fSize) {
+		_Fail(B_BAD_VALUE, size_t(8), "the size of the message is more than there is");
+		if (!_LeaveOut())
+			return false;
+		size = fSize;
+	}
 	fSize = size;
 	fUsed = size;
 	fWhat = _Number32(fBytes + 12);
@@ -268,8 +282,13 @@ MessageReader::_ReadR5Field(size_t* position, Field* field)
 		return _Fail(B_BAD_VALUE, at, "the field's name passes the end of the message");
 	field->name = reinterpret_cast<const char*>(at);
 	at += field->nameLength;
-	if (size_t(end - at) < field->size)
-		return _Fail(B_BAD_VALUE, at, "the field's data pass the end of the message");
+	field->stated = field->size;
+	if (size_t(end - at) < field->size) {
+		_Fail(B_BAD_VALUE, at, "the field's data pass the end of the message");
+		if (!_LeaveOut())
+			return false;
+		field->size = size_t(end - at);
+	}
 	field->start = start;
 	field->data = at;
 	field->fixed = (flags & kR5Fixed) != 0;
@@ -283,6 +302,28 @@ MessageReader::_ReadR5Field(size_t* position, Field* field)
 	fIsCompact = fIsCompact && (field->flags & MessageField::kCompact) != 0;
 	*position = size_t(at - fBytes) + field->size;
 	return true;
+}
+
+
+// Looks at nothing but where the fields end: what is wrong with them shows when they are read.
+size_t
+MessageReader::_CountR5Fields(size_t position) const
+{
+	size_t count = 0;
+	while (position < fSize && (fBytes[position] & kR5Valid) != 0) {
+		const bool mini = (fBytes[position] & kR5Mini) != 0;
+		const bool single = (fBytes[position] & kR5Single) != 0;
+		const size_t sizeAt = position + 5 + (single ? 0 : (mini ? 1 : 4));
+		const size_t nameAt = sizeAt + (mini ? 1 : 4);
+		if (nameAt >= fSize)
+			return count + 1;
+		const size_t size = mini ? fBytes[sizeAt] : _Number32(fBytes + sizeAt);
+		count++;
+		if (size == 0)
+			break;
+		position = nameAt + 1 + fBytes[nameAt] + size;
+	}
+	return count;
 }
 
 
@@ -301,27 +342,37 @@ MessageReader::_ReadHaiku()
 		_Fail(B_BAD_VALUE, size_t(8), "the message is not marked as valid");
 		return nullptr;
 	}
-	const size_t areaSize = _Number32(fBytes + 36);
-	const size_t count = _Number32(fBytes + 40);
+	size_t areaSize = _Number32(fBytes + 36);
+	size_t count = _Number32(fBytes + 40);
 	if (_Number32(fBytes + 44) != kHaikuHashSize) {
 		_Fail(B_BAD_VALUE, size_t(44), "the hash table has not its five slots");
 		return nullptr;
 	}
-	if (count > (fSize - kHaikuHeaderSize) / kHaikuFieldSize) {
+	const size_t mostFields = (fSize - kHaikuHeaderSize) / kHaikuFieldSize;
+	if (count > mostFields) {
 		_Fail(B_BAD_VALUE, size_t(40), "there are more fields than the message has room for");
-		return nullptr;
+		if (!_LeaveOut())
+			return nullptr;
+		count = mostFields;
 	}
 	const size_t areaStart = kHaikuHeaderSize + count * kHaikuFieldSize;
 	if (areaSize > fSize - areaStart) {
 		_Fail(B_BAD_VALUE, size_t(36), "the data pass the end of the message");
-		return nullptr;
+		if (!_LeaveOut())
+			return nullptr;
+		areaSize = fSize - areaStart;
 	}
 	fUsed = areaStart + areaSize;
+	if (count > kFewFields && !fSwapped && !_ReserveFields(count))
+		return nullptr;
 
 	Field field;
 	for (size_t i = 0; i < count; i++) {
 		const size_t position = kHaikuHeaderSize + i * kHaikuFieldSize;
-		if (!_ReadHaikuField(position, areaStart, areaSize, &field) || !_Take(field))
+		const bool read = _ReadHaikuField(position, areaStart, areaSize, &field);
+		if (read && !_KeepWholeItems(&field))
+			continue;
+		if ((!read || !_Take(field)) && !_LeaveOut())
 			return nullptr;
 	}
 	return _Finish();
@@ -340,9 +391,15 @@ MessageReader::_ReadHaikuField(size_t position, size_t areaStart, size_t areaSiz
 	field->type = _Number32(header + 4);
 	field->count = _Number32(header + 8);
 	field->size = _Number32(header + 12);
-	if (offset > areaSize || nameLength > areaSize - offset
-		|| field->size > areaSize - offset - nameLength)
+	field->stated = field->size;
+	if (offset > areaSize || nameLength > areaSize - offset)
 		return _Fail(B_BAD_VALUE, header + 16, "the field lies outside the message's data");
+	if (field->size > areaSize - offset - nameLength) {
+		_Fail(B_BAD_VALUE, header + 16, "the field lies outside the message's data");
+		if (!_LeaveOut())
+			return false;
+		field->size = areaSize - offset - nameLength;
+	}
 
 	const uint8* name = fBytes + areaStart + offset;
 	if (nameLength == 0 || name[nameLength - 1] != 0)
@@ -460,6 +517,83 @@ MessageReader::_AddDanoItems(const Field& field, const uint8* items, size_t size
 }
 
 
+// #pragma mark - damage
+
+
+// Notes the last failure, if damages may be left out.
+bool
+MessageReader::_LeaveOut()
+{
+	if (fDamages == nullptr || fStatus == B_NO_MEMORY)
+		return false;
+	fDamages->push_back(fDamage);
+	fStatus = B_OK;
+	return true;
+}
+
+
+// The head in front of the name tells another count and size than what is left.
+void
+MessageReader::_Shorten(Field* field, uint32 count)
+{
+	field->flags &= uint16(~(MessageField::kCompact | MessageField::kWide));
+	field->count = count;
+}
+
+
+// Leaves the items of a damaged field that are wholly there. False when nothing of it is left.
+inline bool
+MessageReader::_KeepWholeItems(Field* field)
+{
+	if (fDamages == nullptr || field->count == 0)
+		return true;
+	const bool noted = field->size < field->stated;
+	if (!field->fixed)
+		return _KeepWholeVariableItems(field, noted);
+
+	const size_t itemSize = field->stated / field->count;
+	if (itemSize == 0)
+		return true;
+	if (!noted && field->stated % field->count != 0) {
+		_Fail(B_BAD_VALUE, field->data, "the items do not divide the field's data evenly");
+		_LeaveOut();
+	}
+	_Shorten(field, uint32(min_c(size_t(field->count), field->size / itemSize)));
+	field->size = field->count * itemSize;
+	return field->count > 0;
+}
+
+
+bool
+MessageReader::_KeepWholeVariableItems(Field* field, bool noted)
+{
+	const bool packed = (field->flags & MessageField::kPacked) != 0;
+	const uint8* at = field->data;
+	const uint8* end = at + field->size;
+	uint32 whole = 0;
+	for (; whole < field->count && end - at >= 5; whole++) {
+		const size_t size = _Number32(at);
+		const size_t bytes = packed ? size + 4 : padded_item_size(size);
+		if (size == 0 || bytes > size_t(end - at)) {
+			const size_t there = min_c(size, size_t(end - at) - 4);
+			if (there > 0)
+				fCutItems.push_back({ field->name, field->nameLength, field->type, at + 4, there });
+			break;
+		}
+		at += bytes;
+	}
+	if (whole == field->count && at == end)
+		return true;
+	if (!noted) {
+		_Fail(B_BAD_VALUE, at, "an item's size does not fit the field's data");
+		_LeaveOut();
+	}
+	_Shorten(field, whole);
+	field->size = size_t(at - field->data);
+	return whole > 0;
+}
+
+
 // #pragma mark - fields
 
 
@@ -482,9 +616,11 @@ MessageReader::_Take(const Field& field)
 bool
 MessageReader::_TakeReference(const Field& field)
 {
-	MessageField& taken = _NextField();
+	MessageField* next = _NextField();
+	if (next == nullptr)
+		return false;
+	MessageField& taken = *next;
 	taken.name = uint32(reinterpret_cast<const uint8*>(field.name) - fBytes);
-	taken.start = uint32(field.start - fBytes);
 	taken.data = uint32(field.data - fBytes);
 	taken.size = uint32(field.size);
 	taken.count = field.count;
@@ -514,17 +650,29 @@ MessageReader::_TakeReference(const Field& field)
 
 
 // Room for one more field, which counts when it is complete.
-inline MessageField&
+inline MessageField*
 MessageReader::_NextField()
 {
-	constexpr uint32 kFew = sizeof(fFewFields) / sizeof(fFewFields[0]);
-	if (fFieldCount < kFew)
-		return fFewFields[fFieldCount];
-	if (fManyFields.empty())
-		fManyFields.assign(fFewFields, fFewFields + kFew);
-	if (fFieldCount == fManyFields.size())
-		fManyFields.resize(fFieldCount * 2);
-	return fManyFields[fFieldCount];
+	if (fManyFields == nullptr && fFieldCount < kFewFields)
+		return fFewFields + fFieldCount;
+	if (fFieldCount == fManyRoom && !_ReserveFields(size_t(fFieldCount) * 2))
+		return nullptr;
+	return fManyFields + fFieldCount;
+}
+
+
+// Moves all fields to where that many have room.
+bool
+MessageReader::_ReserveFields(size_t count)
+{
+	void* fields = realloc(fManyFields, count * sizeof(MessageField));
+	if (fields == nullptr)
+		return _Fail(B_NO_MEMORY, size_t(0), "there is not enough memory");
+	if (fManyFields == nullptr)
+		memcpy(fields, fFewFields, fFieldCount * sizeof(MessageField));
+	fManyFields = static_cast<MessageField*>(fields);
+	fManyRoom = count;
+	return true;
 }
 
 
@@ -612,9 +760,11 @@ MessageReader::_Finish()
 	MessageData* data = fBuilt;
 	fBuilt = nullptr;
 	if (data == nullptr) {
-		const MessageField* fields = fManyFields.empty() ? fFewFields : fManyFields.data();
-		data = MessageData::CreateFrom(
-			fSource, fBytes, fields, fFieldCount, fLevel, fIsCompact ? fBodySize : 0);
+		const uint32 bodySize = fIsCompact ? fBodySize : 0;
+		data = fManyFields != nullptr
+			? MessageData::CreateAround(fSource, fBytes, fManyFields, fFieldCount, fLevel, bodySize)
+			: MessageData::CreateFrom(fSource, fBytes, fFewFields, fFieldCount, fLevel, bodySize);
+		fManyFields = nullptr;
 		// Whatever came of it, it has taken over the source and the tables.
 		fSource = nullptr;
 		fFieldCount = 0;

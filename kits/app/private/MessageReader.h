@@ -20,6 +20,19 @@ public:
 	MessageReader(const MessageReader&) = delete;
 	MessageReader& operator=(const MessageReader&) = delete;
 
+	// An item of which only the first bytes are there.
+	struct CutItem {
+		const char* name;
+		size_t nameLength;
+		type_code type;
+		const uint8* data;
+		size_t size;
+	};
+
+	// From now on damaged fields and items are noted and left out, and do not end the reading.
+	void Tolerate(std::vector<message_damage>* damages) { fDamages = damages; }
+	const std::vector<CutItem>& CutItems() const { return fCutItems; }
+
 	// A new reference, or NULL; then the status says why.
 	MessageData* Read();
 
@@ -36,6 +49,7 @@ private:
 		bool fixed;
 		const uint8* data;
 		size_t size;
+		size_t stated; // the size that the field claims
 		uint16 flags; // of MessageField
 		const uint8* start; // of the encoded field
 	};
@@ -49,12 +63,18 @@ private:
 	bool _ReadDanoSection(uint32 code, size_t position, size_t end);
 	bool _AddDanoItems(const Field& field, const uint8* items, size_t size, const uint8* ends);
 
+	bool _LeaveOut();
+	void _Shorten(Field* field, uint32 count);
+	bool _KeepWholeItems(Field* field);
+	bool _KeepWholeVariableItems(Field* field, bool noted);
 	bool _Take(const Field& field);
 	bool _TakeReference(const Field& field);
 	bool _TakeSwapped(const Field& field);
 	bool _CheckItems(const Field& field, uint64* table);
 	bool _AddSwappedItem(const Field& field, bool first, const uint8* item, size_t size);
-	MessageField& _NextField();
+	MessageField* _NextField();
+	bool _ReserveFields(size_t count);
+	size_t _CountR5Fields(size_t position) const;
 	MessageData* _Finish();
 	bool _Fail(status_t status, const uint8* where, const char* reason);
 	bool _Fail(status_t status, size_t offset, const char* reason);
@@ -71,8 +91,11 @@ private:
 	size_t fUsed = 0;
 	status_t fStatus = B_OK;
 	message_damage fDamage { 0, "" };
-	MessageField fFewFields[32];
-	std::vector<MessageField> fManyFields; // all of them, when there are more
+	std::vector<message_damage>* fDamages = nullptr; // borrowed; NULL: the first ends the reading
+	std::vector<CutItem> fCutItems;
+	MessageField fFewFields[32]; // kFewFields
+	MessageField* fManyFields = nullptr; // all of them, when there are more; from malloc()
+	size_t fManyRoom = 0;
 	uint32 fFieldCount = 0;
 	MessageData* fBuilt = nullptr; // fields that had to be copied
 	bool fIsCompact = false; // so far all fields are as the compact form has them

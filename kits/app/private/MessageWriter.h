@@ -42,14 +42,6 @@ append_bytes(uint8* to, const uint8* from, const uint8* end)
 }
 
 
-inline uint32
-r5_field_header_length(uint32 count, size_t size, message_form form)
-{
-	const bool mini = form == B_R5_FORM && count <= 255 && size <= 255;
-	return 1 + 4 + (count == 1 ? 0 : (mini ? 1 : 4)) + (mini ? 1 : 4) + 1;
-}
-
-
 // Bytes of the field's items as the R5 form pads them; messages among them as they are.
 size_t padded_field_size(const MessageData& data, const MessageField& field);
 

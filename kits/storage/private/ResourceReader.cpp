@@ -222,6 +222,8 @@ ResourceReader::_ReadEntries()
 	if (fStatus != B_OK) // then the size may be wrong; what the file has limits it
 		end = std::max(end, start + static_cast<off_t>(fCount) * kIndexEntrySize);
 	end = std::min(end, fFileSize);
+	if (end > start)
+		fEntries.reserve(std::min<off_t>(fCount, (end - start) / kIndexEntrySize));
 
 	std::string block;
 	for (off_t place = start; place + kIndexEntrySize <= end;) {

@@ -581,3 +581,150 @@ TEST(MessageForm, MessagesCanBePutIntoEachOtherWithoutEnd)
 		message = inner;
 	}
 }
+
+
+// #pragma mark - salvage
+
+
+namespace {
+
+BMessage
+panel_of_three()
+{
+	BMessage panel(5);
+	panel.AddString("class", "BView");
+	panel.AddInt32("numbers", 1);
+	panel.AddInt32("numbers", 2);
+	panel.AddInt32("numbers", 3);
+	for (const char* name : { "first", "second", "third" }) {
+		BMessage child;
+		child.AddString("class", "BButton");
+		child.AddString("_name", name);
+		child.AddString("_label", "Press this button");
+		panel.AddMessage("_views", &child);
+	}
+	panel.AddString("last", "the end");
+	return panel;
+}
+
+} // namespace
+
+
+TEST(MessageSalvage, AWholeMessageComesBackWhole)
+{
+	for (message_form form : { B_R5_FORM, B_R5_WIDE_FORM, B_HAIKU_FORM }) {
+		const std::string bytes = flatten(panel_of_three(), form);
+		BMessage message;
+		std::vector<message_damage> damages;
+		EXPECT_EQ(B_OK, salvage_message(&message, bytes.data(), bytes.size(), &damages));
+		EXPECT_TRUE(damages.empty());
+		EXPECT_TRUE(message.HasSameData(panel_of_three(), false, true));
+		EXPECT_EQ(bytes, flatten(message, form));
+	}
+}
+
+
+TEST(MessageSalvage, OfACutMessageTheStartIsLeft)
+{
+	for (message_form form : { B_R5_FORM, B_R5_WIDE_FORM, B_HAIKU_FORM }) {
+		const std::string bytes = flatten(panel_of_three(), form);
+		const size_t cut = bytes.find("third") - 60; // in the second child
+		BMessage message;
+		std::vector<message_damage> damages;
+		ASSERT_EQ(B_OK, salvage_message(&message, bytes.data(), cut, &damages));
+		EXPECT_FALSE(damages.empty());
+		for (const message_damage& damage : damages)
+			EXPECT_LE(damage.offset, cut);
+		EXPECT_STREQ("BView", message.FindString("class"));
+		EXPECT_EQ(3, message.FindInt32("numbers", 2));
+		BMessage child;
+		ASSERT_EQ(B_OK, message.FindMessage("_views", 0, &child));
+		EXPECT_STREQ("Press this button", child.FindString("_label"));
+		ASSERT_EQ(B_OK, message.FindMessage("_views", 1, &child));
+		EXPECT_STREQ("BButton", child.FindString("class"));
+		EXPECT_FALSE(message.HasString("last"));
+	}
+}
+
+
+TEST(MessageSalvage, ADamagedChildLosesItsOwnFieldsOnly)
+{
+	std::string bytes = flatten(panel_of_three(), B_R5_FORM);
+	const size_t name = bytes.find("second");
+	bytes[name - 4] = char(0xff); // the size of the text
+	bytes[name - 3] = char(0xff);
+	BMessage message;
+	EXPECT_EQ(B_OK, read(bytes, &message)); // it is the child that cannot be read
+	BMessage child;
+	EXPECT_NE(B_OK, message.FindMessage("_views", 1, &child));
+	std::vector<message_damage> damages;
+	ASSERT_EQ(B_OK, salvage_message(&message, bytes.data(), bytes.size(), &damages));
+	ASSERT_EQ(1u, damages.size());
+	EXPECT_EQ(name - 4, damages[0].offset);
+	ASSERT_EQ(B_OK, message.FindMessage("_views", 1, &child));
+	EXPECT_STREQ("BButton", child.FindString("class"));
+	EXPECT_FALSE(child.HasString("_name"));
+	EXPECT_STREQ("Press this button", child.FindString("_label"));
+	ASSERT_EQ(B_OK, message.FindMessage("_views", 2, &child));
+	EXPECT_STREQ("third", child.FindString("_name"));
+	EXPECT_STREQ("the end", message.FindString("last"));
+}
+
+
+TEST(MessageSalvage, NoCutAndNoFlippedBitDoesHarm)
+{
+	for (message_form form : { B_R5_FORM, B_HAIKU_FORM }) {
+		const std::string bytes = flatten(panel_of_three(), form);
+		const auto salvage = [&](const std::string& damaged) {
+			BMessage message;
+			if (salvage_message(&message, damaged.data(), damaged.size()) != B_OK)
+				return;
+			BMessage back;
+			ASSERT_EQ(B_OK, read(flatten(message, form), &back));
+			EXPECT_TRUE(back.HasSameData(message, false, true));
+		};
+		for (size_t length = 0; length < bytes.size(); length++)
+			salvage(bytes.substr(0, length));
+		for (size_t i = 0; i < bytes.size() * 8; i++) {
+			std::string flipped = bytes;
+			flipped[i / 8] = char(flipped[i / 8] ^ (1 << (i % 8)));
+			salvage(flipped);
+		}
+	}
+}
+
+
+TEST(MessageForm, NamesTooLongForOneFormAreCutInIt)
+{
+	// In the other byte order, so that the fields are copied.
+	std::string bytes = "1FMH"; // FMH1 of the big end
+	const auto put = [&](uint32 value) {
+		for (int shift = 24; shift >= 0; shift -= 8)
+			bytes += char(value >> shift);
+	};
+	put(7); // what
+	put(1); // valid
+	for (int i = 0; i < 6; i++)
+		put(0xffffffff);
+	put(301 + 4); // data
+	put(1); // fields
+	put(5);
+	for (int i = 0; i < 5; i++)
+		put(0xffffffff);
+	put(3 << 16 | 301); // flags and the name's length
+	put(B_INT32_TYPE);
+	put(1);
+	put(4);
+	put(0);
+	put(0xffffffff);
+	bytes += std::string(300, 'n') + '\0';
+	put(12345);
+	BMessage message;
+	ASSERT_EQ(B_OK, read(bytes, &message));
+	EXPECT_EQ(12345, message.FindInt32(std::string(300, 'n').c_str()));
+	message.AddInt32("next", 6);
+	BMessage back;
+	ASSERT_EQ(B_OK, read(flatten(message, B_R5_FORM), &back));
+	EXPECT_EQ(12345, back.FindInt32(std::string(255, 'n').c_str()));
+	EXPECT_EQ(6, back.FindInt32("next"));
+}

@@ -1,5 +1,6 @@
 #include <Control.h>
 
+#include <CheckBox.h>
 #include <Messenger.h>
 
 #include "ControlFixture.h"
@@ -270,4 +271,48 @@ TEST(Control, AnswersScriptsForItsProperties)
 	set.AddInt32("data", 5);
 	ASSERT_EQ(B_OK, messenger.SendMessage(&set, &reply));
 	fixture.Locked([&] { EXPECT_EQ(5, control->Value()); });
+}
+
+
+TEST(Control, ADisabledControlIsReachedByKeysAgainAfterAnArchive)
+{
+	ControlFixture fixture;
+	BMessage archive;
+	{
+		BCheckBox box(BRect(0, 0, 99, 19), "box", "Box", NULL);
+		ASSERT_EQ(B_OK, box.Archive(&archive));
+		EXPECT_FALSE(archive.HasBool("be:wants_nav"));
+		box.SetEnabled(false);
+		archive.MakeEmpty();
+		ASSERT_EQ(B_OK, box.Archive(&archive));
+		EXPECT_TRUE(archive.FindBool("be:wants_nav"));
+	}
+	const BMessage read(archive);
+	BCheckBox revived(&archive);
+	EXPECT_EQ(0u, revived.Flags() & B_NAVIGABLE);
+	BMessage again;
+	ASSERT_EQ(B_OK, revived.Archive(&again));
+	EXPECT_TRUE(again.HasSameData(read, true, true));
+
+	revived.SetEnabled(true);
+	EXPECT_NE(0u, revived.Flags() & B_NAVIGABLE);
+}
+
+
+TEST(Control, DisablingARevivedControlSaysThatItWasReachedByKeys)
+{
+	ControlFixture fixture;
+	BMessage archive;
+	{
+		BCheckBox box(BRect(0, 0, 99, 19), "box", "Box", NULL);
+		ASSERT_EQ(B_OK, box.Archive(&archive));
+	}
+	BCheckBox revived(&archive);
+	revived.SetEnabled(false);
+	BMessage again;
+	ASSERT_EQ(B_OK, revived.Archive(&again));
+	EXPECT_TRUE(again.FindBool("be:wants_nav"));
+	BCheckBox second(&again);
+	second.SetEnabled(true);
+	EXPECT_NE(0u, second.Flags() & B_NAVIGABLE);
 }

@@ -1,3 +1,4 @@
+#include <string.h>
 #include <sys/stat.h>
 #include <sys/xattr.h>
 #include <unistd.h>
@@ -8,7 +9,9 @@
 #include <vector>
 
 #include <ByteOrder.h>
+#include <DataIO.h>
 #include <File.h>
+#include <ResourceForm.h>
 #include <Resources.h>
 #include <TypeConstants.h>
 
@@ -695,4 +698,84 @@ TEST(BResources, MoreThanTenThousandAreRefused)
 	for (int32 i = 0; i < 10000; i++)
 		ASSERT_EQ(B_OK, resources.RemoveResource('MANY', i));
 	EXPECT_FALSE(resources.GetResourceInfo(0, NULL, NULL, NULL, NULL));
+}
+
+
+// #pragma mark - two resources of one type and id
+
+
+namespace {
+
+// A file whose second resource claims the first one's id.
+std::string
+TwinBytes()
+{
+	TemporaryFolder folder;
+	WriteFile(folder / "file", "");
+	{
+		BResources resources((folder / "file").c_str());
+		resources.AddResource('TWIN', 1, "one", 3, "first");
+		resources.AddResource('TWIN', 2, "the other", 9, "second");
+	}
+	std::string bytes = ReadFile(folder / "file");
+	constexpr size_t kBase = 4;
+	const auto word = [&](size_t at) {
+		uint32 value;
+		memcpy(&value, bytes.data() + at, 4);
+		return value;
+	};
+	const size_t table = kBase + word(kBase + 0x44 + 0x78);
+	const size_t size = word(kBase + 0x44 + 0x7c) - 8;
+	// The type, the first info with its name, the second info.
+	const size_t second = table + 4 + 10 + sizeof("first");
+	EXPECT_EQ(2u, word(second));
+	bytes[second] = 1;
+	uint32 sum = 0;
+	for (size_t i = 0; i < size; i += 4) {
+		uint32 number = 0;
+		for (size_t k = i; k < i + 4 && k < size; k++)
+			number = number << 8 | static_cast<uint8>(bytes[table + k]);
+		sum += number;
+	}
+	memcpy(bytes.data() + table + size, &sum, sizeof(sum));
+	return bytes;
+}
+
+} // namespace
+
+
+TEST(Resources, TheSecondOfTwoWithOneIdIsFoundByItsIndex)
+{
+	TemporaryFolder folder;
+	WriteFile(folder / "twins", TwinBytes());
+	BResources resources((folder / "twins").c_str());
+	ASSERT_EQ(B_OK, resources.InitCheck());
+	size_t size = 0;
+	const char* name = NULL;
+	EXPECT_TRUE(resources.GetResourceInfo(1, NULL, NULL, &name, &size));
+	EXPECT_STREQ("second", name);
+	EXPECT_EQ(9u, size);
+	EXPECT_EQ(0, memcmp("one", resources.LoadResource('TWIN', 1, &size), 3));
+	EXPECT_EQ(3u, size);
+	const void* data = load_resource(&resources, 1, &size);
+	ASSERT_NE(nullptr, data);
+	ASSERT_EQ(9u, size);
+	EXPECT_EQ(0, memcmp("the other", data, 9));
+	EXPECT_EQ(NULL, load_resource(&resources, 2, &size));
+	EXPECT_EQ(NULL, load_resource(&resources, -1, &size));
+}
+
+
+TEST(Resources, ASalvagedTwinGetsAnIdOfItsOwn)
+{
+	const std::string bytes = TwinBytes();
+	BMemoryIO stream(static_cast<const void*>(bytes.data()), bytes.size());
+	BResources readable;
+	EXPECT_EQ(B_OK, examine_resource_file(&stream, NULL, NULL, NULL, &readable));
+	size_t size = 0;
+	const void* data = readable.LoadResource('TWIN', "second", &size);
+	ASSERT_NE(nullptr, data);
+	EXPECT_EQ(9u, size);
+	EXPECT_TRUE(readable.HasResource('TWIN', 1));
+	EXPECT_TRUE(readable.HasResource('TWIN', 2));
 }

@@ -9,6 +9,7 @@
 
 #include <File.h>
 #include <Message.h>
+#include <MessageForm.h>
 #include <Resources.h>
 
 #include "JsonValue.h"
@@ -198,6 +199,62 @@ TEST(Arcv, CheckLooksIntoMessages)
 	EXPECT_THAT(result.output, HasSubstr("ARCV:1: "));
 	EXPECT_THAT(result.output, HasSubstr("ARCV:2: this is no flattened message"));
 	EXPECT_THAT(result.output, Not(HasSubstr("TEXT:3: ")));
+}
+
+
+TEST(Arcv, CheckSavesTheFieldsOfADamagedMessage)
+{
+	TemporaryFolder folder;
+	BMessage message('test');
+	message.AddString("text", "a text before the damage");
+	message.AddInt32("number", 5);
+	message.AddString("late", "a text that will be cut");
+	const std::string bytes = Flatten(message);
+	WriteFile(folder / "file", "");
+	{
+		BResources resources((folder / "file").c_str());
+		resources.AddResource('ARCV', 1, bytes.data(), bytes.size() - 30, "panel");
+		resources.AddResource('TEXT', 3, "some text", 9, "other");
+	}
+	const ProgramResult result =
+		RunArcv({ "check", folder / "file", "--repair", folder / "repaired" });
+	EXPECT_EQ(1, result.status) << result.errors;
+	EXPECT_THAT(result.output, HasSubstr("ARCV:1: 2 fields can be read: text number\n"));
+	EXPECT_EQ(0, RunArcv({ "check", folder / "repaired" }).status);
+	BResources repaired((folder / "repaired").c_str());
+	size_t size = 0;
+	const void* data = repaired.LoadResource('ARCV', 1, &size);
+	BMessage saved;
+	ASSERT_EQ(B_OK, unflatten_message(&saved, data, size));
+	EXPECT_STREQ("a text before the damage", saved.FindString("text"));
+	EXPECT_EQ(5, saved.FindInt32("number"));
+	EXPECT_TRUE(repaired.HasResource('TEXT', "other"));
+
+	// The same of a file that is one message.
+	WriteFile(folder / "message", bytes.substr(0, bytes.size() - 30));
+	const ProgramResult alone =
+		RunArcv({ "check", folder / "message", "--repair", folder / "message repaired" });
+	EXPECT_EQ(1, alone.status) << alone.errors;
+	EXPECT_THAT(alone.output, HasSubstr("2 fields can be read: text number\n"));
+	EXPECT_EQ(0, RunArcv({ "check", folder / "message repaired" }).status);
+	EXPECT_THAT(RunArcv({ "dump", folder / "message repaired" }).output, HasSubstr("number = 5"));
+}
+
+
+TEST(Arcv, OfTwinsBothAreShown)
+{
+	TemporaryFolder folder;
+	const std::string twins = ARCHWAY_SOURCES "/tests/fuzz/seeds/ResourceFuzzer/made-x86-twins";
+	const ProgramResult check = RunArcv({ "check", twins, "--repair", folder / "repaired" });
+	EXPECT_EQ(1, check.status);
+	EXPECT_THAT(check.output, HasSubstr("TWIN:1: there is one of this type and id already"));
+	BResources repaired((folder / "repaired").c_str());
+	size_t size = 0;
+	const void* data = repaired.LoadResource('TWIN', 2, &size);
+	ASSERT_NE(nullptr, data);
+	EXPECT_EQ("the other", std::string(static_cast<const char*>(data), size));
+	EXPECT_EQ(0, RunArcv({ "diff", twins, twins }).status);
+	EXPECT_EQ(3, RunArcv({ "convert", "--form", "r5", twins, "-o", folder / "converted" }).status);
 }
 
 

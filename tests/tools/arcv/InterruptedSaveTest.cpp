@@ -37,8 +37,8 @@ struct Interruption {
 			const std::string target = _Prepare();
 			unlink((folder / "report").c_str());
 			const ProgramResult result = _Save(target,
-				{ _Preload(), "FAILING_CALL=" + std::to_string(call), "FAILING_HOW=" + how,
-					"FAILING_REPORT=" + (folder / "report") });
+				{ _Preload(), _SanitizerOptions(), "FAILING_CALL=" + std::to_string(call),
+					"FAILING_HOW=" + how, "FAILING_REPORT=" + (folder / "report") });
 			const std::string report = ReadFile(folder / "report");
 			if (report.empty())
 				return;
@@ -56,6 +56,14 @@ private:
 	{
 		const char* others = getenv("LD_PRELOAD");
 		const std::string own = "LD_PRELOAD=" ARCHWAY_FAILING_CALLS;
+		return others != NULL && others[0] != '\0' ? own + ":" + others : own;
+	}
+
+	// The address sanitizer minds libraries that are loaded before its own, unless it is told.
+	static std::string _SanitizerOptions()
+	{
+		const char* others = getenv("ASAN_OPTIONS");
+		const std::string own = "ASAN_OPTIONS=verify_asan_link_order=0";
 		return others != NULL && others[0] != '\0' ? own + ":" + others : own;
 	}
 
