@@ -1,8 +1,9 @@
 #include "addon/PalettePresence.h"
 
+#include <algorithm>
 #include <mutex>
 
-#include <Point.h>
+#include <Screen.h>
 
 #include "palette/WidgetWindow.h"
 
@@ -12,7 +13,22 @@ namespace {
 // Editors live in windows with threads of their own. The palette's thread never takes this.
 std::mutex sMutex;
 
-const BPoint kPaletteLeftTop(800, 400); // on the screen
+const BPoint kPaletteLeftTop(800, 400); // on the screen, if it is large enough
+constexpr float kFrameWidth = 6; // of the desktop's frames, at most
+constexpr float kTitleHeight = 26;
+
+
+// A small screen shows all of the palette, its title before all.
+void
+MoveOntoScreen(BWindow* window)
+{
+	const BRect screen = BScreen().Frame();
+	const BRect frame = window->Frame();
+	const float left = std::min(frame.left, screen.right - kFrameWidth - frame.Width());
+	const float top = std::min(frame.top, screen.bottom - kFrameWidth - frame.Height());
+	window->MoveTo(
+		std::max(screen.left + kFrameWidth, left), std::max(screen.top + kTitleHeight, top));
+}
 
 
 } // namespace
@@ -26,6 +42,7 @@ EnterPalette()
 	if (widgetWindow == nullptr) {
 		widgetWindow = new WidgetWindow(kPaletteLeftTop);
 		widgetWindow->Lock();
+		MoveOntoScreen(widgetWindow);
 		widgetWindow->Show();
 		widgetWindow->Unlock();
 	}

@@ -1,9 +1,12 @@
 #include "archive/ViewDrag.h"
 
+#include <atomic>
 #include <vector>
 
 #include <AppDefs.h>
+#include <Application.h>
 #include <Bitmap.h>
+#include <Cursor.h>
 #include <Directory.h>
 #include <Entry.h>
 #include <File.h>
@@ -25,6 +28,10 @@ constexpr int32 kDraggedResourceID = 1;
 constexpr uint32 kColorBits = 0x00ffffff;
 constexpr uint32 kOpaque = 0xff000000;
 constexpr uint32 kTranslucent = 0xc0000000;
+
+
+// The program has one pointer.
+std::atomic<bool> sShowsDragPointer { false };
 
 
 // Pure black and pure white stay opaque; this asymmetry is wanted.
@@ -76,6 +83,23 @@ MakeDragMessage(const BView* view, BMessage* drag)
 	BMessage archive(kDroppedView);
 	const status_t status = view->Archive(&archive, true);
 	return status == B_OK ? drag->AddMessage(kDroppedViewField, &archive) : status;
+}
+
+
+void
+ShowDragPointer(bool accepts)
+{
+	sShowsDragPointer = true;
+	const BCursor cursor(accepts ? B_CURSOR_ID_GRABBING : B_CURSOR_ID_NOT_ALLOWED);
+	be_app->SetCursor(&cursor);
+}
+
+
+void
+EndDragPointer()
+{
+	if (sShowsDragPointer.exchange(false))
+		be_app->SetCursor(B_CURSOR_SYSTEM_DEFAULT);
 }
 
 

@@ -22,6 +22,11 @@ BBitmap* MakeDragImage(BView* view, const std::function<void()>& whileAttached =
 // Makes the message that carries a deep archive of the view to work areas and file managers.
 status_t MakeDragMessage(const BView* view, BMessage* drag);
 
+// The pointer while a view is dragged tells whether what is below takes it. The drag's source shows
+// and ends it, and whoever takes views shows it while the pointer is there. Any thread.
+void ShowDragPointer(bool accepts);
+void EndDragPointer();
+
 // Carries out a file manager's B_COPY_TARGET reply to such a drag: writes the view into the file
 // that the file manager has made.
 status_t WriteDraggedView(BMessage* reply);

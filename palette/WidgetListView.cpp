@@ -63,7 +63,26 @@ WidgetListView::InitiateDrag(BPoint where, int32 index, bool wasSelected)
 	BBitmap* image = MakeDragImage(sample.get(), [&sample] { FinishAttachedSample(sample.get()); });
 	BMessage drag;
 	MakeDragMessage(sample.get(), &drag);
+	SetEventMask(B_POINTER_EVENTS); // the button is released elsewhere
+	ShowDragPointer(false);
 	DragMessage(
 		&drag, image, B_OP_ALPHA, BPoint(bounds.Width() / 2, bounds.Height() / 2), Window());
 	return true;
+}
+
+
+void
+WidgetListView::MouseUp(BPoint where)
+{
+	BOutlineListView::MouseUp(where);
+	SetEventMask(0);
+	EndDragPointer();
+}
+
+
+void
+WidgetListView::DetachedFromWindow()
+{
+	EndDragPointer();
+	BOutlineListView::DetachedFromWindow();
 }

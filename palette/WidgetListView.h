@@ -15,6 +15,8 @@ public:
 
 	// Drags a new sample of the item's kind; the replies go to the window.
 	bool InitiateDrag(BPoint where, int32 index, bool wasSelected) override;
+	void MouseUp(BPoint where) override;
+	void DetachedFromWindow() override;
 
 private:
 	std::vector<std::unique_ptr<BStringItem>> fItems; // a list does not own its items

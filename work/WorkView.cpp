@@ -73,6 +73,14 @@ WorkView::AttachedToWindow()
 
 
 void
+WorkView::DetachedFromWindow()
+{
+	EndDragPointer();
+	BScrollView::DetachedFromWindow();
+}
+
+
+void
 WorkView::FrameResized(float width, float height)
 {
 	BScrollView::FrameResized(width, height);
@@ -117,6 +125,7 @@ void
 WorkView::MouseUp(BPoint where)
 {
 	SetEventMask(0, 0);
+	EndDragPointer();
 	fResizing = false;
 }
 
@@ -319,6 +328,8 @@ WorkView::_BeginMove(BView* view, BPoint where, bool copy)
 	if (kFramesFollowScrolling)
 		MoveScrolledViews(view, false);
 	MakeDragMessage(view, &drag);
+	SetEventMask(B_POINTER_EVENTS, 0); // the button is released elsewhere
+	ShowDragPointer(true);
 	DragMessage(&drag, image, B_OP_ALPHA, where, this);
 
 	fTaken.reset();

@@ -22,6 +22,7 @@ public:
 	WorkView(BRect frame, uint32 resizingMode, BHandler* editor);
 
 	void AttachedToWindow() override;
+	void DetachedFromWindow() override;
 	void FrameResized(float width, float height) override;
 	void KeyDown(const char* bytes, int32 numBytes) override;
 	void MessageReceived(BMessage* message) override;

@@ -145,6 +145,7 @@ void
 WorkView::HandleFilteredDrop(BMessage* message, BView* target)
 {
 	DumpMessage(message, 0);
+	EndDragPointer();
 	if (_PutBack(message))
 		return;
 

@@ -6,6 +6,7 @@
 #include <Window.h>
 
 #include "archive/EditorCodes.h"
+#include "archive/ViewDrag.h"
 #include "archive/ViewTree.h"
 #include "work/WorkBackgroundView.h"
 #include "work/WorkView.h"
@@ -93,6 +94,22 @@ EntersWithDrag(const BMessage* message)
 }
 
 
+// What is dragged from the desktop has the desktop's pointer.
+void
+FollowDragPointer(const BMessage* message, bool overDesign)
+{
+	BMessage dragged;
+	if (message->FindMessage("be:drag_message", &dragged) != B_OK) {
+		EndDragPointer();
+		return;
+	}
+	int32 transit;
+	if (overDesign && dragged.HasMessage(kDroppedViewField)
+		&& message->FindInt32("be:transit", &transit) == B_OK)
+		ShowDragPointer(transit == B_ENTERED_VIEW || transit == B_INSIDE_VIEW);
+}
+
+
 filter_result
 FilterPress(WorkView* workView, BMessage* message, BView* view)
 {
@@ -129,7 +146,10 @@ WorkViewFilter(BMessage* message, BHandler** target, BMessageFilter* filter)
 	}
 
 	BView* view = dynamic_cast<BView*>(*target);
-	if (LiveViewAttached(workView->Container(), view) == nullptr)
+	const bool overDesign = LiveViewAttached(workView->Container(), view) != nullptr;
+	if (message->what == B_MOUSE_MOVED)
+		FollowDragPointer(message, overDesign);
+	if (!overDesign)
 		return B_DISPATCH_MESSAGE;
 
 	if (IsDropCode(message->what)) {

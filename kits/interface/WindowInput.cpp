@@ -219,10 +219,13 @@ WindowInternals::_RouteMove(BMessage* message)
 	_NotePointer(*event);
 
 	const bool changed = view != mouseView;
+	const bool drags = event->HasInt32("_msg_what_");
+	const bool otherCursor = changed || drags != dragOver;
+	dragOver = drags;
 	leftView = changed ? mouseView : nullptr;
 	mouseView = view;
 	enteredView = changed ? view : nullptr;
-	if (changed)
+	if (otherCursor)
 		ApplyCursor();
 
 	bool delivered = _DeliverToMasks(*event, view, true);

@@ -304,14 +304,18 @@ WindowInternals::ApplyCursor()
 {
 	if (server == nullptr)
 		return;
-	for (const BView* view = mouseView; view != nullptr; view = view->Parent()) {
+	// While something is dragged the program's pointer shows, for a view's tells of pressing it.
+	for (const BView* view = dragOver ? nullptr : mouseView; view != nullptr;
+		 view = view->Parent()) {
 		const ViewExtras* extras = ViewPrivate(view).Extras();
 		if (extras != nullptr && extras->cursor != nullptr) {
 			server->SetCursor(CursorPrivate::Shape(*extras->cursor));
 			return;
 		}
 	}
-	server->SetCursor(CursorShape());
+	CursorShape programs;
+	programs.id = CursorShape::kProgram;
+	server->SetCursor(programs);
 }
 
 

@@ -267,6 +267,15 @@ Desktop::Picture(BRect screen)
 }
 
 
+CursorShape
+Desktop::CursorAt(BPoint screen)
+{
+	CursorShape shape;
+	RunOnDisplay([&] { shape = fThread->CursorAt(screen); });
+	return shape;
+}
+
+
 status_t
 Desktop::SavePicture(const char* path, BRect screen)
 {

@@ -9,6 +9,7 @@
 #include <Point.h>
 #include <Rect.h>
 
+#include "server/CursorShape.h"
 #include "server/ScreenPicture.h"
 
 namespace BPrivate {
@@ -19,7 +20,6 @@ class Inspector;
 class ServerWindow;
 class Worker;
 struct BackendEvent;
-struct CursorShape;
 
 
 constexpr uint32 kClipboardChanged = 'CLCH';
@@ -95,6 +95,7 @@ public:
 	// At the backend's own entry. The id is of the window that the event names, 0 for none.
 	void Inject(const BackendEvent& event, uint32 window = 0);
 	ScreenPicture Picture(BRect screen);
+	CursorShape CursorAt(BPoint screen); // of the pointer when it is there
 	status_t SavePicture(const char* path, BRect screen); // PNG
 	void OpenFile(const char* path); // what the desktop does when a file is opened
 	// Borrowed; NULL before it goes, which waits until nobody is using it.

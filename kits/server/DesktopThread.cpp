@@ -382,6 +382,14 @@ DesktopThread::SetProgramCursor(const CursorShape& shape)
 }
 
 
+CursorShape
+DesktopThread::CursorAt(BPoint screen) const
+{
+	const WindowReference window = WindowAt(screen);
+	return window != nullptr && window->hasCursor ? window->cursor : fProgramCursor;
+}
+
+
 void
 DesktopThread::SetWindowCursor(const WindowReference& window, const CursorShape& shape)
 {

@@ -73,6 +73,7 @@ public:
 	void RemoveLater(const std::string& folder) { fFolders.push_back(folder); }
 
 	// The window's own cursor, else the program's.
+	CursorShape CursorAt(BPoint screen) const;
 	void SetProgramCursor(const CursorShape& shape);
 	void SetWindowCursor(const WindowReference& window, const CursorShape& shape);
 

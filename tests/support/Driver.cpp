@@ -385,6 +385,14 @@ Driver::CountBeeps()
 // #pragma mark - pictures
 
 
+int32
+Driver::CursorAt(BPoint screen)
+{
+	_Wait();
+	return Desktop::Get()->CursorAt(screen).id;
+}
+
+
 rgb_color
 Driver::PixelAt(BPoint screen)
 {

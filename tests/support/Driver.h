@@ -74,6 +74,8 @@ public:
 	// What the user has heard so far.
 	static int32 CountBeeps();
 
+	// The platform's id of the pointer's shape there.
+	int32 CursorAt(BPoint screen);
 	rgb_color PixelAt(BPoint screen); // of what the screen shows; scale 1
 	rgb_color PixelAt(BView* view, BPoint where);
 	bool Screenshot(const char* path); // PNG

@@ -111,6 +111,7 @@ public:
 
 	BView* focus = nullptr; // borrowed, as are the following
 	BView* mouseView = nullptr;
+	bool dragOver = false; // the last movement had something dragged
 	BButton* defaultButton = nullptr;
 	BView* defaultButtonView = nullptr; // the same
 	BMenuBar* keyMenuBar = nullptr;
