@@ -10,9 +10,9 @@ class BButton;
 class BInvoker;
 class BTextView;
 
-enum alert_type { B_EMPTY_ALERT = 0, B_INFO_ALERT, B_IDEA_ALERT, B_WARNING_ALERT, B_STOP_ALERT };
+enum alert_type : uint32 { B_EMPTY_ALERT = 0, B_INFO_ALERT, B_IDEA_ALERT, B_WARNING_ALERT, B_STOP_ALERT };
 
-enum button_spacing { B_EVEN_SPACING = 0, B_OFFSET_SPACING };
+enum button_spacing : uint32 { B_EVEN_SPACING = 0, B_OFFSET_SPACING };
 
 
 // The rightmost button is the default button. Go() deletes the alert.

@@ -6,7 +6,7 @@
 class BTextControl;
 
 // The number of columns of the matrix of 256 cells.
-enum color_control_layout {
+enum color_control_layout : uint32 {
 	B_CELLS_4x64 = 4,
 	B_CELLS_8x32 = 8,
 	B_CELLS_16x16 = 16,

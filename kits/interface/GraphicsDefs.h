@@ -171,7 +171,7 @@ status_t get_pixel_size_for(
 enum buffer_orientation { B_BUFFER_TOP_TO_BOTTOM, B_BUFFER_BOTTOM_TO_TOP };
 enum buffer_layout { B_BUFFER_NONINTERLEAVED = 1 };
 
-enum drawing_mode {
+enum drawing_mode : uint32 {
 	B_OP_COPY,
 	B_OP_OVER,
 	B_OP_ERASE,
@@ -185,9 +185,9 @@ enum drawing_mode {
 	B_OP_ALPHA
 };
 
-enum source_alpha { B_PIXEL_ALPHA = 0, B_CONSTANT_ALPHA };
+enum source_alpha : uint32 { B_PIXEL_ALPHA = 0, B_CONSTANT_ALPHA };
 
-enum alpha_function {
+enum alpha_function : uint32 {
 	B_ALPHA_OVERLAY = 0,
 	B_ALPHA_COMPOSITE,
 	B_ALPHA_COMPOSITE_SOURCE_OVER = B_ALPHA_COMPOSITE,
@@ -216,9 +216,9 @@ enum {
 	B_OVERLAY_TRANSFER_CHANNEL = 0x00080000
 };
 
-enum join_mode { B_ROUND_JOIN = 0, B_MITER_JOIN, B_BEVEL_JOIN, B_BUTT_JOIN, B_SQUARE_JOIN };
+enum join_mode : uint32 { B_ROUND_JOIN = 0, B_MITER_JOIN, B_BEVEL_JOIN, B_BUTT_JOIN, B_SQUARE_JOIN };
 
-enum cap_mode {
+enum cap_mode : uint32 {
 	B_ROUND_CAP = B_ROUND_JOIN,
 	B_BUTT_CAP = B_BUTT_JOIN,
 	B_SQUARE_CAP = B_SQUARE_JOIN

@@ -95,13 +95,14 @@ enum mode_focus_follows_mouse {
 	B_INSTANT_WARP_FOCUS_FOLLOWS_MOUSE = 2
 };
 
-enum border_style { B_PLAIN_BORDER, B_FANCY_BORDER, B_NO_BORDER };
+// Archives hold these as plain numbers, so each type has room for any of them.
+enum border_style : uint32 { B_PLAIN_BORDER, B_FANCY_BORDER, B_NO_BORDER };
 
-enum orientation { B_HORIZONTAL, B_VERTICAL };
+enum orientation : uint32 { B_HORIZONTAL, B_VERTICAL };
 
-enum button_width { B_WIDTH_AS_USUAL, B_WIDTH_FROM_WIDEST, B_WIDTH_FROM_LABEL };
+enum button_width : uint32 { B_WIDTH_AS_USUAL, B_WIDTH_FROM_WIDEST, B_WIDTH_FROM_LABEL };
 
-enum alignment {
+enum alignment : int32 {
 	B_ALIGN_LEFT = 0,
 	B_ALIGN_RIGHT,
 	B_ALIGN_CENTER,
@@ -110,7 +111,7 @@ enum alignment {
 	B_ALIGN_USE_FULL_WIDTH = -2
 };
 
-enum vertical_alignment {
+enum vertical_alignment : int32 {
 	B_ALIGN_TOP = 0x10,
 	B_ALIGN_MIDDLE = 0x20,
 	B_ALIGN_BOTTOM = 0x30,

@@ -11,7 +11,7 @@
 
 class BList;
 
-enum list_view_type { B_SINGLE_SELECTION_LIST, B_MULTIPLE_SELECTION_LIST };
+enum list_view_type : uint32 { B_SINGLE_SELECTION_LIST, B_MULTIPLE_SELECTION_LIST };
 
 
 // The items stay the program's: neither removal nor the destructor deletes them. Only those that

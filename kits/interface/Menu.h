@@ -19,7 +19,7 @@ class MenuAccess;
 class MenuTracker;
 } // namespace BPrivate
 
-enum menu_layout { B_ITEMS_IN_ROW = 0, B_ITEMS_IN_COLUMN, B_ITEMS_IN_MATRIX };
+enum menu_layout : uint32 { B_ITEMS_IN_ROW = 0, B_ITEMS_IN_COLUMN, B_ITEMS_IN_MATRIX };
 
 struct menu_info {
 	float font_size;

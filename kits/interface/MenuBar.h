@@ -7,7 +7,7 @@ namespace BPrivate {
 class MenuKeys;
 }
 
-enum menu_bar_border { B_BORDER_FRAME, B_BORDER_CONTENTS, B_BORDER_EACH_ITEM };
+enum menu_bar_border : uint32 { B_BORDER_FRAME, B_BORDER_CONTENTS, B_BORDER_EACH_ITEM };
 
 
 // The bar attached last becomes its window's key menu bar: its items' shortcuts work, and the

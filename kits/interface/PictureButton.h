@@ -3,7 +3,7 @@
 
 #include <Control.h>
 
-enum picture_button_behavior { B_ONE_STATE_BUTTON = 0, B_TWO_STATE_BUTTON = 1 };
+enum picture_button_behavior : uint32 { B_ONE_STATE_BUTTON = 0, B_TWO_STATE_BUTTON = 1 };
 
 
 // Pictures are not recorded or played on this platform. A button from an archive keeps the

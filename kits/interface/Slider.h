@@ -7,7 +7,7 @@ namespace BPrivate {
 class ArchiveWriter;
 }
 
-enum hash_mark_location {
+enum hash_mark_location : uint32 {
 	B_HASH_MARKS_NONE = 0,
 	B_HASH_MARKS_TOP = 1,
 	B_HASH_MARKS_LEFT = 1,
@@ -16,7 +16,7 @@ enum hash_mark_location {
 	B_HASH_MARKS_BOTH = 3
 };
 
-enum thumb_style { B_BLOCK_THUMB = 0, B_TRIANGLE_THUMB = 1 };
+enum thumb_style : uint32 { B_BLOCK_THUMB = 0, B_TRIANGLE_THUMB = 1 };
 
 
 // The modification message is sent at every change by mouse or keys, the control's own message

@@ -8,7 +8,7 @@
 #include <Rect.h>
 #include <View.h>
 
-enum window_type {
+enum window_type : uint32 {
 	B_UNTYPED_WINDOW = 0,
 	B_TITLED_WINDOW = 1,
 	B_MODAL_WINDOW = 3,
@@ -17,7 +17,7 @@ enum window_type {
 	B_FLOATING_WINDOW = 21
 };
 
-enum window_look {
+enum window_look : uint32 {
 	B_BORDERED_WINDOW_LOOK = 20,
 	B_NO_BORDER_WINDOW_LOOK = 19,
 	B_TITLED_WINDOW_LOOK = 1,
@@ -26,7 +26,7 @@ enum window_look {
 	B_FLOATING_WINDOW_LOOK = 7
 };
 
-enum window_feel {
+enum window_feel : uint32 {
 	B_NORMAL_WINDOW_FEEL = 0,
 	B_MODAL_SUBSET_WINDOW_FEEL = 2,
 	B_MODAL_APP_WINDOW_FEEL = 1,
