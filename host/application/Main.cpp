@@ -5,6 +5,8 @@
 #include <fstream>
 #include <string>
 
+#include <sys/mman.h>
+
 #include <CLI/CLI.hpp>
 
 #include "host/application/AddonRoster.h"
@@ -41,11 +43,12 @@ ParseItem(const std::string& text, EditorApplication::Options& options)
 }
 
 
-// A screenshot is taken by the shortest of all play scripts.
+// A screenshot is taken by the shortest of all play scripts, in a file that no folder shows.
 std::string
 WriteScreenshotScript(const std::string& picture)
 {
-	const std::string path = picture + ".play";
+	const int file = memfd_create("play", 0);
+	const std::string path = "/proc/self/fd/" + std::to_string(file);
 	std::ofstream(path) << "picture " << std::filesystem::absolute(picture).string() << "\nquit!\n";
 	return path;
 }
