@@ -150,6 +150,9 @@ LayoutInheritedView::LayoutInheritedView(
 LayoutInheritedView::LayoutInheritedView(BMessage* archive) :
 	LayoutInherited(ArchivedClassName(archive)), BView(archive)
 {
+	const char* name;
+	for (int32 i = 2; archive->FindString(kClassField, i, &name) == B_OK; i++)
+		fBaseClasses.AddString(kClassField, name);
 }
 
 
@@ -165,11 +168,13 @@ LayoutInheritedView::Instantiate(BMessage* archive)
 status_t
 LayoutInheritedView::Archive(BMessage* archive, bool deep) const
 {
-	// A placeholder has exactly two class names, whatever was read.
 	BView::Archive(archive, deep);
 	archive->RemoveName(kClassField);
 	archive->AddString(kClassField, kPlaceholderClass);
 	archive->AddString(kClassField, ClassName());
+	const char* name;
+	for (int32 i = 0; fBaseClasses.FindString(kClassField, i, &name) == B_OK; i++)
+		archive->AddString(kClassField, name);
 	return B_OK;
 }
 

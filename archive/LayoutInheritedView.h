@@ -2,6 +2,7 @@
 #pragma once
 
 #include <BeBuild.h>
+#include <Message.h>
 #include <Rect.h>
 #include <String.h>
 #include <View.h>
@@ -30,7 +31,8 @@ private:
 
 
 // A plain view that archives itself as two class names: its own, so that the editor revives it,
-// and the user's. SwapInheritedViews() exchanges them for the user's program.
+// and the user's. SwapInheritedViews() exchanges them for the user's program. Further names that an
+// archive has are carried along.
 class _EXPORT LayoutInheritedView : public LayoutInherited, public BView {
 public:
 	LayoutInheritedView(BRect frame, const char* name, uint32 resizingMode, uint32 flags);
@@ -40,4 +42,7 @@ public:
 	status_t Archive(BMessage* archive, bool deep = true) const override;
 
 	void Draw(BRect updateRect) override;
+
+private:
+	BMessage fBaseClasses; // the archived "class" entries behind the user's
 };

@@ -39,39 +39,18 @@ IsOfInterest(uint32 what)
 }
 
 
+// Whether the place, in the view's coordinates, shows the view and no other.
 bool
-ShowsAt(const BView* view, BPoint inParent)
+IsUnderPointer(BView* view, BPoint where)
 {
-	return !view->IsHidden() && view->Bounds().Contains(view->ConvertFromParent(inParent));
-}
-
-
-// Whether the place, in the view's coordinates, is in the view and neither in a child of it nor
-// another view's of the tree: where views overlap, the one that was added first gets the mouse.
-bool
-IsUnderPointer(BView* view, BPoint where, const BView* top)
-{
-	for (BView* child = view->ChildAt(0); child != nullptr; child = child->NextSibling()) {
-		if (ShowsAt(child, where))
-			return false;
-	}
-	for (; view != nullptr && view != top; view = view->Parent()) {
-		if (!view->Bounds().Contains(where))
-			return false;
-		where = view->ConvertToParent(where);
-		for (BView* other = view->PreviousSibling(); other != nullptr;
-			 other = other->PreviousSibling()) {
-			if (ShowsAt(other, where))
-				return false;
-		}
-	}
-	return true;
+	BWindow* window = view->Window();
+	return window->FindView(window->ConvertFromScreen(view->ConvertToScreen(where))) == view;
 }
 
 
 // Whether the view hears of a press or a key only because its archive asks for all of them.
 bool
-Overhears(const WorkView* workView, const BMessage* message, BView* view)
+Overhears(const BMessage* message, BView* view)
 {
 	if (IsKey(message->what))
 		return (view->EventMask() & B_KEYBOARD_EVENTS) != 0 && !view->IsFocus();
@@ -79,7 +58,7 @@ Overhears(const WorkView* workView, const BMessage* message, BView* view)
 	BPoint where;
 	return (view->EventMask() & B_POINTER_EVENTS) != 0
 		&& message->FindPoint("where", &where) == B_OK
-		&& !IsUnderPointer(view, where, workView->Container());
+		&& !IsUnderPointer(view, where);
 }
 
 
@@ -160,7 +139,7 @@ WorkViewFilter(BMessage* message, BHandler** target, BMessageFilter* filter)
 		return B_DISPATCH_MESSAGE;
 
 	if (message->what == B_MOUSE_DOWN || IsKey(message->what)) {
-		if (Overhears(workView, message, view))
+		if (Overhears(message, view))
 			return B_SKIP_MESSAGE;
 	}
 	if (message->what == B_MOUSE_DOWN)

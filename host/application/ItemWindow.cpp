@@ -1,11 +1,14 @@
 #include "host/application/ItemWindow.h"
 
+#include <cctype>
+
 #include <AppDefs.h>
 #include <Button.h>
 #include <Menu.h>
 #include <MenuBar.h>
 #include <MenuItem.h>
 #include <Message.h>
+#include <TextView.h>
 
 #include "host/application/AddonRoster.h"
 #include "host/application/BytesEditor.h"
@@ -53,6 +56,43 @@ HasItem(const BMenu* menu, const void* address)
 }
 
 
+// The item that a key pressed with Command stands for, in the menu or its submenus; NULL if none.
+BMenuItem*
+ItemForKey(const BMenu* menu, int32 key, uint32 modifiers)
+{
+	constexpr uint32 kTellingApart = B_SHIFT_KEY | B_OPTION_KEY;
+	for (int32 i = 0; BMenuItem* item = menu->ItemAt(i); i++) {
+		if (BMenu* submenu = item->Submenu()) {
+			if (BMenuItem* found = ItemForKey(submenu, key, modifiers))
+				return found;
+			continue;
+		}
+		uint32 needed;
+		const uchar shortcut = static_cast<uchar>(item->Shortcut(&needed));
+		if (shortcut != 0 && tolower(shortcut) == tolower(key)
+			&& ((needed ^ modifiers) & kTellingApart) == 0)
+			return item;
+	}
+	return nullptr;
+}
+
+
+// The same, in all menus of a view tree.
+BMenuItem*
+ItemForKey(const BView* view, int32 key, uint32 modifiers)
+{
+	if (const BMenu* menu = dynamic_cast<const BMenu*>(view)) {
+		if (BMenuItem* found = ItemForKey(menu, key, modifiers))
+			return found;
+	}
+	for (const BView* child = view->ChildAt(0); child != nullptr; child = child->NextSibling()) {
+		if (BMenuItem* found = ItemForKey(child, key, modifiers))
+			return found;
+	}
+	return nullptr;
+}
+
+
 bool
 LiesIn(const BView* view, const BView* tree)
 {
@@ -92,16 +132,20 @@ ItemWindow::Handle() const
 
 
 // The controls of an edited design are live. Their messages, even a quit request, mean nothing
-// here, and their default button does not take Enter from the panels.
+// here; their default button does not take Enter from the panels, nor their menus a shortcut.
 void
 ItemWindow::DispatchMessage(BMessage* message, BHandler* handler)
 {
 	if (handler == this && _IsFromDesign(message))
 		return;
 
-	if (message->what == B_KEY_DOWN && handler == DefaultButton() && CurrentFocus() != nullptr
-		&& fEditor != nullptr && LiesIn(DefaultButton(), fEditor->View()))
-		handler = CurrentFocus();
+	if (message->what == B_KEY_DOWN && fEditor != nullptr) {
+		if (_TakeShortcut(message))
+			return;
+		if (handler == DefaultButton() && CurrentFocus() != nullptr
+			&& LiesIn(DefaultButton(), fEditor->View()))
+			handler = CurrentFocus();
+	}
 
 	if (message->what == B_RESOURCE_DATA_CHANGED && fEditor != nullptr && fEditsObject
 		&& handler == fEditor->View() && !_WhyUnfit().empty()) {
@@ -114,6 +158,19 @@ ItemWindow::DispatchMessage(BMessage* message, BHandler* handler)
 		return;
 	}
 	BWindow::DispatchMessage(message, handler);
+}
+
+
+// The text commands go to the field that has the keyboard.
+void
+ItemWindow::MenusBeginning()
+{
+	BTextView* text = dynamic_cast<BTextView*>(CurrentFocus());
+	for (const uint32 command : { B_CUT, B_COPY, B_PASTE, B_SELECT_ALL }) {
+		BMenuItem* item = fEditMenu->FindItem(command);
+		item->SetTarget(text);
+		item->SetEnabled(text != nullptr);
+	}
 }
 
 
@@ -188,7 +245,13 @@ ItemWindow::_AddMenuBar()
 	menu = new BMenu("Edit");
 	menu->AddItem(new BMenuItem("Undo", new BMessage(kUndoStep), 'Z'));
 	menu->AddItem(new BMenuItem("Redo", new BMessage(kRedoStep), 'Z', B_SHIFT_KEY));
+	menu->AddSeparatorItem();
+	menu->AddItem(new BMenuItem("Cut", new BMessage(B_CUT), 'X'));
+	menu->AddItem(new BMenuItem("Copy", new BMessage(B_COPY), 'C'));
+	menu->AddItem(new BMenuItem("Paste", new BMessage(B_PASTE), 'V'));
+	menu->AddItem(new BMenuItem("Select All", new BMessage(B_SELECT_ALL), 'A'));
 	fMenuBar->AddItem(menu);
+	fEditMenu = menu;
 
 	AddChild(fMenuBar);
 	SetKeyMenuBar(fMenuBar);
@@ -309,4 +372,25 @@ ItemWindow::_IsFromDesign(const BMessage* message) const
 {
 	void* source;
 	return message->FindPointer("source", &source) == B_OK && !HasItem(fMenuBar, source);
+}
+
+
+// Carries out a shortcut of this window's own menus, and drops one that only the design has. All
+// other keys are left to the window.
+bool
+ItemWindow::_TakeShortcut(const BMessage* message)
+{
+	int32 key, modifiers;
+	if (message->FindInt32("raw_char", &key) != B_OK
+		|| message->FindInt32("modifiers", &modifiers) != B_OK
+		|| (modifiers & B_COMMAND_KEY) == 0)
+		return false;
+
+	if (BMenuItem* own = ItemForKey(fMenuBar, key, modifiers)) {
+		MenusBeginning();
+		static_cast<BInvoker*>(own)->Invoke();
+		MenusEnded();
+		return true;
+	}
+	return ItemForKey(fEditor->View(), key, modifiers) != nullptr;
 }

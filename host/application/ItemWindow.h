@@ -9,6 +9,7 @@
 
 #include "host/library/ResourceHandle.h"
 
+class BMenu;
 class HandlerSet;
 class ResourceDocument;
 
@@ -28,6 +29,7 @@ public:
 	const BResEditor::BResourceHandle& Handle() const;
 
 	void DispatchMessage(BMessage* message, BHandler* handler) override;
+	void MenusBeginning() override;
 	void MessageReceived(BMessage* message) override;
 	bool QuitRequested() override;
 	void Quit() override;
@@ -42,12 +44,14 @@ private:
 	bool _ItemIsGone() const;
 	std::string _WhyUnfit() const;
 	bool _IsFromDesign(const BMessage* message) const;
+	bool _TakeShortcut(const BMessage* message);
 
 	BMessenger fFileWindow;
 	ResourceDocument* fDocument; // borrowed
 	HandlerSet* fHandlers; // borrowed
 	BResEditor::BResourceHandle fHandle;
 	BMenuBar* fMenuBar; // child
+	BMenu* fEditMenu; // in the menu bar
 	std::unique_ptr<BResEditor::BFullItemEditor> fEditor;
 	bool fEditsObject; // the editor is an add-on's
 	BMessenger fFormerFocus; // the view to give the focus back to after a save

@@ -4,6 +4,7 @@
 #include <algorithm>
 #include <cctype>
 #include <cstring>
+#include <span>
 
 #include <AppDefs.h>
 #include <Application.h>
@@ -29,16 +30,35 @@ struct EditKey {
 	uint32 what;
 };
 
-// What the focus view is sent when neither a menu nor the program wants the key.
+// What the focus view is sent before any menu or shortcut is asked.
 constexpr EditKey kEditKeys[] = {
 	{ 'x', 0, B_CUT },
 	{ 'c', 0, B_COPY },
 	{ 'v', 0, B_PASTE },
 	{ 'a', 0, B_SELECT_ALL },
+};
+
+// What it is sent when neither a menu nor the program wants the key.
+constexpr EditKey kUndoKeys[] = {
 	{ 'z', 0, B_UNDO },
 	{ 'z', B_SHIFT_KEY, B_REDO },
 	{ 'y', 0, B_REDO },
 };
+
+
+// Returns whether the key is one of these and there is a view to send it to.
+bool
+send_edit_key(
+	std::span<const EditKey> keys, BWindow& window, BView* focus, uint32 raw, uint32 held)
+{
+	const auto found = std::find_if(keys.begin(), keys.end(), [raw, held](const EditKey& edit) {
+		return edit.key == raw && (edit.modifiers | B_COMMAND_KEY) == held;
+	});
+	if (focus == nullptr || found == keys.end())
+		return false;
+	window.PostMessage(found->what, focus);
+	return true;
+}
 
 
 uint32
@@ -213,6 +233,9 @@ WindowInternals::_HandleCommandKey(uint32 raw, uint32 typed, uint32 held)
 		return true;
 	}
 
+	if (send_edit_key(kEditKeys, window, focus, raw, held))
+		return true;
+
 	window.MenusBeginning();
 	bool found = MenuShortcuts::Send(&window, raw, held) || SendShortcut(raw, held);
 	// A sign that is typed with Shift is found by the sign as well.
@@ -220,14 +243,8 @@ WindowInternals::_HandleCommandKey(uint32 raw, uint32 typed, uint32 held)
 	if (!found && typed > ' ' && typed != raw && !std::isalpha(typed) && typed < 127)
 		found = MenuShortcuts::Send(&window, typed, plain) || SendShortcut(typed, plain);
 	window.MenusEnded();
-	if (found || focus == nullptr)
+	if (found || focus == nullptr || send_edit_key(kUndoKeys, window, focus, raw, held))
 		return true;
-	for (const EditKey& edit : kEditKeys) {
-		if (edit.key == raw && (edit.modifiers | B_COMMAND_KEY) == held) {
-			window.PostMessage(edit.what, focus);
-			return true;
-		}
-	}
 	return !is_motion_key(typed);
 }
 

@@ -1,16 +1,22 @@
 #include "EditorFixture.h"
 
+#include <cstring>
 #include <string>
 #include <vector>
 
 #include <Button.h>
+#include <DataIO.h>
+#include <File.h>
 #include <Message.h>
 #include <OS.h>
+#include <Resources.h>
 #include <TextControl.h>
 
+#include "archive/ViewArchive.h"
 #include "editors/EditView.h"
 #include "kernel/private/Debugger.h"
 #include "palette/WidgetWindow.h"
+#include "support/Dump.h"
 
 using namespace BResEditor;
 
@@ -265,4 +271,56 @@ TEST_F(ViewEditorTest, ANameTypedInThePanelReachesTheItem)
 	ASSERT_EQ(B_OK, archive.Unflatten(Bytes(item).data()));
 	ASSERT_EQ(B_OK, archive.FindMessage("_views", 1, &child));
 	EXPECT_STREQ("fresh", child.GetString("_name", ""));
+}
+
+
+// Its missing class name is written as an empty one.
+static bool
+IsNamelessPlaceholder(const BMessage& archive)
+{
+	const char* name;
+	return !archive.HasString("class", 1) && archive.FindString("class", &name) == B_OK
+		&& strcmp(name, "LayoutInheritedView") == 0;
+}
+
+
+// The tree is attached, drawn, archived again: nothing of that may show in the item.
+TEST_F(ViewEditorTest, ANewNameOfTheRootChangesNothingElseOfAnySample)
+{
+	if (test::samples_folder().empty())
+		GTEST_SKIP() << "there are no samples";
+	int views = 0;
+	for (const std::string& path : test::sample_files()) {
+		BFile file(path.c_str(), B_READ_ONLY);
+		BResources resources(&file);
+		int32 id;
+		const char* name;
+		size_t size;
+		for (int32 i = 0; resources.GetResourceInfo('ARCV', i, &id, &name, &size); i++) {
+			const char* data = static_cast<const char*>(resources.LoadResource('ARCV', id, &size));
+			BMessage before;
+			BMemoryIO original(data, size);
+			if (before.Unflatten(&original) != B_OK || IsNamelessPlaceholder(before))
+				continue;
+			SCOPED_TRACE(path + " ARCV:" + std::to_string(id));
+			Set(item, std::vector<char>(data, data + size));
+			Open();
+			if (workView->SelectedView() == NULL) {
+				Close();
+				continue;
+			}
+			person.Replace(ControlUser::Find<BTextControl>(Column(), "Name: "), "fresh");
+			window.driver.Key("Tab");
+			Close();
+
+			BMessage after;
+			ASSERT_EQ(B_OK, after.Unflatten(Bytes(item).data()));
+			EXPECT_STREQ("fresh", after.GetString("_name", ""));
+			before.RemoveName("_name");
+			after.RemoveName("_name");
+			EXPECT_TRUE(Equal(&before, &after));
+			views++;
+		}
+	}
+	EXPECT_LT(50, views);
 }

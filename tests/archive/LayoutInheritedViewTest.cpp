@@ -181,7 +181,7 @@ TEST(LayoutInheritedView, ArchivesTwoClassNames)
 }
 
 
-TEST(LayoutInheritedView, ArchivesAnEmptyNameAndDropsFurtherOnes)
+TEST(LayoutInheritedView, ArchivesAnEmptyNameAndCarriesFurtherOnesAlong)
 {
 	BMessage archive;
 	archive.AddString("class", "LayoutInheritedView");
@@ -195,7 +195,7 @@ TEST(LayoutInheritedView, ArchivesAnEmptyNameAndDropsFurtherOnes)
 	LayoutInheritedView named(&archive);
 	written.MakeEmpty();
 	named.Archive(&written, true);
-	EXPECT_EQ("LayoutInheritedView;Mine;", ClassesOf(written));
+	EXPECT_EQ("LayoutInheritedView;Mine;BView;", ClassesOf(written));
 }
 
 

@@ -52,7 +52,8 @@ void
 ControlUser::_EnterAndClear(BTextControl* field)
 {
 	fDriver.Click(field->TextView());
-	fDriver.Key("a", B_COMMAND_KEY);
+	fDriver.Key("Home");
+	fDriver.Key("End", B_SHIFT_KEY);
 	fDriver.Key("Delete");
 }
 
