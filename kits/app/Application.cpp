@@ -233,10 +233,10 @@ BApplication::_AskWindows()
 void
 BApplication::_EndWindows()
 {
-	for (BLooper* looper : LooperTable::AllWindows()) {
-		if (looper->LockWithTimeout(LooperPrivate::IsRunning(looper) ? B_INFINITE_TIMEOUT : 0)
-			== B_OK)
-			looper->Quit();
+	for (const auto& core : LooperTable::AllWindows()) {
+		// A window may end by itself meanwhile.
+		if (core->Lock(core->IsLooping() ? B_INFINITE_TIMEOUT : 0) == B_OK)
+			core->Looper()->Quit();
 	}
 }
 

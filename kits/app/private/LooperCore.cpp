@@ -575,15 +575,16 @@ LooperTable::NextWindow(const std::vector<std::shared_ptr<LooperCore>>& known)
 }
 
 
-std::vector<BLooper*>
+std::vector<std::shared_ptr<LooperCore>>
 LooperTable::AllWindows()
 {
 	Table& table = TheLoopers();
 	std::lock_guard lock(table.lock);
-	std::vector<BLooper*> windows;
+	std::vector<std::shared_ptr<LooperCore>> windows;
 	for (BLooper* looper : table.loopers) {
-		if (table.cores[looper]->IsWindow())
-			windows.push_back(looper);
+		const std::shared_ptr<LooperCore>& core = table.cores[looper];
+		if (core->IsWindow())
+			windows.push_back(core);
 	}
 	return windows;
 }

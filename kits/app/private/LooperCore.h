@@ -138,7 +138,7 @@ public:
 	static std::shared_ptr<LooperCore> NextWindow(
 		const std::vector<std::shared_ptr<LooperCore>>& known);
 	// Those that were never shown, too.
-	static std::vector<BLooper*> AllWindows();
+	static std::vector<std::shared_ptr<LooperCore>> AllWindows();
 };
 
 

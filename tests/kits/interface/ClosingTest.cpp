@@ -58,7 +58,7 @@ public:
 
 class Closing : public testing::Test {
 protected:
-	Closing() : other(new OtherWindow)
+	Closing() : other(new OtherWindow), otherTarget(other)
 	{
 		source = fixture.Add(new DragView(BRect(0, 0, 199, 199)));
 		other->Show();
@@ -68,9 +68,11 @@ protected:
 
 	~Closing() override { Close(other); }
 
+	// Does nothing if it is closed.
 	void Close(BWindow* window)
 	{
-		if (BMessenger(window).LockTarget())
+		const BMessenger target = window == other ? otherTarget : BMessenger(window);
+		if (target.LockTarget())
 			window->Quit();
 		Driver::WaitUntilIdle();
 	}
@@ -88,6 +90,7 @@ protected:
 	ControlFixture fixture;
 	DragView* source; // child
 	OtherWindow* other; // ends with the test, unless that closes it
+	const BMessenger otherTarget; // tells whether it is still there
 };
 
 } // namespace
