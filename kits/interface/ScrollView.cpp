@@ -420,7 +420,7 @@ BScrollView::GetPreferredSize(float* width, float* height)
 }
 
 
-// Takes the size that the target prefers, with the border and the bars around it.
+// It has no size of its own; one that is not attached is left alone altogether.
 void
 BScrollView::ResizeToPreferred()
 {

@@ -5,6 +5,7 @@
 #include <fstream>
 #include <iterator>
 #include <regex>
+#include <set>
 
 namespace {
 
@@ -195,14 +196,24 @@ EvidenceFor(const std::string& call)
 }
 
 
+// BView's are ViewTest, ViewTreeTest and so on, but not those of a class whose name goes on.
+bool
+IsOwnFile(const std::string& file, const KitClass& theClass)
+{
+	static const std::set<std::string> kLongerNames = { "MenuFieldTest", "MenuBarTest",
+		"MenuItemTest", "BitmapViewTest", "TabViewTest" };
+	const std::string base = theClass.name.substr(1);
+	return file == base + "Test" || (file.starts_with(base) && kLongerNames.count(file) == 0);
+}
+
+
 std::vector<std::string>
 TestsThatMatch(const std::vector<TestText>& tests, const KitClass& theClass,
 	const std::string& word, const std::regex& pattern)
 {
-	const std::string ownFile = theClass.name.substr(1) + "Test";
 	std::vector<std::string> own, others;
 	for (const TestText& test : tests) {
-		const bool isOwn = test.file == ownFile;
+		const bool isOwn = IsOwnFile(test.file, theClass);
 		// Looking for words first saves most of the slow searches.
 		if ((!isOwn && test.text.find(theClass.name) == std::string::npos)
 			|| test.text.find(word) == std::string::npos || !std::regex_search(test.text, pattern))
@@ -257,6 +268,9 @@ ReadTests()
 	const std::regex start("\nTEST(_[FP])?\\((\\w+),\\s*(\\w+)\\)");
 	for (const fs::path& path : files) {
 		const std::string text = ReadFile(path);
+		// What stands before the tests is for all of them.
+		tests.push_back({ path.stem().string() + " (what its tests share)", path.stem().string(),
+			text.substr(0, text.find("\nTEST")) });
 		for (std::sregex_iterator it(text.begin(), text.end(), start), end; it != end; ++it) {
 			const size_t at = static_cast<size_t>(it->position(0));
 			const size_t next = text.find("\nTEST", at + 1);
@@ -280,7 +294,7 @@ std::vector<std::string>
 TestsOfCall(const std::vector<TestText>& tests, const KitClass& theClass, const std::string& call)
 {
 	std::vector<std::string> result =
-		TestsThatMatch(tests, theClass, call, std::regex("(\\.|->|::)" + call + "\\("));
+		TestsThatMatch(tests, theClass, call, std::regex("[^A-Za-z0-9_]" + call + "\\("));
 	const std::string evidence = EvidenceFor(call);
 	if (result.empty() && !evidence.empty())
 		result = TestsThatMatch(tests, theClass, "", std::regex(evidence));
