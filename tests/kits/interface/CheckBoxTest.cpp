@@ -125,6 +125,6 @@ TEST(CheckBox, RevivesWhatItWrote)
 	ExpectRoundTrip(fixture, box);
 	box.SetValue(B_CONTROL_ON);
 	box.SetEnabled(false);
-	EXPECT_EQ("_msg _label _val _disable", OwnFieldNames(ArchiveOf(box)));
+	EXPECT_EQ("_msg _label _val _disable be:wants_nav", OwnFieldNames(ArchiveOf(box)));
 	ExpectRoundTrip(fixture, box);
 }

@@ -71,7 +71,7 @@ protected:
 	// Does nothing if it is closed.
 	void Close(BWindow* window)
 	{
-		const BMessenger target = window == other ? otherTarget : BMessenger(window);
+		const BMessenger& target = window == other ? otherTarget : fixture.target;
 		if (target.LockTarget())
 			window->Quit();
 		Driver::WaitUntilIdle();
@@ -111,7 +111,7 @@ TEST_F(Closing, TheSourceOfADragMayGo)
 {
 	DragOver();
 	fixture.Locked([&] { fixture.window->PostMessage(B_QUIT_REQUESTED); });
-	EXPECT_FALSE(BMessenger(fixture.window).IsValid());
+	EXPECT_FALSE(fixture.target.IsValid());
 	fixture.driver.MoveTo(BPoint(610, 150));
 	fixture.driver.Release();
 	other->Lock();
@@ -163,7 +163,7 @@ TEST_F(Closing, AWindowWithAnOpenMenuMayGo)
 	EXPECT_TRUE(fixture.Locked([&] { return submenu->Window() != NULL; }));
 
 	fixture.driver.CloseWindow(fixture.window);
-	EXPECT_FALSE(BMessenger(fixture.window).IsValid());
+	EXPECT_FALSE(fixture.target.IsValid());
 	EXPECT_EQ(1, fixture.app.CountWindows());
 	fixture.driver.Key("Return");
 	fixture.driver.Click(title);

@@ -36,7 +36,8 @@ public:
 
 class ControlFixture {
 public:
-	ControlFixture() : app("application/x-vnd.Archway-test"), window(new RecordingWindow)
+	ControlFixture() :
+		app("application/x-vnd.Archway-test"), window(new RecordingWindow), target(window)
 	{
 		ground = new BView(window->Bounds(), "ground", B_FOLLOW_ALL, B_WILL_DRAW);
 		ground->SetViewColor(216, 216, 216);
@@ -47,7 +48,7 @@ public:
 
 	~ControlFixture()
 	{
-		if (window->Lock())
+		if (target.LockTarget())
 			window->Quit();
 	}
 
@@ -99,6 +100,7 @@ public:
 
 	BApplication app;
 	RecordingWindow* window;
+	const BMessenger target; // the window; invalid when that is closed
 	BView* ground;
 	Driver driver;
 };
