@@ -12,6 +12,7 @@ namespace BPrivate {
 namespace {
 
 constexpr const char* kMark = "_managed_archive";
+constexpr int32 kMostTries = 4; // to find places for tabs' views; one is enough for sound archives
 constexpr const char* kObjects = "_managed_archivable";
 constexpr const char* kViews = "_views";
 constexpr const char* kTabs = "_l_items";
@@ -129,13 +130,17 @@ public:
 		status_t status = _FindTabViews(*archive);
 		if (status != B_OK)
 			return status;
-		BMessage nested = *archive;
-		fPlaced[0] = true;
-		nested.RemoveName(kMark);
-		nested.RemoveName(kObjects);
-		status = _ConvertObject(&nested, 0, 0);
-		if (status != B_OK)
-			return status;
+		BMessage nested;
+		do {
+			nested = *archive;
+			fPlaced.assign(fPlaced.size(), false);
+			fPlaced[0] = true;
+			nested.RemoveName(kMark);
+			nested.RemoveName(kObjects);
+			status = _ConvertObject(&nested, 0, 0);
+			if (status != B_OK)
+				return status;
+		} while (_GiveBackTabViews());
 		for (size_t token = 0; token < fPlaced.size(); token++)
 			fOrigin->hasForeignObjects |= !fPlaced[token];
 		MessagePrivate(archive).SetData(MessagePrivate(&nested).Data());
@@ -155,6 +160,20 @@ private:
 			_NoteTabViews(object);
 		}
 		return B_OK;
+	}
+
+	// A view that only an object without a place names as its tab's is a child like any other.
+	// Whether there is one; none is found twice.
+	bool _GiveBackTabViews()
+	{
+		bool found = false;
+		for (size_t token = 0; token < fPlaced.size(); token++) {
+			if (fIsTabView[token] && !fPlaced[token]) {
+				fIsTabView[token] = false;
+				found = true;
+			}
+		}
+		return found && fTries++ < kMostTries;
 	}
 
 	void _NoteTabViews(const BMessage& object)
@@ -213,6 +232,7 @@ private:
 	ManagedOrigin* fOrigin; // a reference
 	std::vector<bool> fPlaced; // by token
 	std::vector<bool> fIsTabView;
+	int32 fTries = 0;
 };
 
 

@@ -87,14 +87,26 @@ put_item(uint8* to, const ItemContents& item)
 		to[at] = 0;
 }
 
+// The head of most fields: one small item.
+void
+write_mini_head(uint8* to, const MessageField& field)
+{
+	*to = kR5Valid | kR5Mini | kR5Single | (field.Has(MessageField::kFixed) ? kR5Fixed : 0);
+	write_uint32(to + 1, field.type);
+	to[5] = uint8(field.size);
+	to[6] = uint8(field.nameLength);
+}
+
 } // namespace
 
 
 MessageData*
 MessageData::Create()
 {
-	constexpr uint32 kFirstRoom = 8;
-	return _CreateWithRoom(kFirstRoom);
+	// Enough for most views and messages, so that they take one block of memory and no copying.
+	constexpr uint32 kFirstRoom = 14;
+	constexpr uint32 kFirstStore = 384;
+	return _CreateWithRoom(kFirstRoom, kFirstStore);
 }
 
 
@@ -211,7 +223,8 @@ MessageData::~MessageData()
 	if (fFields != reinterpret_cast<MessageField*>(this + 1))
 		free(fFields);
 	free(fIndex);
-	free(fStore);
+	if (!fStoreIsInside)
+		free(fStore);
 	_Changed();
 	if (fSource != nullptr)
 		fSource->Release();
@@ -435,8 +448,11 @@ MessageData::AddField(
 	field.table = nullptr;
 	field.nameLength = uint16(length);
 	field.flags = fixed ? MessageField::kFixed : 0;
-	if (compact) {
-		field.flags |= MessageField::kCompact | (bytes > 255 ? MessageField::kWide : 0);
+	if (compact && bytes <= UINT8_MAX) {
+		field.flags |= MessageField::kCompact;
+		write_mini_head(fStore + start, field);
+	} else if (compact) {
+		field.flags |= MessageField::kCompact | MessageField::kWide;
 		write_r5_field_head(fStore + start, field, bytes, B_R5_FORM);
 	}
 	memcpy(fStore + field.name, name, length);
@@ -445,7 +461,10 @@ MessageData::AddField(
 	else
 		put_item(fStore + field.data, item);
 	fStoreSize = field.data + uint32(bytes);
-	_AddToIndex(fCount++);
+	fNameBits |= name_bit(field.key);
+	fCount++;
+	if (fIndex != nullptr || fCount > kFewFields)
+		_AddToIndex(fCount - 1);
 	return B_OK;
 }
 
@@ -913,14 +932,19 @@ MessageData::WritePlain(uint32 what, uint8* to) const
 
 
 MessageData*
-MessageData::_CreateWithRoom(uint32 fields)
+MessageData::_CreateWithRoom(uint32 fields, uint32 store)
 {
-	void* block = malloc(sizeof(MessageData) + fields * sizeof(MessageField));
+	void* block = malloc(sizeof(MessageData) + fields * sizeof(MessageField) + store);
 	if (block == nullptr)
 		return nullptr;
 	MessageData* data = new (block) MessageData;
 	data->fFields = reinterpret_cast<MessageField*>(data + 1);
 	data->fFieldRoom = fields;
+	if (store > 0) {
+		data->fStore = reinterpret_cast<uint8*>(data->fFields + fields);
+		data->fStoreRoom = store;
+		data->fStoreIsInside = true;
+	}
 	return data;
 }
 
@@ -962,11 +986,9 @@ MessageData::_ForgetDerived()
 
 
 bool
-MessageData::_ReserveFields(uint32 count)
+MessageData::_GrowFields(uint32 count)
 {
 	const uint32 needed = fCount + count;
-	if (needed <= fFieldRoom)
-		return true;
 	const uint32 room = max_c(needed, fFieldRoom * 2);
 	const bool isBehind = fFields == reinterpret_cast<MessageField*>(this + 1);
 	void* fields = realloc(isBehind ? nullptr : fFields, room * sizeof(MessageField));
@@ -981,18 +1003,19 @@ MessageData::_ReserveFields(uint32 count)
 
 
 bool
-MessageData::_ReserveStore(size_t size)
+MessageData::_GrowStore(size_t size)
 {
-	if (size <= fStoreRoom - fStoreSize)
-		return true;
 	const size_t needed = fStoreSize + size;
 	if (needed > kLargestStore)
 		return false;
 	const size_t doubled = min_c(size_t(fStoreRoom) * 2, kLargestStore);
 	const size_t room = max_c(max_c(needed, doubled), size_t(256));
-	void* store = realloc(fStore, room);
+	void* store = realloc(fStoreIsInside ? nullptr : fStore, room);
 	if (store == nullptr)
 		return false;
+	if (fStoreIsInside)
+		memcpy(store, fStore, fStoreSize);
+	fStoreIsInside = false;
 	fStore = static_cast<uint8*>(store);
 	fStoreRoom = uint32(room);
 	return true;
@@ -1248,7 +1271,7 @@ MessageData::_NoteNested(type_code type, const ItemContents& item)
 void
 MessageData::_CompactStore()
 {
-	if (fWaste < 4096 || fWaste < fStoreSize / 2)
+	if (fWaste < 4096 || fWaste < fStoreSize / 2 || fStoreIsInside)
 		return;
 
 	MessageData* packed = _CreateWithRoom(fCount);

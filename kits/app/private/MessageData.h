@@ -168,12 +168,14 @@ private:
 	~MessageData();
 	void operator delete(void* block) { free(block); }
 
-	static MessageData* _CreateWithRoom(uint32 fields);
+	static MessageData* _CreateWithRoom(uint32 fields, uint32 store = 0);
 	bool _InitFrom(SharedBytes* source, const uint8* base, int32 level, uint32 bodySize);
 	void _Changed();
 	void _ForgetDerived();
-	bool _ReserveFields(uint32 count);
-	bool _ReserveStore(size_t size);
+	bool _ReserveFields(uint32 count) { return fCount + count <= fFieldRoom || _GrowFields(count); }
+	bool _ReserveStore(size_t size) { return size <= fStoreRoom - fStoreSize || _GrowStore(size); }
+	bool _GrowFields(uint32 count);
+	bool _GrowStore(size_t size);
 	void _AddToIndex(uint32 field);
 	bool _BuildIndex();
 	bool _IsNamed(const MessageField& field, const char* name, size_t length, uint32 key) const;
@@ -201,12 +203,13 @@ private:
 	uint32 fBodySize = 0; // of the source's fields, when they are all there is, as they are
 	SharedBytes* fSource = nullptr;
 	const uint8* fSourceBase = nullptr;
-	uint8* fStore = nullptr;
+	uint8* fStore = nullptr; // at first in the same block too, if it is there from the start
 	uint32 fStoreSize = 0;
 	uint32 fStoreRoom = 0;
 	uint32 fWaste = 0; // bytes of the store that no field uses any more
 	int16 fLevel = 0;
 	int16 fHeight = 0;
+	bool fStoreIsInside = false;
 	bool fStoreIsBody = true; // the store holds all fields one after another in the compact form
 	uint8 fCopies = 0; // how often the bytes of messages in it have been copied
 	mutable std::atomic<int8> fPlain { 1 }; // -1: not known

@@ -260,3 +260,16 @@ TEST(ManagedArchive, SamplesComeBackExactly)
 	}
 	EXPECT_LE(25, managed);
 }
+
+
+TEST(ManagedArchive, AViewThatNamesItselfAsATabsViewIsAChildAllTheSame)
+{
+	BMessage child = object("BColorControl");
+	child.AddInt32("_view_list", 1);
+	BMessage root = object("BView", { 1 });
+	root.AddMessage("_managed_archivable", &child);
+	root.AddBool("_managed_archive", true);
+	BMessage archive(root);
+	ASSERT_EQ(B_OK, unmanage_archive(&archive));
+	EXPECT_EQ("BView(BColorControl)", tree_of(archive));
+}
