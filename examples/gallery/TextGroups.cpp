@@ -1,6 +1,10 @@
 // The groups of text fields, menu fields, lists and text.
 #include "Groups.h"
 
+#include <memory>
+#include <utility>
+#include <vector>
+
 #include <Box.h>
 #include <ListView.h>
 #include <MenuField.h>
@@ -17,6 +21,23 @@ namespace {
 
 constexpr float kLeft = 12; // of what stands in a box
 constexpr float kTop = 20;
+
+// A list leaves its items to the program.
+template<class List> class OwningList : public List {
+public:
+	using List::List;
+	~OwningList() override { this->MakeEmpty(); }
+
+	void Add(std::unique_ptr<BStringItem> item)
+	{
+		this->AddItem(item.get());
+		fItems.push_back(std::move(item));
+	}
+
+private:
+	std::vector<std::unique_ptr<BStringItem>> fItems;
+};
+
 
 BBox*
 NewBox(BRect frame, const char* label)
@@ -79,24 +100,25 @@ BView*
 NewListGroup(BRect frame)
 {
 	BBox* box = NewBox(frame, "Lists");
-	BListView* list = new BListView(BRect(kLeft + 2, kTop + 2, kLeft + 84, kTop + 86), "list");
+	auto list =
+		new OwningList<BListView>(BRect(kLeft + 2, kTop + 2, kLeft + 84, kTop + 86), "list");
 	for (const char* item :
 		{ "Monday", "Tuesday", "Wednesday", "Thursday", "Friday", "Saturday", "Sunday" }) {
-		list->AddItem(new BStringItem(item));
+		list->Add(std::make_unique<BStringItem>(item));
 	}
 	list->ItemAt(3)->SetEnabled(false);
 	list->Select(1);
 	box->AddChild(
 		new BScrollView("list scroller", list, B_FOLLOW_LEFT | B_FOLLOW_TOP, 0, false, true));
 
-	BOutlineListView* outline =
-		new BOutlineListView(BRect(kLeft + 118, kTop + 2, kLeft + 200, kTop + 86), "outline");
-	outline->AddItem(new BStringItem("Plants"));
-	outline->AddItem(new BStringItem("Trees", 1));
-	outline->AddItem(new BStringItem("Oak", 2));
-	outline->AddItem(new BStringItem("Grass", 1));
-	outline->AddItem(new BStringItem("Animals", 0, false));
-	outline->AddItem(new BStringItem("Cat", 1));
+	auto outline = new OwningList<BOutlineListView>(
+		BRect(kLeft + 118, kTop + 2, kLeft + 200, kTop + 86), "outline");
+	outline->Add(std::make_unique<BStringItem>("Plants"));
+	outline->Add(std::make_unique<BStringItem>("Trees", 1));
+	outline->Add(std::make_unique<BStringItem>("Oak", 2));
+	outline->Add(std::make_unique<BStringItem>("Grass", 1));
+	outline->Add(std::make_unique<BStringItem>("Animals", 0, false));
+	outline->Add(std::make_unique<BStringItem>("Cat", 1));
 	box->AddChild(
 		new BScrollView("outline scroller", outline, B_FOLLOW_LEFT | B_FOLLOW_TOP, 0, false, true));
 	return box;

@@ -34,19 +34,17 @@ constexpr bigtime_t kPollPause = 10000;
 std::vector<uint32>
 drag_pixels(const Surface& image, drawing_mode mode)
 {
-	std::vector<uint32> pixels;
-	pixels.reserve(static_cast<size_t>(image.Width()) * image.Height());
+	const auto width = static_cast<size_t>(image.Width());
+	std::vector<uint32> pixels(width * image.Height());
 	const bool keepsAlpha = mode != B_OP_COPY && image.Format() == SurfaceFormat::kAlpha;
-	for (int32 y = 0; y < image.Height(); y++) {
+	const bool hasClear = mode != B_OP_COPY && image.Format() == SurfaceFormat::kOpaque;
+	const uint32 opaque = keepsAlpha ? 0 : 0xff000000;
+	uint32* to = pixels.data();
+	for (int32 y = 0; y < image.Height(); y++, to += width) {
 		const uint32* row = image.Row(y);
-		for (int32 x = 0; x < image.Width(); x++) {
-			const bool clear = mode != B_OP_COPY && image.Format() == SurfaceFormat::kOpaque
-				&& (row[x] & 0xffffff) == 0x777477;
-			if (clear)
-				pixels.push_back(0);
-			else
-				pixels.push_back(keepsAlpha ? row[x] : row[x] | 0xff000000);
-		}
+		for (size_t x = 0; x < width; x++)
+			to[x] =
+				hasClear && (row[x] & 0xffffff) == B_TRANSPARENT_MAGIC_RGBA32 ? 0 : row[x] | opaque;
 	}
 	return pixels;
 }
