@@ -98,9 +98,9 @@ GalleryWindow::_AddGroups(float top)
 	fGround->AddChild(NewFieldGroup(column(1, top, 150)));
 	fGround->AddChild(NewSliderGroup(fill(1, sliders)));
 
-	const float text = top + 122 + kMargin;
+	const float text = top + 127 + kMargin;
 	const float status = text + 118 + kMargin;
-	fGround->AddChild(NewListGroup(column(2, top, 122)));
+	fGround->AddChild(NewListGroup(column(2, top, 127)));
 	fGround->AddChild(NewTextGroup(column(2, text, 118)));
 	fGround->AddChild(NewStatusGroup(fill(2, status)));
 

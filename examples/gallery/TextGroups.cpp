@@ -101,7 +101,7 @@ NewListGroup(BRect frame)
 {
 	BBox* box = NewBox(frame, "Lists");
 	auto list =
-		new OwningList<BListView>(BRect(kLeft + 2, kTop + 2, kLeft + 84, kTop + 86), "list");
+		new OwningList<BListView>(BRect(kLeft + 2, kTop + 2, kLeft + 84, kTop + 91), "list");
 	for (const char* item :
 		{ "Monday", "Tuesday", "Wednesday", "Thursday", "Friday", "Saturday", "Sunday" }) {
 		list->Add(std::make_unique<BStringItem>(item));
@@ -112,7 +112,7 @@ NewListGroup(BRect frame)
 		new BScrollView("list scroller", list, B_FOLLOW_LEFT | B_FOLLOW_TOP, 0, false, true));
 
 	auto outline = new OwningList<BOutlineListView>(
-		BRect(kLeft + 118, kTop + 2, kLeft + 200, kTop + 86), "outline");
+		BRect(kLeft + 118, kTop + 2, kLeft + 200, kTop + 91), "outline");
 	outline->Add(std::make_unique<BStringItem>("Plants"));
 	outline->Add(std::make_unique<BStringItem>("Trees", 1));
 	outline->Add(std::make_unique<BStringItem>("Oak", 2));
