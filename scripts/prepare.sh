@@ -20,6 +20,7 @@ test_packages=(
 	"libgmock-dev:the matchers of the test framework"
 	"xvfb:a screen in memory, for tests in real windows"
 	"openbox:a window manager for that screen"
+	"pcmanfm:a file manager to drag from and to"
 	"xdotool:moves the pointer and presses keys as a person does"
 	"x11-utils:asks that screen about its windows"
 	"fonts-dejavu-core:characters that the default fonts lack, for tests of text"
