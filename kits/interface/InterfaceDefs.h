@@ -220,7 +220,7 @@ void activate_workspace(int32 workspace);
 void set_focus_follows_mouse(bool follow);
 bool focus_follows_mouse();
 
-enum color_which {
+enum color_which : int32 {
 	B_NO_COLOR = 0,
 	B_PANEL_BACKGROUND_COLOR = 1,
 	B_PANEL_TEXT_COLOR = 10,
