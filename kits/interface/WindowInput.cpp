@@ -21,6 +21,7 @@ namespace {
 
 // A pointer movement older than this is left out when a newer one waits.
 constexpr bigtime_t kStaleMove = 20000;
+constexpr bigtime_t kReleaseDelay = 50000; // far more than the display thread needs
 
 constexpr const char* kViewWhere = "be:view_where";
 constexpr const char* kTransit = "be:transit";
@@ -350,11 +351,19 @@ WindowInternals::TakePointer(BPoint* _screen, uint32* _buttons)
 // During a press everything comes as a message, so the last one tells, and what the desktop knows
 // already comes in its turn. Without one for a while there is none, as after a drag.
 void
-WindowInternals::GetPointer(BPoint* _screen, uint32* _buttons) const
+WindowInternals::GetPointer(BPoint* _screen, uint32* _buttons)
 {
 	Desktop::Get()->GetMouse(_screen, _buttons);
-	if (!pressed || *_buttons == 0)
+	if (!pressed)
 		return;
+	if (*_buttons == 0) {
+		// The desktop knows of a release just before its message is here.
+		if (!TakePointer(_screen, _buttons)) {
+			LooperPrivate(&window).WaitForMessage(kReleaseDelay);
+			TakePointer(_screen, _buttons);
+		}
+		return;
+	}
 	*_screen = lastScreen;
 	*_buttons = lastButtons;
 }

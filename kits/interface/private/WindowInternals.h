@@ -69,7 +69,7 @@ public:
 	// For those who poll the mouse: the next waiting movement or release, which then reaches no
 	// hook; false when none waits. Then GetPointer() tells the present state.
 	bool TakePointer(BPoint* _screen, uint32* _buttons);
-	void GetPointer(BPoint* _screen, uint32* _buttons) const;
+	void GetPointer(BPoint* _screen, uint32* _buttons);
 	// A drag was asked for: until the desktop has answered, later presses and keys are kept back.
 	// If the button is up already, the drop comes before them, as it would have in time.
 	void AwaitDrag();
