@@ -267,6 +267,16 @@ describe_view(BView* view, const ViewNode& parent, const ViewTree& tree, BPoint 
 }
 
 
+// By the window's own thread, or under its lock: until it is made, and from when it is deleted, its
+// class changes.
+void
+note_class(BWindow* window, WindowNode* _node)
+{
+	_node->className = readable_name(typeid(*window));
+	_node->isAlert = dynamic_cast<BAlert*>(window) != nullptr;
+}
+
+
 // The window of that number, locked; NULL with the reason.
 BWindow*
 lock_window(uint32 id, bigtime_t timeout, status_t* _status)
@@ -317,18 +327,15 @@ ViewInspector::Windows()
 	std::vector<WindowNode> nodes;
 	{
 		std::lock_guard guard(windows().lock);
-		for (WindowEntry& entry : windows().entries) {
-			WindowNode node = entry.node;
-			node.className = readable_name(typeid(*entry.window));
-			node.isAlert = dynamic_cast<BAlert*>(entry.window) != nullptr;
-			nodes.push_back(std::move(node));
-		}
+		for (const WindowEntry& entry : windows().entries)
+			nodes.push_back(entry.node);
 	}
 	for (WindowNode& node : nodes) {
 		status_t status;
 		BWindow* window = node.shown ? lock_window(node.id, kPatience, &status) : nullptr;
 		if (window == nullptr)
 			continue;
+		note_class(window, &node);
 		node.frame = window->Frame();
 		window->Unlock();
 	}
@@ -425,6 +432,9 @@ WindowList::SetShown(BWindow* window, bool shown)
 {
 	std::lock_guard guard(windows().lock);
 	if (WindowNode* node = windows().Find(window)) {
+		// For as long as the window is too busy to be asked. A constructor that shows its window
+		// gives its own class here.
+		note_class(window, node);
 		node->shown = shown;
 		node->isMenu = static_cast<uint32>(window->Feel()) == kMenuWindowFeel;
 	}
