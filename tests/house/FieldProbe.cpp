@@ -2,6 +2,7 @@
 
 #include "ClassTable.h"
 
+#include <deque>
 #include <functional>
 #include <memory>
 
@@ -49,8 +50,10 @@ struct Sample {
 BListView*
 Filled(BListView* list)
 {
+	// A list leaves its items to the program.
+	static std::deque<BStringItem> sItems;
 	for (const char* text : { "One", "Two", "Three" })
-		list->AddItem(new BStringItem(text));
+		list->AddItem(&sItems.emplace_back(text));
 	return list;
 }
 

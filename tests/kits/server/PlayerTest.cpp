@@ -2,6 +2,7 @@
 
 #include <cstdio>
 #include <cstdlib>
+#include <deque>
 #include <fstream>
 #include <sstream>
 #include <sys/stat.h>
@@ -96,8 +97,10 @@ public:
 		back->AddChild(new BMenuField(BRect(10, 100, 199, 119), "color", "Color", colors));
 		back->AddChild(new Target(BRect(210, 10, 309, 109)));
 		auto* list = new BListView(BRect(0, 0, 99, 79), "list");
+		// A list leaves its items to the program.
+		static std::deque<BStringItem> sItems;
 		for (int i = 0; i < 50; i++)
-			list->AddItem(new BStringItem(("item " + std::to_string(i)).c_str()));
+			list->AddItem(&sItems.emplace_back(("item " + std::to_string(i)).c_str()));
 		list->MoveTo(210, 130);
 		back->AddChild(new BScrollView("scroll", list, B_FOLLOW_NONE, 0, false, true));
 		back->AddChild(fStatus = new BStringView(BRect(10, 330, 389, 349), "status", "nothing"));
