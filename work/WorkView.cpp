@@ -111,9 +111,12 @@ WorkView::MouseMoved(BPoint where, uint32 transit, const BMessage* drag)
 	if (!fResizing || selection == nullptr)
 		return;
 
+	// Sizes are whole; what is left of a step between pixels counts for the next one.
 	const BPoint point = selection->ConvertFromScreen(ConvertToScreen(where));
-	selection->ResizeBy(point.x - fLastResizePoint.x, point.y - fLastResizePoint.y);
-	fLastResizePoint = point;
+	const BPoint step(
+		std::round(point.x - fLastResizePoint.x), std::round(point.y - fLastResizePoint.y));
+	selection->ResizeBy(step.x, step.y);
+	fLastResizePoint += step;
 	selection->Invalidate();
 
 	BMessage moved(kSelectionMoved);

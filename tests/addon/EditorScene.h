@@ -8,6 +8,8 @@
 #include <vector>
 
 #include <Message.h>
+#include <OutlineListView.h>
+#include <ScrollView.h>
 
 #include "addon/ViewEditor.h"
 #include "palette/WidgetWindow.h"
@@ -70,6 +72,24 @@ public:
 	ViewEditor* Editor() { return fEditor; }
 	WorkView* Work() { return static_cast<WorkView*>(fEditor->FindView("WorkView")); }
 	BView* Root() { return Work()->EditView(); }
+
+	// Where an entry of the palette is on the screen, scrolled into sight; the last one when there
+	// is none of that text.
+	static BPoint PaletteEntry(const std::string& text)
+	{
+		widgetWindow->Lock();
+		BOutlineListView* list = dynamic_cast<BOutlineListView*>(
+			dynamic_cast<BScrollView*>(widgetWindow->ChildAt(0))->Target());
+		int32 index = 0;
+		while (index < list->CountItems() - 1
+			&& dynamic_cast<BStringItem*>(list->ItemAt(index))->Text() != text)
+			index++;
+		list->ScrollTo(BPoint(0, std::max(0.0f, list->ItemFrame(index).top - 60)));
+		const BPoint place = list->ConvertToScreen(BPoint(60, list->ItemFrame(index).top + 5));
+		widgetWindow->Unlock();
+		Driver::WaitUntilIdle();
+		return place;
+	}
 
 	// A point of the view where the mouse reaches the view itself, in its coordinates; the work
 	// area is scrolled so that it is in sight. False when there is none.

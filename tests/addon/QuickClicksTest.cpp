@@ -143,12 +143,15 @@ CollectPaths(BView* root, BView* view, std::vector<std::vector<int32>>& paths)
 }
 
 
-// Views clicked times views of the design. The environment can ask for more than a usual run does.
+// How many views of a design are clicked. The environment can ask for more than a usual run does:
+// for that many views clicked times views of the design.
 size_t
-Work()
+MostViews(size_t views)
 {
-	const char* asked = std::getenv("ARCHWAY_QUICK_CLICKS");
-	return asked != nullptr ? std::strtoul(asked, nullptr, 10) : 1000;
+	constexpr size_t kLeast = 4;
+	if (const char* asked = std::getenv("ARCHWAY_QUICK_CLICKS"))
+		return std::max<size_t>(kLeast, std::strtoul(asked, nullptr, 10) / views);
+	return std::clamp<size_t>(1000 / views, kLeast, 60);
 }
 
 
@@ -161,8 +164,7 @@ protected:
 		ASSERT_NE(nullptr, scene.Root());
 		std::vector<std::vector<int32>> paths;
 		scene.Locked([&] { CollectPaths(scene.Root(), scene.Root(), paths); });
-		const size_t most = std::clamp<size_t>(Work() / paths.size(), 4, 60);
-		const size_t step = std::max<size_t>(1, paths.size() / most);
+		const size_t step = std::max<size_t>(1, paths.size() / MostViews(paths.size()));
 		for (size_t i = 0; i < paths.size(); i += step) {
 			scene.Open(archive);
 			ClickView(paths[i]);

@@ -1,11 +1,14 @@
 #include "archive/ViewTree.h"
 
+#include <cstring>
+
 #include <gtest/gtest.h>
 
 #include <AppDefs.h>
 #include <Bitmap.h>
 #include <Box.h>
 #include <Button.h>
+#include <ListView.h>
 #include <Menu.h>
 #include <MenuBar.h>
 #include <MenuItem.h>
@@ -15,6 +18,7 @@
 #include <TextControl.h>
 #include <TextView.h>
 
+#include "archive/BitmapView.h"
 #include "support/TestWindow.h"
 
 namespace {
@@ -120,6 +124,29 @@ TEST(ColorfulAddChild, KeepsTheColorsBesideATabViewThatShowsNoPage)
 }
 
 
+TEST(ColorfulAddChild, KeepsTheColorsInAWindowAndInABitmap)
+{
+	TestWindow window;
+	BBitmap bitmap(BRect(0, 0, 99, 99), B_RGBA32, true);
+	BButton* inWindow = new BButton(BRect(5, 5, 80, 30), "inner", "B", NULL);
+	BButton inBitmap(BRect(5, 5, 80, 30), "inner", "B", NULL);
+	for (BView* view : { static_cast<BView*>(inWindow), static_cast<BView*>(&inBitmap) }) {
+		view->SetViewColor(kRed);
+		view->SetLowColor(kGreen);
+	}
+	window.Locked([&] { EXPECT_EQ(inWindow, ColorfulAddChild(window.Window(), inWindow)); });
+	bitmap.Lock();
+	EXPECT_EQ(&inBitmap, ColorfulAddChild(&bitmap, &inBitmap));
+	for (const BView* view : { static_cast<BView*>(inWindow), static_cast<BView*>(&inBitmap) }) {
+		EXPECT_NE(nullptr, view->Window() != nullptr ? view : view->Parent());
+		EXPECT_TRUE(SameColor(kRed, view->ViewColor()));
+		EXPECT_TRUE(SameColor(kGreen, view->LowColor()));
+	}
+	bitmap.RemoveChild(&inBitmap);
+	bitmap.Unlock();
+}
+
+
 TEST(ColorfulAddChild, DoesNothingForNull)
 {
 	TestWindow window;
@@ -141,6 +168,13 @@ TEST(FrameControled, IsTrueForViewsThatTheirParentsPlace)
 		tabs->AddTab(page);
 		tabs->Select(0);
 	});
+
+	BListView* list = window.Add(new BListView(BRect(0, 150, 90, 190), "list"));
+	BView* inList = MakeView(0, 0, 10, 10);
+	window.Locked([&] { list->AddChild(inList); });
+	EXPECT_TRUE(FrameControled(inList));
+	EXPECT_TRUE(FrameControled(scroll->ScrollBar(B_VERTICAL)));
+	EXPECT_FALSE(FrameControled(list));
 
 	EXPECT_TRUE(FrameControled(target));
 	EXPECT_TRUE(FrameControled(text->TextView()));
@@ -315,6 +349,61 @@ TEST(DrawView, ShowsScrollBarsAsFlatBoxes)
 	bitmap.RemoveChild(scroll);
 	bitmap.Unlock();
 	delete scroll;
+}
+
+
+// Tells whether it was shown as in an active window, and keeps its high colour to the end.
+class ActiveView : public BView {
+public:
+	ActiveView(BRect frame) : BView(frame, "active", B_FOLLOW_NONE, B_WILL_DRAW)
+	{
+		SetViewColor(kRed);
+		SetHighColor(kGreen);
+	}
+
+	void WindowActivated(bool active) override { activated = active; }
+
+	bool activated = false;
+};
+
+
+TEST(EraseBackground, PaintsTheGroundOfEveryViewButScrollBars)
+{
+	TestWindow window;
+	BBitmap picture(BRect(0, 0, 19, 19), B_RGBA32);
+	memset(picture.Bits(), 0x80, static_cast<size_t>(picture.BitsLength()));
+	BBitmap bitmap(BRect(0, 0, 119, 119), B_RGBA32, true);
+	memset(bitmap.Bits(), 0, static_cast<size_t>(bitmap.BitsLength()));
+	ActiveView* root = new ActiveView(BRect(0, 0, 119, 119));
+	BitmapView* image = new BitmapView(BRect(10, 10, 49, 49), "", B_FOLLOW_NONE, B_WILL_DRAW);
+	image->SetViewColor(kGreen);
+	image->SetBitmap(&picture);
+	root->AddChild(image);
+	BScrollBar* bar = new BScrollBar(BRect(80, 10, 94, 99), "", NULL, 0, 0, B_VERTICAL);
+	bar->SetViewColor(kGreen);
+	root->AddChild(bar);
+
+	bitmap.Lock();
+	ColorfulAddChild(&bitmap, root);
+	EraseBackground(root);
+	EraseBackground(NULL);
+	root->Sync();
+	const auto pixel = [&bitmap](int32 x, int32 y) {
+		const uint8* bits =
+			static_cast<const uint8*>(bitmap.Bits()) + y * bitmap.BytesPerRow() + x * 4;
+		return rgb_color { bits[2], bits[1], bits[0], 255 };
+	};
+	EXPECT_TRUE(SameColor(kRed, pixel(5, 5)));
+	EXPECT_TRUE(SameColor({ 0x80, 0x80, 0x80, 255 }, pixel(15, 15)));
+	// A view draws nothing where its children are.
+	const rgb_color untouched = { 0, 0, 0, 255 };
+	EXPECT_TRUE(SameColor(untouched, pixel(40, 40))); // the picture is drawn once
+	EXPECT_TRUE(SameColor(untouched, pixel(87, 50))); // in the scroll bar
+	EXPECT_TRUE(root->activated);
+	EXPECT_TRUE(SameColor(kGreen, root->HighColor()));
+	bitmap.RemoveChild(root);
+	bitmap.Unlock();
+	delete root;
 }
 
 

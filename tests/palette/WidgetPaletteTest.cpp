@@ -4,6 +4,7 @@
 #include "palette/WidgetListView.h"
 #include "palette/WidgetWindow.h"
 
+#include <cmath>
 #include <memory>
 #include <string>
 
@@ -150,12 +151,60 @@ TEST_F(PaletteTest, ListsTheKinds)
 }
 
 
+TEST_F(PaletteTest, IsMadeHigherButNotWider)
+{
+	const BRect before = list->Frame();
+	window.driver.ResizeWindow(palette, 320, 500);
+	EXPECT_EQ(BRect(500, 40, 700, 540), palette->Frame());
+	EXPECT_EQ(before.Width(), list->Bounds().Width());
+	EXPECT_EQ(before.Height() + 220, list->Bounds().Height());
+	window.driver.ResizeWindow(palette, 120, 900);
+	EXPECT_EQ(BRect(500, 40, 700, 640), palette->Frame());
+	window.driver.ResizeWindow(palette, 200, 50);
+	EXPECT_EQ(BRect(500, 40, 700, 241), palette->Frame());
+}
+
+
 TEST_F(PaletteTest, AHeadingIsNeitherSelectedNorDragged)
 {
-	window.driver.Click(list, BPoint(60, list->ItemFrame(IndexOf("BControl")).top + 5));
-	EXPECT_EQ(-1, list->CurrentSelection());
-	DragEntry("BControl");
-	EXPECT_EQ(0, receiver->drops);
+	for (const char* heading : { "BControl", "BScrollView containing..." }) {
+		DragEntry(heading);
+		window.driver.Click(list, BPoint(60, list->ItemFrame(IndexOf(heading)).top + 5));
+		EXPECT_EQ(-1, list->CurrentSelection());
+		EXPECT_EQ(0, receiver->drops);
+	}
+}
+
+
+// Pale yellow over white, of which a quarter shows; the pointer is in the middle.
+TEST_F(PaletteTest, TheDragImageIsTheSampleInItsSize)
+{
+	for (const char* kind : { "BView", "BView (custom)", "BCheckBox" }) {
+		const std::unique_ptr<BView> sample(MakeSample(kind));
+		const BRect bounds = sample->Bounds();
+		const BRect image = bounds.OffsetByCopy(
+			std::floor(150 - bounds.Width() / 2), std::floor(150 - bounds.Height() / 2));
+		const int32 index = IndexOf(kind);
+		palette->Lock();
+		list->ScrollTo(BPoint(0, std::max(0.0f, list->ItemFrame(index).top - 40)));
+		const BPoint from(60, list->ItemFrame(index).top + 6);
+		palette->Unlock();
+		window.driver.MoveTo(list, from);
+		window.driver.Press();
+		window.driver.MoveTo(list, from + BPoint(-20, 10));
+		window.driver.MoveTo(receiver, BPoint(150, 150));
+
+		for (const BPoint& corner :
+			{ image.LeftTop(), image.RightTop(), image.LeftBottom(), image.RightBottom() }) {
+			const BPoint outwards(corner.x < 150 ? -2.0f : 2.0f, corner.y < 150 ? -2.0f : 2.0f);
+			const rgb_color inside = window.driver.PixelAt(receiver, corner - outwards);
+			EXPECT_EQ(255, inside.red) << kind;
+			EXPECT_NEAR(204 * 192 / 255 + 63, inside.blue, 1) << kind;
+			EXPECT_EQ(255, window.driver.PixelAt(receiver, corner + outwards).blue) << kind;
+		}
+		window.driver.Release();
+	}
+	EXPECT_EQ(3, receiver->drops);
 }
 
 

@@ -13,6 +13,7 @@
 #include <Entry.h>
 #include <File.h>
 #include <MenuBar.h>
+#include <MenuItem.h>
 #include <Message.h>
 #include <Path.h>
 #include <Resources.h>
@@ -114,6 +115,77 @@ TEST_F(WorkViewDropTest, ADropOnNothingLosesTheView)
 }
 
 
+TEST_F(WorkViewDropTest, AControlDragToNothingLeavesTheViewInItsPlace)
+{
+	BView* button = Find("button");
+	window.driver.Click(button, BPoint(10, 10));
+	const int32 beeps = Driver::CountBeeps();
+	window.driver.Drag(
+		Driver::PointIn(button, BPoint(10, 10)), BPoint(1200, 800), 10, 1, B_CONTROL_KEY);
+	EXPECT_EQ(2, root->CountChildren());
+	EXPECT_EQ(button, Find("button"));
+	EXPECT_EQ(BRect(20, 20, 99, 44), button->Frame());
+	EXPECT_EQ(beeps, Driver::CountBeeps());
+}
+
+
+TEST_F(WorkViewDropTest, UnderADragTheViewThatWouldTakeItIsSelected)
+{
+	BView* button = Find("button");
+	window.driver.Click(button, BPoint(10, 10));
+	window.driver.MoveTo(button, BPoint(10, 10));
+	window.driver.Press();
+	EXPECT_EQ(root, workView->SelectedView());
+	EXPECT_EQ(NULL, Find("button"));
+	window.driver.MoveTo(box, BPoint(30, 60));
+	EXPECT_EQ(box, workView->SelectedView());
+	const rgb_color edge = window.driver.PixelAt(box, BPoint(0, 120));
+	EXPECT_EQ(255, edge.blue);
+	EXPECT_EQ(0, edge.red);
+	window.driver.MoveTo(workView->Container(), BPoint(320, 240));
+	EXPECT_EQ(box, workView->SelectedView()); // the ground is no view of the design
+	window.driver.MoveTo(root, BPoint(40, 130));
+	EXPECT_EQ(root, workView->SelectedView());
+	window.driver.Release();
+	EXPECT_EQ(Find("button"), workView->SelectedView());
+	EXPECT_EQ(root, Find("button")->Parent());
+}
+
+
+// Red shows a quarter of what is below; black and white show nothing of it.
+TEST_F(WorkViewDropTest, TheDragImageIsTranslucentButForBlackAndWhite)
+{
+	BView* striped = new BView(BRect(20, 60, 83, 83), "striped", B_FOLLOW_NONE, B_WILL_DRAW);
+	for (const auto& [left, color] :
+		{ std::pair(0, rgb_color { 255, 0, 0, 255 }), std::pair(20, rgb_color { 0, 0, 0, 255 }),
+			std::pair(40, rgb_color { 255, 255, 255, 255 }) }) {
+		BView* stripe = new BView(BRect(left, 0, left + 19, 19), "", B_FOLLOW_NONE, B_WILL_DRAW);
+		stripe->SetViewColor(color);
+		striped->AddChild(stripe);
+	}
+	window.Locked([&] {
+		root->AddChild(striped);
+		root->SetViewColor(0, 0, 200);
+		root->Invalidate();
+		workView->SetSelectedView(striped);
+	});
+	window.driver.MoveTo(striped, BPoint(5, 21)); // below the stripes
+	window.driver.Press();
+	ASSERT_EQ(NULL, Find("striped"));
+	window.driver.MoveTo(root, BPoint(25, 151));
+	const BPoint leftTop(20, 130);
+	const rgb_color red = window.driver.PixelAt(root, leftTop + BPoint(10, 10));
+	EXPECT_NEAR(192, red.red, 1);
+	EXPECT_NEAR(200 * 63 / 255, red.blue, 1);
+	const rgb_color black = window.driver.PixelAt(root, leftTop + BPoint(30, 10));
+	EXPECT_EQ(0, black.blue);
+	const rgb_color white = window.driver.PixelAt(root, leftTop + BPoint(50, 10));
+	EXPECT_EQ(255, white.red);
+	EXPECT_EQ(255, white.blue);
+	window.driver.Release();
+}
+
+
 TEST_F(WorkViewDropTest, TwoQuickClicksLoseNothing)
 {
 	BView* button = Find("button");
@@ -141,6 +213,31 @@ TEST_F(WorkViewDropTest, AMenuBarEndsAtTheLeftTop)
 }
 
 
+TEST_F(WorkViewDropTest, OnlyADroppedArchiveKeepsItsMenuBarWhereItFalls)
+{
+	BMenuBar bar(BRect(0, 0, 100, 18), "bar");
+	for (const uint32 code : { 'drpp', 'drop' }) {
+		BMessage archive(code);
+		bar.Archive(&archive, true);
+		Drop(&archive, box, BPoint(40, 40));
+		BView* dropped = box->ChildAt(box->CountChildren() - 1);
+		EXPECT_STREQ("bar", dropped->Name());
+		EXPECT_EQ(code == 'drop' ? BPoint(40, 40) : BPoint(0, 0), dropped->Frame().LeftTop());
+	}
+	EXPECT_EQ(2, box->CountChildren());
+}
+
+
+TEST_F(WorkViewDropTest, ADropBetweenPixelsFallsOnTheNearest)
+{
+	BView view(BRect(0, 0, 30, 30), "fresh", B_FOLLOW_NONE, B_WILL_DRAW);
+	BMessage archive('drop');
+	view.Archive(&archive, true);
+	Drop(&archive, root, BPoint(25.25, 150.75));
+	EXPECT_EQ(BRect(25, 151, 55, 181), Find("fresh")->Frame());
+}
+
+
 TEST_F(WorkViewDropTest, AnArchiveIsAddedWhereItIsDropped)
 {
 	BView view(BRect(0, 0, 30, 30), "fresh", B_FOLLOW_NONE, B_WILL_DRAW);
@@ -153,14 +250,21 @@ TEST_F(WorkViewDropTest, AnArchiveIsAddedWhereItIsDropped)
 }
 
 
-TEST_F(WorkViewDropTest, RubbishChangesNothing)
+TEST_F(WorkViewDropTest, RubbishBeepsAndChangesNothing)
 {
+	const int32 beeps = Driver::CountBeeps();
 	BMessage empty('DATA');
 	Drop(&empty, root, BPoint(25, 150));
 	BMessage unknown('drop');
 	unknown.AddString("class", "NoSuchClass");
 	Drop(&unknown, root, BPoint(25, 150));
+	BMenuItem item("no view", NULL);
+	BMessage noView('drop');
+	item.Archive(&noView, true);
+	Drop(&noView, root, BPoint(25, 150));
+	EXPECT_EQ(beeps + 3, Driver::CountBeeps());
 	EXPECT_EQ(2, root->CountChildren());
+	EXPECT_EQ(root, workView->SelectedView());
 }
 
 

@@ -1,111 +1,13 @@
 #include "work/WorkView.h"
 
-#include <string>
-#include <vector>
-
-#include <gmock/gmock.h>
-#include <gtest/gtest.h>
-
 #include <AppDefs.h>
-#include <Button.h>
-#include <Message.h>
-#include <ScrollBar.h>
 
-#include "archive/EditorCodes.h"
-#include "support/TestWindow.h"
-#include "work/HiliteView.h"
-#include "work/WorkBackgroundView.h"
+#include "work/WorkViewFixture.h"
 
 namespace {
 
 
-constexpr rgb_color kBlue = { 0, 0, 255, 255 };
-
-
-// Stands for the editor: notes what it is told.
-class Listener : public BView {
-public:
-	Listener() : BView(BRect(0, 0, 9, 9), "listener", B_FOLLOW_NONE, 0) {}
-
-	void MessageReceived(BMessage* message) override
-	{
-		void* view;
-		if (message->what == kSelectionChanged && message->FindPointer("what", &view) == B_OK)
-			selections.push_back(static_cast<BView*>(view));
-		else if (message->what == kSelectionMoved)
-			moves++;
-		else
-			BView::MessageReceived(message);
-	}
-
-	std::vector<BView*> selections;
-	int moves = 0;
-};
-
-
-// Tells of the presses that reach it.
-class PressedView : public BView {
-public:
-	PressedView(BRect frame, const char* name) :
-		BView(frame, name, B_FOLLOW_LEFT | B_FOLLOW_TOP, B_WILL_DRAW)
-	{
-	}
-
-	void MouseDown(BPoint) override { presses++; }
-	void KeyDown(const char*, int32) override { keys++; }
-
-	int presses = 0;
-	int keys = 0;
-};
-
-
-bool
-IsBlue(rgb_color color)
-{
-	return color.red == kBlue.red && color.green == kBlue.green && color.blue == kBlue.blue;
-}
-
-
-// A work view with a root that has a plain child, a button and a scroll view.
-class WorkViewTest : public testing::Test {
-protected:
-	WorkViewTest() : window(BRect(40, 40, 539, 439))
-	{
-		listener = new Listener;
-		window.Add(listener);
-		workView = new WorkView(BRect(20, 20, 449, 349), B_FOLLOW_ALL_SIDES, listener);
-		window.Add(workView);
-
-		root =
-			new BView(BRect(30, 40, 329, 239), "root", B_FOLLOW_LEFT | B_FOLLOW_TOP, B_WILL_DRAW);
-		plain = new PressedView(BRect(20, 20, 119, 79), "plain");
-		root->AddChild(plain);
-		button = new BButton(BRect(20, 100, 119, 130), "button", "Press", new BMessage('prss'));
-		root->AddChild(button);
-		target = new BView(BRect(160, 20, 240, 90), "target", B_FOLLOW_ALL_SIDES, B_WILL_DRAW);
-		scroll = new BScrollView(
-			"scroll", target, B_FOLLOW_LEFT | B_FOLLOW_TOP, 0, true, true, B_FANCY_BORDER);
-		root->AddChild(scroll);
-		window.Locked([&] { workView->SetEditView(root); });
-		listener->selections.clear();
-	}
-
-	// A point at a distance from the lower right corner of the view.
-	BPoint FromCorner(BView* view, float dx, float dy)
-	{
-		const BRect bounds = view->Bounds();
-		return BPoint(bounds.right - dx, bounds.bottom - dy);
-	}
-
-	TestWindow window;
-	Listener* listener;
-	WorkView* workView;
-	BView* root;
-	PressedView* plain;
-	BButton* button;
-	BView* target;
-	BScrollView* scroll;
-};
+class WorkViewTest : public WorkViewFixture {};
 
 
 } // namespace
@@ -159,6 +61,25 @@ TEST_F(WorkViewTest, RangesFitTheRootAndItsMargins)
 }
 
 
+TEST_F(WorkViewTest, RangesFollowTheSizeOfTheWorkArea)
+{
+	float minimum, maximum;
+	window.driver.ResizeWindow(window.Window(), 300, 250);
+	window.Locked([&] {
+		const BRect shown = workView->Target()->Bounds();
+		workView->ScrollBar(B_HORIZONTAL)->GetRange(&minimum, &maximum);
+		EXPECT_EQ(299 + 16 - shown.Width(), maximum);
+		EXPECT_FLOAT_EQ(
+			shown.Width() / (299 + 16), workView->ScrollBar(B_HORIZONTAL)->Proportion());
+		workView->ScrollBar(B_VERTICAL)->GetRange(&minimum, &maximum);
+		EXPECT_EQ(199 + 16 - shown.Height(), maximum);
+	});
+	window.driver.ResizeWindow(window.Window(), 499, 399);
+	workView->ScrollBar(B_VERTICAL)->GetRange(&minimum, &maximum);
+	EXPECT_EQ(0, maximum);
+}
+
+
 TEST_F(WorkViewTest, TheFirstClickOnlySelects)
 {
 	window.driver.Click(plain);
@@ -166,6 +87,24 @@ TEST_F(WorkViewTest, TheFirstClickOnlySelects)
 	EXPECT_THAT(listener->selections, testing::ElementsAre(plain));
 	EXPECT_EQ(0, plain->presses);
 	EXPECT_EQ(BRect(20, 20, 119, 79), plain->Frame());
+}
+
+
+TEST_F(WorkViewTest, ASecondClickOnWhatStaysInItsPlaceBeeps)
+{
+	window.driver.Click(target);
+	int32 beeps = Driver::CountBeeps();
+	const BRect frame = target->Frame();
+	window.driver.Drag(target, BPoint(30, 30), root, BPoint(30, 150));
+	EXPECT_EQ(beeps + 1, Driver::CountBeeps());
+	EXPECT_EQ(target, scroll->Target());
+	EXPECT_EQ(frame, target->Frame());
+
+	window.driver.Click(root, BPoint(10, 150));
+	EXPECT_EQ(beeps + 1, Driver::CountBeeps());
+	window.driver.Drag(root, BPoint(10, 150), root, BPoint(40, 170));
+	EXPECT_EQ(beeps + 2, Driver::CountBeeps());
+	EXPECT_EQ(BRect(30, 40, 329, 239), root->Frame());
 }
 
 
@@ -212,6 +151,35 @@ TEST_F(WorkViewTest, TheCornerResizes)
 	// The button is up again: further moves do nothing.
 	window.driver.MoveTo(plain, BPoint(5, 5));
 	EXPECT_EQ(BRect(20, 20, 139, 89), plain->Frame());
+}
+
+
+// As on a screen of two pixels a point.
+TEST_F(WorkViewTest, TheCornerStaysUnderThePointerInHalfSteps)
+{
+	window.driver.Click(plain);
+	window.driver.MoveTo(plain, FromCorner(plain, 3, 3));
+	const BPoint start = Driver::PointIn(plain, FromCorner(plain, 3, 3));
+	window.driver.Press();
+	for (int i = 1; i <= 40; i++)
+		window.driver.MoveTo(start + BPoint(0.5f * i, 0.25f * i));
+	window.driver.Release();
+	EXPECT_EQ(BRect(20, 20, 139, 89), plain->Frame());
+}
+
+
+TEST_F(WorkViewTest, AViewIsResizedToNothingAndBack)
+{
+	window.driver.Click(plain);
+	const BPoint start = Driver::PointIn(plain, FromCorner(plain, 3, 3));
+	window.driver.MoveTo(start);
+	window.driver.Press();
+	window.driver.MoveTo(start - BPoint(99, 59));
+	EXPECT_EQ(BRect(20, 20, 20, 20), plain->Frame());
+	window.driver.MoveTo(start - BPoint(80, 50));
+	window.driver.Release();
+	EXPECT_EQ(BRect(20, 20, 39, 29), plain->Frame());
+	EXPECT_EQ(2, listener->moves);
 }
 
 
@@ -349,14 +317,31 @@ TEST_F(WorkViewTest, KeysAreTraced)
 
 TEST_F(WorkViewTest, ArrowKeysLeaveTheRootAndFrameControledViewsAlone)
 {
+	const int32 beeps = Driver::CountBeeps();
+	window.driver.Click(plain);
 	window.driver.Click(root, BPoint(290, 190));
 	window.driver.Key("Right");
 	EXPECT_EQ(BRect(30, 40, 329, 239), root->Frame());
+	EXPECT_EQ(beeps + 1, Driver::CountBeeps());
 
 	window.driver.Click(target);
 	const BRect frame = target->Frame();
 	window.driver.Key("Right");
 	EXPECT_EQ(frame, target->Frame());
+	EXPECT_EQ(beeps + 2, Driver::CountBeeps());
+	EXPECT_EQ(0, listener->moves);
+}
+
+
+TEST_F(WorkViewTest, OtherKeysDoNothing)
+{
+	window.driver.Click(plain);
+	const int32 beeps = Driver::CountBeeps();
+	for (const char* key : { "a", "Home", "Return", "Escape" })
+		window.driver.Key(key);
+	EXPECT_EQ(BRect(20, 20, 119, 79), plain->Frame());
+	EXPECT_EQ(plain, workView->SelectedView());
+	EXPECT_EQ(beeps, Driver::CountBeeps());
 	EXPECT_EQ(0, listener->moves);
 }
 
@@ -379,82 +364,17 @@ TEST_F(WorkViewTest, DeleteSelectsTheParentFirst)
 
 TEST_F(WorkViewTest, TheRootAndFrameControledViewsAreNotDeleted)
 {
+	window.driver.Click(plain);
 	window.driver.Click(root, BPoint(290, 190));
+	const int32 beeps = Driver::CountBeeps();
 	window.driver.Key("Delete");
 	EXPECT_EQ(root, workView->EditView());
+	EXPECT_EQ(beeps + 1, Driver::CountBeeps());
 	window.driver.Click(target);
-	window.driver.Key("Delete");
+	window.driver.Key("Backspace");
 	EXPECT_EQ(target, scroll->Target());
-}
-
-
-TEST_F(WorkViewTest, TheHighlightFramesTheSelectedView)
-{
-	window.driver.Click(plain);
-	for (const BPoint& point : { BPoint(0, 0), BPoint(1, 1), BPoint(50, 0), BPoint(99, 59),
-			 BPoint(98, 30), BPoint(0, 59), BPoint(95, 56) })
-		EXPECT_TRUE(IsBlue(window.driver.PixelAt(plain, point))) << point.x << "," << point.y;
-	for (const BPoint& point : { BPoint(2, 2), BPoint(50, 30), BPoint(88, 48) })
-		EXPECT_FALSE(IsBlue(window.driver.PixelAt(plain, point))) << point.x << "," << point.y;
-}
-
-
-TEST_F(WorkViewTest, TheOldHighlightIsErased)
-{
-	window.driver.Click(plain);
-	window.driver.Click(button);
-	for (const BPoint& point : { BPoint(0, 0), BPoint(1, 30), BPoint(99, 59), BPoint(94, 56) })
-		EXPECT_FALSE(IsBlue(window.driver.PixelAt(plain, point))) << point.x << "," << point.y;
-	EXPECT_TRUE(IsBlue(window.driver.PixelAt(button, BPoint(0, 0))));
-}
-
-
-TEST_F(WorkViewTest, TheHighlightFollowsAMove)
-{
-	window.driver.Click(plain);
-	window.driver.Key("Right", 0, 5);
-	EXPECT_TRUE(IsBlue(window.driver.PixelAt(plain, BPoint(0, 0))));
-	EXPECT_FALSE(IsBlue(window.driver.PixelAt(root, BPoint(20, 40))));
-}
-
-
-TEST_F(WorkViewTest, AFrameControledViewHasNoTriangle)
-{
-	window.driver.Click(target);
-	EXPECT_TRUE(IsBlue(window.driver.PixelAt(target, BPoint(0, 0))));
-	const BRect bounds = target->Bounds();
-	EXPECT_FALSE(
-		IsBlue(window.driver.PixelAt(target, BPoint(bounds.right - 4, bounds.bottom - 4))));
-}
-
-
-TEST_F(WorkViewTest, TheHighlightHidesBehindASibling)
-{
-	BView* cover = new BView(BRect(60, 10, 110, 90), "cover", B_FOLLOW_NONE, B_WILL_DRAW);
-	window.Locked([&] { root->AddChild(cover); });
-	window.driver.Click(plain, BPoint(10, 10));
-	EXPECT_TRUE(IsBlue(window.driver.PixelAt(plain, BPoint(10, 0))));
-	EXPECT_FALSE(IsBlue(window.driver.PixelAt(cover, BPoint(20, 10))));
-	EXPECT_TRUE(IsBlue(window.driver.PixelAt(plain, BPoint(97, 0))));
-}
-
-
-TEST_F(WorkViewTest, ADeletedViewLeavesNoHighlight)
-{
-	window.driver.Click(plain);
-	window.driver.Key("Delete");
-	EXPECT_FALSE(IsBlue(window.driver.PixelAt(root, BPoint(20, 20))));
-}
-
-
-TEST_F(WorkViewTest, TheGroundIsAlignedToTheContainer)
-{
-	// Scrolled by the origin, the pattern slides along.
-	BView* container = workView->Container();
-	for (const BPoint& cell : { BPoint(340, 48), BPoint(344, 52), BPoint(352, 56) }) {
-		const bool light = (static_cast<int>(cell.x) / 4 + static_cast<int>(cell.y) / 4) % 2 == 0;
-		EXPECT_EQ(light ? 204 : 153, window.driver.PixelAt(container, cell).red);
-	}
+	EXPECT_EQ(target, workView->SelectedView());
+	EXPECT_EQ(beeps + 2, Driver::CountBeeps());
 }
 
 
@@ -484,12 +404,15 @@ TEST_F(WorkViewTest, ColorsOfTheTreeSurvive)
 }
 
 
-TEST_F(WorkViewTest, KeysWithNothingSelectedDoNothing)
+TEST_F(WorkViewTest, KeysWithNothingSelectedBeep)
 {
 	window.driver.Click(plain);
 	window.Locked([&] { workView->SetEditView(NULL); });
+	const int32 beeps = Driver::CountBeeps();
 	window.driver.Key("Delete");
 	window.driver.Key("Left");
+	window.driver.Key("a");
+	EXPECT_EQ(beeps + 3, Driver::CountBeeps());
 	EXPECT_EQ(NULL, workView->SelectedView());
 	EXPECT_EQ(0, listener->moves);
 }
