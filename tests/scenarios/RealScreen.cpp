@@ -71,9 +71,11 @@ RealScreen::RealScreen()
 	int ends[2];
 	if (pipe(ends) != 0)
 		return;
+	// Without -noreset the server drops everybody when a first question ends before the window
+	// manager has come.
 	fServer = std::make_unique<RunningProgram>(
 		std::vector<std::string> { "Xvfb", "-displayfd", std::to_string(ends[1]), "-screen", "0",
-			"1600x1000x24", "-nolisten", "tcp" },
+			"1600x1000x24", "-nolisten", "tcp", "-noreset" },
 		std::vector<std::string>(), ends[1]);
 	close(ends[1]);
 	fDisplay = ':' + ReadDisplay(ends[0]);
