@@ -8,6 +8,7 @@
 #include <File.h>
 #include <Message.h>
 #include <MessageForm.h>
+#include <ResourceForm.h>
 #include <Resources.h>
 
 using namespace BResEditor;
@@ -134,12 +135,12 @@ ResourceDocument::SaveAs(const char* path)
 	if (status != B_OK)
 		return status;
 
-	// What an existing file holds is replaced in one step, once everything is written.
+	// What an existing file holds, whatever it is, is replaced in one step, once everything is written.
 	const bool isNew = !BEntry(path).Exists();
 	BFile file(path, B_READ_WRITE | B_CREATE_FILE);
 	status = file.InitCheck();
 	if (status == B_OK)
-		status = resources.WriteTo(&file);
+		status = write_resources_over(&resources, &file);
 	if (status != B_OK) {
 		if (isNew)
 			BEntry(path).Remove();

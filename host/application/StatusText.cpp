@@ -10,8 +10,11 @@ StatusText(status_t status)
 		case B_ENTRY_NOT_FOUND:
 			return "there is no such file";
 		case B_PERMISSION_DENIED:
-		case B_NOT_ALLOWED:
 			return "that is not permitted";
+		case B_NOT_ALLOWED:
+			return "it is read-only, or its owner and group could not be kept";
+		case B_NOT_SUPPORTED:
+			return "its attributes could not be kept";
 		case B_IS_A_DIRECTORY:
 			return "it is a folder";
 		case B_NOT_A_DIRECTORY:

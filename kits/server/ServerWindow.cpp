@@ -22,6 +22,14 @@ Display()
 	return Desktop::Get()->Thread();
 }
 
+
+// A window always has a pixel, whatever size a program asks for; not even a number need it be.
+int32
+PixelsOf(float extent)
+{
+	return extent > 0 ? static_cast<int32>(std::min(extent, float(kMaxSide - 1))) + 1 : 1;
+}
+
 } // namespace
 
 
@@ -252,10 +260,9 @@ ServerWindow::Back()
 bool
 ServerWindow::Prepare()
 {
-	// A window always has a pixel, whatever size a program asks for.
 	const BRect frame = Frame();
-	const int32 width = std::clamp(static_cast<int32>(frame.Width()) + 1, 1, kMaxSide);
-	const int32 height = std::clamp(static_cast<int32>(frame.Height()) + 1, 1, kMaxSide);
+	const int32 width = PixelsOf(frame.Width());
+	const int32 height = PixelsOf(frame.Height());
 	const float scale = Scale();
 	if (fBack->IsValid() && fBack->Width() == width && fBack->Height() == height
 		&& fBack->Scale() == scale)

@@ -6,6 +6,7 @@
 #include <String.h>
 #include <SupportDefs.h>
 
+class BFile;
 class BPositionIO;
 class BResources;
 
@@ -53,3 +54,8 @@ status_t examine_resource_file(BPositionIO* file, resource_file_info* _info,
 // The bytes of the resource that GetResourceInfo() tells about by this index, also where an earlier
 // one has the same type and id. They stay the resources' own, as those of LoadResource().
 const void* load_resource(BResources* resources, int32 index, size_t* _size);
+
+// BResources::WriteTo() into a file that may be no resource file, or a damaged one: that is given up
+// as by SetTo() with `clobber`, but in one step, so that the file is at every moment what it was or
+// holds all resources. An executable's own part stays.
+status_t write_resources_over(BResources* resources, BFile* file);

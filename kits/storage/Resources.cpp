@@ -114,6 +114,19 @@ struct BResources::State {
 		return frame.info.base <= static_cast<off_t>(kX86HeaderSize);
 	}
 
+	// What the file has besides its resources. What a damaged or foreign file holds is given up; an
+	// executable's own part never is.
+	void AdoptFrame(const ResourceReader& reader, status_t status)
+	{
+		frame = ResourceFrame();
+		if (reader.Info().kind == B_NO_RESOURCE_FILE)
+			return;
+		frame.info = reader.Info();
+		frame.size = reader.FileSize();
+		if (status == B_OK)
+			frame.extras = reader.Extras();
+	}
+
 	status_t Adopt(ResourceReader& reader)
 	{
 		frame.info = reader.Info();
@@ -339,32 +352,14 @@ BResources::MergeFrom(BFile* from)
 status_t
 BResources::WriteTo(BFile* file)
 {
-	if (file == NULL)
-		return B_BAD_VALUE;
-	if (file->InitCheck() != B_OK)
-		return file->InitCheck();
-	if (!file->IsWritable())
-		return B_NOT_ALLOWED;
+	return _WriteTo(file, false);
+}
 
-	// Only the frame of the other file stays; its resources are replaced by ours.
-	BFile target(*file);
-	ResourceReader reader(target, false);
-	const Stamp stamp = StampOf(target._Fd());
-	const status_t status = reader.Read();
-	if (status != B_OK)
-		return status;
-	if (fState->LoadAll(fFile._Fd()) != B_OK)
-		return B_IO_ERROR;
 
-	fState->frame.info = reader.Info();
-	fState->frame.extras = reader.Extras();
-	fState->frame.size = reader.FileSize();
-	fState->stamp = stamp;
-	fState->path = PathOf(target._Fd());
-	fState->readOnly = false;
-	fState->changed = true;
-	fFile = target;
-	return _Save();
+status_t
+write_resources_over(BResources* resources, BFile* file)
+{
+	return resources->_WriteTo(file, true);
 }
 
 
@@ -624,15 +619,44 @@ BResources::_SetTo(bool clobber)
 		return status;
 	}
 
-	// What a damaged or foreign file holds is given up; an executable's own part never is.
-	const resource_file_kind kind = reader.Info().kind;
 	if (reader.Info().base == 0)
 		return status;
-	if (kind != B_NO_RESOURCE_FILE) {
-		fState->frame.info = reader.Info();
-		fState->frame.size = reader.FileSize();
-	}
+	fState->AdoptFrame(reader, B_ERROR);
 	return _Save();
+}
+
+
+// Only the frame of the other file stays; its resources are replaced by ours.
+status_t
+BResources::_WriteTo(BFile* file, bool clobber)
+{
+	if (file == NULL)
+		return B_BAD_VALUE;
+	if (file->InitCheck() != B_OK)
+		return file->InitCheck();
+	if (!file->IsWritable())
+		return B_NOT_ALLOWED;
+
+	BFile target(*file);
+	ResourceReader reader(target, false);
+	const Stamp stamp = StampOf(target._Fd());
+	const status_t status = reader.Read();
+	if (status != B_OK && (!clobber || reader.Info().base == 0))
+		return status;
+	if (fState->LoadAll(fFile._Fd()) != B_OK)
+		return B_IO_ERROR;
+
+	fState->AdoptFrame(reader, status);
+	fState->stamp = stamp;
+	fState->path = PathOf(target._Fd());
+	fState->readOnly = false;
+	fState->changed = true;
+	fFile = target;
+	const status_t saved = _Save();
+	// Who was told that it failed does not expect it to be tried again at our end.
+	if (saved != B_OK)
+		fFile.Unset();
+	return saved;
 }
 
 

@@ -42,7 +42,8 @@ public:
 	status_t Sync();
 	// Adds all resources of `from`; those with a known key replace ours and move to the end.
 	status_t MergeFrom(BFile* from);
-	// Writes into `file` and belongs to it from then on.
+	// Writes into `file`, which must be a resource file, an executable or empty, and belongs to it
+	// from then on; after an error to no file. What the file had besides resources stays.
 	status_t WriteTo(BFile* file);
 
 	status_t AddResource(
@@ -70,6 +71,7 @@ public:
 
 private:
 	friend const void* load_resource(BResources* resources, int32 index, size_t* _size);
+	friend status_t write_resources_over(BResources* resources, BFile* file);
 
 	BResources(const BResources&);
 	BResources& operator=(const BResources&);
@@ -77,7 +79,7 @@ private:
 	struct State;
 
 	status_t _SetTo(bool clobber);
-	status_t _Read(BFile& file);
+	status_t _WriteTo(BFile* file, bool clobber);
 	status_t _Save();
 	status_t _CheckChange() const;
 	const void* _LoadAt(int32 index, size_t* _size);

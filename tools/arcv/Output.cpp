@@ -51,7 +51,9 @@ StatusText(status_t status)
 		case B_PERMISSION_DENIED:
 			return "permission denied";
 		case B_NOT_ALLOWED:
-			return "this is not allowed: the file is read-only, or its owner could not be kept";
+			return "the file is read-only, or its owner and group could not be kept";
+		case B_NOT_SUPPORTED:
+			return "the file's attributes could not be kept";
 		case B_IS_A_DIRECTORY:
 			return "this is a directory";
 		case B_NOT_A_DIRECTORY:

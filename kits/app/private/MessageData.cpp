@@ -285,7 +285,8 @@ MessageData::NameAt(uint32 index) const
 		size_t offset = fCount * sizeof(uint32);
 		for (uint32 i = 0; i < fCount; i++) {
 			write_uint32(made + i * sizeof(uint32), uint32(offset));
-			memcpy(made + offset, NameBytes(fFields[i]), fFields[i].nameLength);
+			if (fFields[i].nameLength > 0)
+				memcpy(made + offset, NameBytes(fFields[i]), fFields[i].nameLength);
 			made[offset + fFields[i].nameLength] = '\0';
 			offset += fFields[i].nameLength + size_t(1);
 		}
@@ -508,7 +509,8 @@ MessageData::AddMessageField(const char* name, size_t length, type_code type, Me
 	field.table = table;
 	data->Acquire();
 	table[0] = ItemPlace::Nested(data).Word();
-	memcpy(fStore + fStoreSize, name, length);
+	if (length > 0)
+		memcpy(fStore + fStoreSize, name, length);
 	fStoreSize += uint32(length);
 	_NoteNested(type, { nullptr, 0, data });
 	_AddToIndex(fCount++);
@@ -665,7 +667,8 @@ MessageData::RenameField(uint32 number, const char* name, size_t length)
 	_Changed();
 	fStoreIsBody = false;
 	fBodySize = 0;
-	memcpy(fStore + fStoreSize, name, length);
+	if (length > 0)
+		memcpy(fStore + fStoreSize, name, length);
 	field.name = fStoreSize;
 	field.nameLength = uint16(length);
 	field.key = name_key(name, length);

@@ -294,7 +294,8 @@ MessageReader::_ReadR5Field(size_t* position, Field* field)
 	field->fixed = (flags & kR5Fixed) != 0;
 
 	field->flags = 0;
-	if (single == (field->count == 1) && (flags & 0xf0) == 0) {
+	const bool whole = field->size == field->stated;
+	if (whole && single == (field->count == 1) && (flags & 0xf0) == 0) {
 		const bool fitsMini = field->count <= 255 && field->size <= 255;
 		field->flags |= mini == fitsMini ? MessageField::kCompact : 0;
 		field->flags |= mini ? 0 : MessageField::kWide;

@@ -76,7 +76,8 @@ write_r5_field_header(
 {
 	to = write_r5_field_head(to, field, size, form);
 	const size_t length = min_c(field.nameLength, 255);
-	memcpy(to, data.NameBytes(field), length);
+	if (length > 0)
+		memcpy(to, data.NameBytes(field), length);
 	return to + length;
 }
 
@@ -340,7 +341,8 @@ MessageWriter::_WriteHaiku(const MessageData& data, uint32 what, size_t size, ui
 		write_uint32(header + 8, field.count);
 		write_uint32(header + 12, uint32(fFieldSizes[fNextField++]));
 		write_uint32(header + 16, uint32(at - area));
-		memcpy(at, data.NameBytes(field), field.nameLength);
+		if (field.nameLength > 0)
+			memcpy(at, data.NameBytes(field), field.nameLength);
 		at[field.nameLength] = 0;
 		at = _WriteItems(data, i, at + field.nameLength + 1);
 	}

@@ -300,8 +300,10 @@ AtomicFile::_CopyAttributes()
 			return LastStatus();
 		value.resize(size);
 		const ssize_t read = getxattr(path.c_str(), name, value.data(), value.size());
-		if (read < 0 || fsetxattr(Fd(), name, value.data(), read, 0) < 0)
+		if (read < 0)
 			return LastStatus();
+		if (fsetxattr(Fd(), name, value.data(), read, 0) < 0)
+			return errno == EPERM || errno == EACCES ? B_NOT_SUPPORTED : LastStatus();
 	}
 	return B_OK;
 }

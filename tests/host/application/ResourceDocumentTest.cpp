@@ -1,5 +1,7 @@
 #include "host/application/ResourceDocument.h"
 
+#include <sys/stat.h>
+
 #include <cstdio>
 #include <fstream>
 #include <iterator>
@@ -94,15 +96,34 @@ TEST(ResourceDocument, SavingOverAnotherFileReplacesItsItems)
 }
 
 
-TEST(ResourceDocument, AFailedSaveLeavesTheOtherFileAlone)
+TEST(ResourceDocument, SavingOverAnyFileReplacesIt)
 {
 	const std::string path = PathOf("notes.txt");
-	const std::string text = "no resources, but somebody's notes";
-	std::ofstream(path, std::ios::binary) << text;
+	std::ofstream(path, std::ios::binary) << "no resources, but somebody's notes";
+	chmod(path.c_str(), 0640);
 	ResourceDocument document;
 	Add(document, 1, "ours");
-	if (document.SaveAs(path.c_str()) != B_OK)
-		EXPECT_EQ(text, BytesOf(path));
+	ASSERT_EQ(B_OK, document.SaveAs(path.c_str()));
+	EXPECT_FALSE(document.IsModified());
+	ResourceDocument again;
+	ASSERT_EQ(B_OK, again.Load(path.c_str()));
+	EXPECT_EQ("ours", DataOf(again, 1));
+	struct stat stat;
+	ASSERT_EQ(0, ::stat(path.c_str(), &stat));
+	EXPECT_EQ(0640u, stat.st_mode & 07777);
+}
+
+
+// Where an executable ends that is cut off, nobody knows: nothing may be written over it.
+TEST(ResourceDocument, AFailedSaveLeavesTheOtherFileAlone)
+{
+	const std::string path = PathOf("program");
+	const std::string program = "\177ELF\002\001\001, cut off";
+	std::ofstream(path, std::ios::binary) << program;
+	ResourceDocument document;
+	Add(document, 1, "ours");
+	EXPECT_NE(B_OK, document.SaveAs(path.c_str()));
+	EXPECT_EQ(program, BytesOf(path));
 	EXPECT_NE(B_OK, document.SaveAs("/nowhere/at all/file.rsrc"));
 	EXPECT_TRUE(document.IsModified());
 }
