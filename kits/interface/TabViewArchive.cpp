@@ -3,6 +3,7 @@
 
 #include <algorithm>
 #include <memory>
+#include <typeinfo>
 
 #include <Message.h>
 
@@ -79,10 +80,12 @@ BTabView::_ReadTabs(BMessage* archive)
 	int32 listed = 0;
 	archive->GetInfo("_view_list", NULL, &listed);
 
-	// Old archives have no list but the pages beside, or inside of, the container, in tab order.
+	// Old archives have no list but the pages beside, or inside of, the container, in tab order. The
+	// children of a container that is more than a view are its own parts.
+	const bool plain = typeid(*fContainer) == typeid(BView);
 	if (listed == 0 && CountChildren() > 1)
 		fPagePlace = PagePlace::kBesideContainer;
-	else if (listed == 0 && fContainer->CountChildren() > 0)
+	else if (listed == 0 && plain && fContainer->CountChildren() > 0)
 		fPagePlace = PagePlace::kInContainer;
 
 	std::vector<BView*> pages;
@@ -90,7 +93,7 @@ BTabView::_ReadTabs(BMessage* archive)
 		for (int32 i = 0; i < listed; i++)
 			pages.push_back(RevivePage(archive, "_view_list", i));
 		// An archive may have the selected page in the container as well: the list's copy counts.
-		while (BView* copy = fContainer->ChildAt(0)) {
+		while (BView* copy = plain ? fContainer->ChildAt(0) : NULL) {
 			copy->RemoveSelf();
 			delete copy;
 		}

@@ -15,6 +15,7 @@
 #include "interface/private/ViewPrivate.h"
 #include "interface/private/ViewState.h"
 #include "interface/private/ViewWalk.h"
+#include "support/private/Saturate.h"
 
 namespace BPrivate {
 
@@ -133,8 +134,8 @@ WindowInternals::FrameChanged(ServerView& node, bool moved, bool resized)
 	if (resized) {
 		auto message = new BMessage(B_VIEW_RESIZED);
 		message->AddInt64("when", system_time());
-		message->AddInt32("width", static_cast<int32>(frame.Width()));
-		message->AddInt32("height", static_cast<int32>(frame.Height()));
+		message->AddInt32("width", saturated(frame.Width()));
+		message->AddInt32("height", saturated(frame.Height()));
 		looper.PostSystemTo(message, view);
 	}
 }
