@@ -187,14 +187,43 @@ private:
 
 	status_t _ConvertObject(BMessage* object, int32 token, int32 depth)
 	{
-		for (const char* name : kObjectFields) {
-			const status_t status = _ConvertField(object, name, depth);
-			if (status != B_OK)
-				return status;
-		}
+		const status_t status = _ConvertFields(object, depth);
+		if (status != B_OK)
+			return status;
 		ManagedNote* note = new ManagedNote(fOrigin, token);
 		set_note(object, note);
 		note->Release();
+		return B_OK;
+	}
+
+	status_t _ConvertFields(BMessage* object, int32 depth)
+	{
+		status_t status = B_OK;
+		for (const char* name : kObjectFields) {
+			if (status == B_OK)
+				status = _ConvertField(object, name, depth);
+		}
+		for (const char* name : kObjectFields) {
+			if (status == B_OK && holds_objects(*object, name))
+				status = _ConvertNested(object, name, depth);
+		}
+		return status;
+	}
+
+	// Children that lie in the archive as messages are objects of it too once it is written, so
+	// what looks like tokens in them must be some.
+	status_t _ConvertNested(BMessage* object, const char* name, int32 depth)
+	{
+		BMessage child;
+		for (int32 i = 0; object->FindMessage(name, i, &child) == B_OK; i++) {
+			if (note_of(child) != nullptr)
+				continue; // has been a token, and is done
+			status_t status = _ConvertFields(&child, depth + 1);
+			if (status == B_OK)
+				status = object->ReplaceMessage(name, i, &child);
+			if (status != B_OK)
+				return status;
+		}
 		return B_OK;
 	}
 
