@@ -291,6 +291,26 @@ DesktopThread::WindowAt(BPoint screen) const
 void
 DesktopThread::Show(const WindowReference& window, bool show)
 {
+	window->wantsShown = show;
+	_ShowNative(window, show && fPolicy->MayBeSeen(*window));
+}
+
+
+void
+DesktopThread::UpdateFloating()
+{
+	// Showing a window may end in reports that add or remove others.
+	const std::vector<WindowReference> windows = fWindows;
+	for (const WindowReference& window : windows) {
+		if (window->IsFloating())
+			_ShowNative(window, window->wantsShown && fPolicy->MayBeSeen(*window));
+	}
+}
+
+
+void
+DesktopThread::_ShowNative(const WindowReference& window, bool show)
+{
 	if (window->native == nullptr || window->nativeShown == show)
 		return;
 
@@ -323,6 +343,7 @@ DesktopThread::ApplyTraits(const WindowReference& window)
 	if (window->native == nullptr)
 		return;
 	window->native->SetTraits(window->Traits());
+	_ShowNative(window, window->wantsShown && fPolicy->MayBeSeen(*window));
 	UpdateOwners();
 	fPointer->WindowsRearranged();
 }

@@ -63,7 +63,9 @@ public:
 	WindowReference Find(uint32 id) const;
 	WindowReference WindowAt(BPoint screen) const;
 
-	void Show(const WindowReference& window, bool show);
+	void Show(const WindowReference& window, bool show); // as the program wants it
+	// Shows the floating windows that may be seen now, and takes the others off the screen.
+	void UpdateFloating();
 	void ApplyTraits(const WindowReference& window);
 	void Activate(const WindowReference& window);
 	void Flush(const WindowReference& window);
@@ -93,6 +95,7 @@ private:
 	};
 
 	void _Run(class StartSignal& signal);
+	void _ShowNative(const WindowReference& window, bool show);
 	void _WindowChanged(const BackendEvent& event);
 	void _ScreenChanged();
 

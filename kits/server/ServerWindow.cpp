@@ -102,6 +102,7 @@ ServerWindow::AddToSubset(const ServerWindow& main)
 	Display().Post([window = fRecord, id = main.Id()] {
 		window->subset.push_back(id);
 		Display().UpdateOwners();
+		Display().UpdateFloating();
 	});
 }
 
@@ -112,6 +113,7 @@ ServerWindow::RemoveFromSubset(const ServerWindow& main)
 	Display().Post([window = fRecord, id = main.Id()] {
 		std::erase(window->subset, id);
 		Display().UpdateOwners();
+		Display().UpdateFloating();
 	});
 }
 

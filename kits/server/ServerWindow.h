@@ -20,6 +20,9 @@ struct CursorShape;
 // that was shown last instead of the active window.
 constexpr uint32 kMenuWindowFeel = 1025;
 
+// The feel of a tool tip's window: above all others as a menu is, but with no part in the input.
+constexpr uint32 kTipWindowFeel = 1026;
+
 // A bool in a mouse message: true if the pointer is not over this window, because it is over
 // another or outside; such a message concerns views with an event mask, and a view to be left.
 constexpr const char* kPointerElsewhere = "be:elsewhere";

@@ -31,7 +31,7 @@ IsFloatingFeel(uint32 feel)
 WindowTraits::Kind
 KindOf(uint32 feel)
 {
-	if (feel == kMenuWindowFeel)
+	if (feel == kMenuWindowFeel || feel == kTipWindowFeel)
 		return WindowTraits::Kind::Menu;
 	if (IsModalFeel(feel))
 		return WindowTraits::Kind::Modal;
@@ -97,6 +97,13 @@ bool
 WindowRecord::IsFloating() const
 {
 	return IsFloatingFeel(Feel());
+}
+
+
+bool
+WindowRecord::FloatsOverAll() const
+{
+	return Feel() == kFloatingAllFeel;
 }
 
 

@@ -43,6 +43,7 @@ public:
 	bool IsMenu() const;
 	bool IsModal() const;
 	bool IsFloating() const;
+	bool FloatsOverAll() const; // over windows of other programs too
 	bool HasSubset() const; // floats over, or blocks, the windows of its subset alone
 	void Change(const std::function<void(Properties&)>& change);
 	// The program wants another frame; reports of the desktop are out of date until it is applied.
@@ -72,7 +73,8 @@ public:
 	std::vector<uint32> subset; // ids of the windows that it is modal or floating for
 	uint32 owner = 0; // id of the window that it stays above; 0 for none
 	int64 shownSerial = 0; // the later shown, the larger
-	bool nativeShown = false;
+	bool wantsShown = false; // by the program, as far as the display thread has come
+	bool nativeShown = false; // a floating window is not while its program is inactive
 	bool hasCursor = false;
 	CursorShape cursor;
 	int64 flushes = 0;

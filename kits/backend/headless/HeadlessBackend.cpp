@@ -241,7 +241,10 @@ HeadlessBackend::Inject(const BackendEvent& event)
 			break;
 
 		case Type::WindowActivated:
-			static_cast<HeadlessWindow*>(event.window)->Activate();
+			if (event.window != nullptr)
+				static_cast<HeadlessWindow*>(event.window)->Activate();
+			else
+				SetActive(nullptr); // as if another program's window were active
 			break;
 
 		case Type::DragMoved:

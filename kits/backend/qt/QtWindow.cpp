@@ -92,6 +92,9 @@ QtWindow::_ApplyFlags()
 	flags.setFlag(Qt::WindowDoesNotAcceptFocus, !fTraits.takesFocus);
 	flags.setFlag(Qt::WindowStaysOnTopHint, fFloatsAbove);
 	setFlags(flags);
+	// A floating window that comes back with its program leaves the keyboard where it is; one that
+	// the program opens is made active by itself.
+	setProperty("_q_showWithoutActivating", fTraits.kind == WindowTraits::Kind::Floating);
 }
 
 

@@ -12,6 +12,7 @@ namespace {
 
 constexpr uint32 kAcceptsFirstClick = 0x10, kAvoidFocus = 0x2000, kAvoidFront = 0x80;
 constexpr uint32 kModalSubsetFeel = 2;
+constexpr bigtime_t kPassing = 300000; // that long no window of ours may be active on the way
 
 
 std::unique_ptr<BMessage>
@@ -21,6 +22,13 @@ ActivationMessage(bool active)
 	message->AddInt64("when", system_time());
 	message->AddBool("active", active);
 	return message;
+}
+
+
+bool
+IsInSubset(const WindowRecord& owned, const WindowRecord& main)
+{
+	return std::find(owned.subset.begin(), owned.subset.end(), main.Id()) != owned.subset.end();
 }
 
 } // namespace
@@ -60,6 +68,11 @@ WindowPolicy::Activated(const WindowReference& window)
 	}
 	if ((before == nullptr) != (window == nullptr))
 		fDesktop.PostToApplication(ActivationMessage(window != nullptr));
+	// Desktops take the keyboard from one window before they give it to the next.
+	if (window != nullptr || fDesktop.GetBackend().IsImmediate())
+		_UpdateBackground();
+	else
+		fDesktop.GetBackend().PostLater(kPassing, [this] { _UpdateBackground(); });
 
 	const WindowReference blocker = BlockerOf(window);
 	if (blocker != nullptr)
@@ -120,9 +133,39 @@ WindowPolicy::BlockerOf(const WindowReference& window) const
 bool
 WindowPolicy::_Concerns(const WindowRecord& modal, const WindowRecord& window) const
 {
-	if (modal.Feel() != kModalSubsetFeel)
+	return modal.Feel() != kModalSubsetFeel || IsInSubset(modal, window);
+}
+
+
+void
+WindowPolicy::_UpdateBackground()
+{
+	fInBackground = fActive == nullptr;
+	fDesktop.UpdateFloating();
+}
+
+
+bool
+WindowPolicy::_ShowsNormalWindow() const
+{
+	for (const WindowReference& window : fDesktop.Windows()) {
+		const WindowTraits::Kind kind = window->Traits().kind;
+		if (window->nativeShown && kind != WindowTraits::Kind::Menu
+			&& kind != WindowTraits::Kind::Floating)
+			return true;
+	}
+	return false;
+}
+
+
+bool
+WindowPolicy::MayBeSeen(const WindowRecord& window) const
+{
+	if (!window.IsFloating() || window.FloatsOverAll())
 		return true;
-	return std::find(modal.subset.begin(), modal.subset.end(), window.Id()) != modal.subset.end();
+	if (fInBackground)
+		return !_ShowsNormalWindow();
+	return !window.HasSubset() || fLastNormal == nullptr || IsInSubset(window, *fLastNormal);
 }
 
 
@@ -174,6 +217,8 @@ WindowPolicy::WindowHidden(const WindowReference& window)
 	}
 	if (fActive == window)
 		Activated(nullptr);
+	else if (!window->IsFloating())
+		fDesktop.UpdateFloating();
 }
 
 

@@ -26,6 +26,10 @@ public:
 
 	// The modal window that keeps input from this one, or NULL.
 	WindowReference BlockerOf(const WindowReference& window) const;
+	// Floating windows go with the others of their program: they are off the screen while another
+	// program is active, one with a subset also while none of that was active last. Where there are
+	// no others they stay, as nothing else could bring them back.
+	bool MayBeSeen(const WindowRecord& window) const;
 	BackendWindow* OwnerOf(const WindowReference& window) const;
 	WindowReference LastMenu() const; // the shown menu window that was opened last
 
@@ -34,11 +38,14 @@ public:
 
 private:
 	bool _Concerns(const WindowRecord& modal, const WindowRecord& window) const;
+	void _UpdateBackground();
+	bool _ShowsNormalWindow() const;
 
 	DesktopThread& fDesktop;
 	WindowReference fActive;
 	WindowReference fLastNormal; // the normal window that was active last
 	std::atomic<uint32> fActiveId { 0 };
+	bool fInBackground = false; // another program has been active for a while
 };
 
 

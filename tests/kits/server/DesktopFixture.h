@@ -48,6 +48,8 @@ public:
 		kNormalFeel = 0,
 		kModalAppFeel = 1,
 		kFloatingAppFeel = 4,
+		kFloatingSubsetFeel = 5,
+		kFloatingAllFeel = 6,
 		kAcceptsFirstClick = 0x10,
 		kAvoidFocus = 0x2000
 	};

@@ -10,6 +10,33 @@ const BRect kLeft(0, 0, 99, 99);
 const BRect kRight(200, 0, 299, 99);
 const BPoint kInLeft(50, 50);
 const BPoint kInRight(250, 50);
+const BRect kBelow(0, 200, 99, 299);
+const BPoint kInBelow(50, 250);
+
+
+void
+ActivateOtherProgram()
+{
+	BackendEvent event;
+	event.type = BackendEvent::Type::WindowActivated;
+	Desktop::Get()->Inject(event);
+	Desktop::Get()->RunOnDisplay([] {});
+}
+
+
+// Whether the pointer finds the window there.
+bool
+IsOnScreen(TestWindow& window, ScriptedInput& input, BPoint where)
+{
+	input.Move(BPoint(1500, 900));
+	input.Move(where);
+	Desktop::Get()->RunOnDisplay([] {});
+	for (const std::unique_ptr<BMessage>& message : window.Take(B_MOUSE_MOVED)) {
+		if (!IsElsewhere(*message) && message->FindPoint("screen_where") == where)
+			return true;
+	}
+	return false;
+}
 
 } // namespace
 
@@ -75,12 +102,12 @@ TEST_F(WindowPolicy, WindowThatAvoidsTheFocusIsNeverActive)
 TEST_F(WindowPolicy, ModalWindowKeepsPressesFromTheOthers)
 {
 	TestWindow window(kLeft);
-	TestWindow floating(BRect(0, 200, 99, 299), TestWindow::kFloatingAppFeel);
+	TestWindow floating(kBelow, TestWindow::kFloatingAppFeel);
 	TestWindow modal(kRight, TestWindow::kModalAppFeel);
 	Settle();
 	window.Take();
 	Click(kInLeft);
-	Click(BPoint(50, 250));
+	Click(kInBelow);
 	EXPECT_TRUE(modal.server.IsActive());
 	EXPECT_TRUE(floating.Take(B_MOUSE_DOWN).empty());
 
@@ -129,6 +156,73 @@ TEST_F(WindowPolicy, FloatingWindowStaysAboveAWindowThatIsActivated)
 	Click(kInLeft);
 	EXPECT_EQ(1u, floating.Take(B_MOUSE_DOWN).size());
 	EXPECT_TRUE(window.Take(B_MOUSE_DOWN).empty());
+}
+
+
+TEST_F(WindowPolicy, FloatingWindowsLeaveWithTheirProgramAndComeBackWithIt)
+{
+	TestWindow window(kLeft);
+	TestWindow floating(kRight, TestWindow::kFloatingAppFeel, TestWindow::kAvoidFocus);
+	TestWindow above(kBelow, TestWindow::kFloatingAllFeel, TestWindow::kAvoidFocus);
+	Settle();
+	ActivateOtherProgram();
+	EXPECT_FALSE(IsOnScreen(floating, input, kInRight));
+	EXPECT_TRUE(IsOnScreen(above, input, kInBelow));
+	EXPECT_TRUE(IsOnScreen(window, input, kInLeft));
+	EXPECT_TRUE(floating.server.IsShown()) << "as far as the program knows";
+
+	Click(kInLeft);
+	EXPECT_TRUE(window.server.IsActive());
+	EXPECT_TRUE(IsOnScreen(floating, input, kInRight));
+}
+
+
+TEST_F(WindowPolicy, FloatingWindowThatIsShownInTheBackgroundWaitsForItsProgram)
+{
+	TestWindow window(kLeft);
+	Settle();
+	ActivateOtherProgram();
+	TestWindow floating(kRight, TestWindow::kFloatingAppFeel, TestWindow::kAvoidFocus);
+	Settle();
+	EXPECT_FALSE(IsOnScreen(floating, input, kInRight));
+	window.server.Activate();
+	Settle();
+	EXPECT_TRUE(IsOnScreen(floating, input, kInRight));
+	floating.server.Hide();
+	Settle();
+	ActivateOtherProgram();
+	window.server.Activate();
+	Settle();
+	EXPECT_FALSE(IsOnScreen(floating, input, kInRight)) << "the program has hidden it";
+}
+
+
+TEST_F(WindowPolicy, FloatingWindowStaysWhenItIsAllThatItsProgramShows)
+{
+	TestWindow window(kLeft);
+	TestWindow floating(kRight, TestWindow::kFloatingAppFeel, TestWindow::kAvoidFocus);
+	Settle();
+	ActivateOtherProgram();
+	window.server.Hide();
+	Settle();
+	EXPECT_TRUE(IsOnScreen(floating, input, kInRight));
+}
+
+
+TEST_F(WindowPolicy, FloatingWindowOfASubsetIsShownWithThatAlone)
+{
+	TestWindow main(kLeft), other(kBelow);
+	TestWindow floating(kRight, TestWindow::kFloatingSubsetFeel, TestWindow::kAvoidFocus);
+	floating.server.AddToSubset(main.server);
+	other.server.Activate();
+	Settle();
+	EXPECT_FALSE(IsOnScreen(floating, input, kInRight));
+	main.server.Activate();
+	Settle();
+	EXPECT_TRUE(IsOnScreen(floating, input, kInRight));
+	floating.server.RemoveFromSubset(main.server);
+	Settle();
+	EXPECT_FALSE(IsOnScreen(floating, input, kInRight));
 }
 
 
