@@ -49,7 +49,8 @@ owner_of(const ServerView* node)
 
 BView::BView(BRect frame, const char* name, uint32 resizingMode, uint32 flags) :
 	BHandler(name), fNode(new ServerView(this, whole_frame(frame), resizingMode | flags)),
-	fOwner(nullptr), fState(nullptr), fExtras(nullptr), fSource(nullptr), fTouched(0), fEntry(0), fRevivedWord(0)
+	fOwner(nullptr), fState(nullptr), fExtras(nullptr), fSource(nullptr), fTouched(0), fEntry(0),
+	fRevivedWord(0)
 {
 }
 
@@ -404,6 +405,8 @@ BView::SetToolTip(const char* text)
 {
 	if (fExtras != nullptr || (text != nullptr && text[0] != '\0'))
 		_Extras()->toolTip = text != nullptr ? text : "";
+	if (fOwner != nullptr && WindowInternals::Of(fOwner).tips.View() == this)
+		WindowInternals::Of(fOwner).tips.Dismiss();
 }
 
 

@@ -292,6 +292,7 @@ BWindow::Hide()
 	if (!wasLocked && !Lock())
 		return;
 	if (fInternals->hideCount++ == 0) {
+		fInternals->tips.Dismiss();
 		fInternals->server->Hide();
 		WindowList::SetShown(this, false);
 	}

@@ -95,6 +95,11 @@ WindowInternals::Route(BMessage* message, BHandler* target)
 	if (_KeepBack(message))
 		return;
 	switch (message->what) {
+		case ToolTips::kRested:
+			delete message;
+			tips.Rested();
+			break;
+
 		case kDragDecided:
 			delete message;
 			_DragDecided();
@@ -187,6 +192,7 @@ WindowInternals::_RoutePress(BMessage* message)
 	_NotePointer(*event);
 	const bool elsewhere = event->GetBool(kPointerElsewhere, false);
 	const bool isDown = event->what == B_MOUSE_DOWN;
+	tips.Dismiss();
 	pointerTarget = elsewhere ? nullptr : owner_of(tree.ViewAt(event->FindPoint("where")));
 	if (isDown)
 		pressed = true;
@@ -228,6 +234,7 @@ WindowInternals::_RouteMove(BMessage* message)
 	enteredView = changed ? view : nullptr;
 	if (otherCursor)
 		ApplyCursor();
+	tips.PointerMoved(view, lastScreen, lastButtons == 0 && !drags);
 
 	bool delivered = _DeliverToMasks(*event, view, true);
 	if (leftView != nullptr && !has_mask(leftView, B_POINTER_EVENTS)) {
@@ -318,6 +325,7 @@ WindowInternals::_IsStale(const BMessage& event)
 void
 WindowInternals::_RouteWheel(BMessage* message)
 {
+	tips.Dismiss();
 	BPoint where;
 	BView* view = mouseView;
 	if (message->FindPoint("where", &where) == B_OK)

@@ -51,6 +51,7 @@ WindowInternals::WindowInternals(
 
 WindowInternals::~WindowInternals()
 {
+	tips.Dismiss();
 	// The display thread must not find us half gone.
 	server.reset();
 }
@@ -94,6 +95,8 @@ WindowInternals::ViewsLeave(ServerView& top)
 		if (leaves(*view))
 			*view = nullptr;
 	}
+	if (leaves(tips.View()))
+		tips.Forget();
 	if (defaultButtonView != nullptr && leaves(defaultButtonView))
 		defaultButtonView = nullptr, defaultButton = nullptr;
 	if (keyMenuBarView != nullptr && leaves(keyMenuBarView))
@@ -112,6 +115,8 @@ WindowInternals::ViewHidden(BView* view)
 	const ServerView& node = *ViewPrivate(view).Node();
 	if (mouseView != nullptr && is_in(ViewPrivate(mouseView).Node(), node))
 		mouseView = nullptr;
+	if (tips.View() != nullptr && is_in(ViewPrivate(tips.View()).Node(), node))
+		tips.Forget();
 	if (focus != nullptr && is_in(ViewPrivate(focus).Node(), node))
 		focus->MakeFocus(false);
 }

@@ -48,8 +48,7 @@ constexpr EditKey kUndoKeys[] = {
 
 // Returns whether the key is one of these and there is a view to send it to.
 bool
-send_edit_key(
-	std::span<const EditKey> keys, BWindow& window, BView* focus, uint32 raw, uint32 held)
+send_edit_key(std::span<const EditKey> keys, BWindow& window, BView* focus, uint32 raw, uint32 held)
 {
 	const auto found = std::find_if(keys.begin(), keys.end(), [raw, held](const EditKey& edit) {
 		return edit.key == raw && (edit.modifiers | B_COMMAND_KEY) == held;
@@ -104,6 +103,8 @@ void
 WindowInternals::_RouteKey(BMessage* message)
 {
 	const std::unique_ptr<BMessage> event(message);
+	if (event->what == B_KEY_DOWN)
+		tips.Dismiss();
 	const std::vector<BView*> views = eventMaskViews;
 	bool suspended = false;
 	for (BView* view : views) {

@@ -10,6 +10,7 @@
 #include <Window.h>
 
 #include "app/private/ArchiveSource.h"
+#include "interface/private/ToolTips.h"
 #include "server/ServerWindow.h"
 #include "server/ViewTree.h"
 
@@ -126,6 +127,7 @@ public:
 	BView* leftView = nullptr;
 	BView* enteredView = nullptr;
 
+	ToolTips tips { window };
 	int32 awaitedDrags = 0;
 	std::deque<std::unique_ptr<BMessage>> keptInput; // from the first press or key on
 
