@@ -74,6 +74,8 @@ protected:
 		const Condition& condition)
 	{
 		for (int attempt = 1; attempt <= kAttempts; attempt++) {
+			// The palette is there while its program is active.
+			screen->Do({ "windowactivate", "--sync", editor });
 			PointAt(from, start);
 			screen->Do({ "mousedown", "1" });
 			PointAt(from, { start.x + 8, start.y + 8 });

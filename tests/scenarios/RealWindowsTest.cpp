@@ -166,3 +166,27 @@ TEST_F(RealWindows, ADragToAnotherWindowShowsItsPictureUnderThePointer)
 	Keys({ "Return" });
 	EXPECT_TRUE(screen->WaitForCount("^Warning!$", 0));
 }
+
+
+TEST_F(RealWindows, ThePaletteLeavesWithItsProgramAndComesBackToItsPlace)
+{
+	const ScratchFolder folder;
+	const std::string file =
+		folder.Copy(ARCHWAY_TEST_DATA "/resources/22-nestedboxes.rsrc", "design.rsrc");
+	Start({ ARCHWAY_BINARIES "/archway", "--open", "ARCV:2", file });
+	const std::string editor = screen->WaitForWindow("ARCV 2");
+	const std::string palette = screen->WaitForWindow("^Widgets$");
+	screen->Do({ "windowmove", "--sync", palette, "1000", "500" });
+	const std::string place = screen->Do({ "getwindowgeometry", palette });
+
+	const RunningProgram other({ ARCHWAY_BINARIES "/gallery" }, screen->Environment());
+	screen->WaitForWindow("^Gallery$");
+	EXPECT_TRUE(screen->WaitForCount("^Widgets$", 0));
+	screen->Do({ "windowactivate", "--sync", editor });
+	const std::string again = screen->WaitForWindow("^Widgets$");
+	const auto position = [](const std::string& geometry) {
+		return geometry.substr(geometry.find("Position"));
+	};
+	EXPECT_EQ(position(place), position(screen->Do({ "getwindowgeometry", again })));
+	EXPECT_EQ(editor, screen->Do({ "getactivewindow" })) << "the keyboard stays where it is";
+}
