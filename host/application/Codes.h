@@ -13,6 +13,8 @@ constexpr uint32 kUndoStep = 'Undo';
 constexpr uint32 kRedoStep = 'Redo';
 constexpr uint32 kOpenItem = 'Oitm';
 constexpr uint32 kDeleteItem = 'Ditm';
+constexpr uint32 kDuplicateItem = 'Dupl';
+constexpr uint32 kItemAttributes = 'Attr';
 constexpr uint32 kGenerateItem = 'Gitm'; // int32 "handler"; the fields of the generate-info
 
 constexpr uint32 kImportItem = 'Iitm';
@@ -21,6 +23,9 @@ constexpr uint32 kExportItem = 'Eitm';
 // From file panels to the file window, with what the user chose.
 constexpr uint32 kImportChosen = 'Icho';
 constexpr uint32 kExportChosen = 'Echo';
+
+// From an attributes window to the file window: int32 "type", int32 "id", string "name".
+constexpr uint32 kAttributesChosen = 'Acho';
 
 // From the file window to an item window: finish what is being typed and write it into the item.
 // Answered, when that is done, by kItemApplied.

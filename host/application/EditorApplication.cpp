@@ -12,6 +12,7 @@
 
 #include "host/application/Codes.h"
 #include "host/application/FileWindow.h"
+#include "host/application/RecentFiles.h"
 #include "host/application/ResourceDocument.h"
 #include "host/application/StatusText.h"
 
@@ -124,8 +125,10 @@ EditorApplication::_OpenFile(const std::string& path)
 
 	auto document = std::make_unique<ResourceDocument>();
 	const status_t status = document->Load(absolute.Path());
-	if (status == B_OK)
+	if (status == B_OK) {
+		RecentFiles::Add(absolute.Path());
 		return _ShowWindow(std::move(document));
+	}
 
 	const std::string text = "\"" + path + "\" could not be opened: " + StatusText(status) + ".";
 	fprintf(stderr, "archway: %s\n", text.c_str());

@@ -12,12 +12,11 @@
 
 #include "host/library/ResourceAddonBase.h"
 
-class BListView;
 class BMenu;
 class BMenuBar;
 class BMenuItem;
 class HandlerSet;
-class ItemRow;
+class ItemList;
 class ItemWindow;
 class ResourceDocument;
 
@@ -30,6 +29,7 @@ public:
 
 	void MessageReceived(BMessage* message) override;
 	void MenusBeginning() override;
+	void WindowActivated(bool active) override;
 	bool QuitRequested() override;
 	void Quit() override;
 
@@ -48,31 +48,45 @@ private:
 	};
 
 	void _AddMenuBar();
+	BMenu* _FileMenu();
+	BMenu* _EditMenu();
+	BMenu* _ResourceMenu();
 	void _AddList(float top);
 	void _AddNewMenu(BMenu* menu);
+	void _ShowRecentFiles();
+	bool _TakeItemCommand(uint32 what);
+	void _ReadChanges();
+	void _UpdateTitle();
+
 	void _OpenHandle(const BResEditor::BResourceHandle& handle);
 	void _OpenSelection();
-	void _DeleteSelection();
+	void _DeleteSelection(const char* operation);
+	void _DuplicateSelection();
+	void _CopySelection();
+	void _Paste();
+	void _AskForAttributes();
+	void _SetAttributes(const BMessage* message);
+	void _CloseAttributes();
 	void _Generate(BMessage* request);
-	void _ReadChanges();
-	void _TakeChange(const BResEditor::BResourceCollection* collection,
-		const BResEditor::BResourceHandle& handle, uint32 changes);
-	ItemRow* _RowFor(const BResEditor::BResourceHandle& handle) const;
-	void _UpdateTitle();
 
 	void _ApplyItemsThen(std::function<void()> next);
 	void _ItemAnswered();
 	void _ItemClosed(const BMessage* message);
 	void _Save();
 	void _SaveAs(const std::string& path);
+	void _Saved();
 	void _AskForPath();
 	void _PlaceChosen(const BMessage* message);
 	bool _MayReplaceFile();
+	void _AskAndRevert();
+	void _AskAboutChangeOnDisk();
+	void _ReadFile();
 	void _AskAndClose();
-	void _CloseItems();
+	void _CloseItemsThen(std::function<void()> next);
 	std::unique_ptr<BFilePanel> _MakePanel(file_panel_mode mode, uint32 what, const char* verb);
 	static std::string _ChosenPath(const BMessage* message);
 	void _Tell(const std::string& text);
+	bool _Ask(const char* title, const std::string& text, const char* verb);
 
 	void _AskForImport();
 	void _Import(const BMessage* message);
@@ -85,16 +99,18 @@ private:
 	BResEditor::BResourceAddonBase fAccess; // our use of the document
 	std::unique_ptr<HandlerSet> fHandlers;
 	BMenuBar* fMenuBar; // child
-	BListView* fList; // child of a scroll view; its rows are ours
-	BMenuItem* fUndoItem; // child of the menu bar
-	BMenuItem* fRedoItem;
+	ItemList* fList; // child of a scroll view
+	BMenu* fRecentMenu; // in the menu bar
 	std::vector<OpenWindow> fItemWindows;
 	std::unique_ptr<BFilePanel> fSavePanel; // each NULL until it is needed
 	std::unique_ptr<BFilePanel> fImportPanel;
 	std::unique_ptr<BFilePanel> fExportPanel;
 	BResEditor::BResourceHandle fExported; // what the export panel was opened for
+	BResEditor::BResourceHandle fDescribed; // what the attributes window was opened for
+	BMessenger fAttributesWindow; // valid while it is open
 	std::function<void()> fAfterApply; // what waits for the item windows' answers
 	size_t fAnswersMissing;
-	bool fClosing; // the item windows are closing, and this one with the last of them
+	std::function<void()> fAfterClosing; // what waits for the item windows to close
 	bool fSaveBeforeClosing;
+	bool fAskedAboutDisk; // since the file was last read or saved
 };

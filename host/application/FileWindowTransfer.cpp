@@ -6,13 +6,13 @@
 #include <DataIO.h>
 #include <Entry.h>
 #include <File.h>
-#include <ListView.h>
 #include <Message.h>
 #include <Path.h>
 #include <TypeConstants.h>
 
 #include "host/application/Codes.h"
-#include "host/application/ItemRow.h"
+#include "host/application/ItemList.h"
+#include "host/application/ReplaceFile.h"
 #include "host/application/StatusText.h"
 
 using namespace BResEditor;
@@ -42,28 +42,6 @@ ReadBytes(const entry_ref& ref, std::vector<uint8>* _bytes)
 	if (read < 0)
 		return static_cast<status_t>(read);
 	return static_cast<size_t>(read) == _bytes->size() ? B_OK : B_IO_ERROR;
-}
-
-
-// A file beside the target takes its place when it is complete.
-status_t
-ReplaceFile(const std::string& path, const void* data, size_t size)
-{
-	const std::string temporary = path + ".archway-new";
-	BFile file(temporary.c_str(), B_READ_WRITE | B_CREATE_FILE | B_ERASE_FILE);
-	status_t status = file.InitCheck();
-	if (status != B_OK)
-		return status;
-	if (file.Write(data, size) != static_cast<ssize_t>(size))
-		status = B_IO_ERROR;
-	if (status == B_OK)
-		status = file.Sync();
-	BEntry entry(temporary.c_str());
-	if (status == B_OK)
-		status = entry.Rename(path.c_str(), true);
-	if (status != B_OK)
-		entry.Remove();
-	return status;
 }
 
 
@@ -127,20 +105,20 @@ FileWindow::_ImportFile(const entry_ref& ref)
 void
 FileWindow::_AskForExport()
 {
-	const ItemRow* row = dynamic_cast<ItemRow*>(fList->ItemAt(fList->CurrentSelection()));
-	if (row == nullptr)
+	const BResourceHandle handle = fList->FirstSelected();
+	if (!handle.IsValid())
 		return;
 
 	std::string name;
 	if (const BResourceCollection* collection = fAccess.ReadLock()) {
-		if (const BResourceItem* item = collection->Item(row->Handle()))
+		if (const BResourceItem* item = collection->Item(handle))
 			name = item->Name();
 		fAccess.ReadUnlock(collection);
 	}
 	for (char& character : name)
 		character = character == '/' ? '-' : character;
 
-	fExported = row->Handle();
+	fExported = handle;
 	if (fExportPanel == nullptr)
 		fExportPanel = _MakePanel(B_SAVE_PANEL, kExportChosen, "Export");
 	fExportPanel->SetSaveText(name.empty() ? "item" : name.c_str());

@@ -157,6 +157,8 @@ ItemWindow::DispatchMessage(BMessage* message, BHandler* handler)
 			PostMessage(B_QUIT_REQUESTED);
 		return;
 	}
+	if (message->what == B_RESOURCE_DATA_CHANGED)
+		_UpdateTitle();
 	BWindow::DispatchMessage(message, handler);
 }
 
@@ -382,8 +384,7 @@ ItemWindow::_TakeShortcut(const BMessage* message)
 {
 	int32 key, modifiers;
 	if (message->FindInt32("raw_char", &key) != B_OK
-		|| message->FindInt32("modifiers", &modifiers) != B_OK
-		|| (modifiers & B_COMMAND_KEY) == 0)
+		|| message->FindInt32("modifiers", &modifiers) != B_OK || (modifiers & B_COMMAND_KEY) == 0)
 		return false;
 
 	if (BMenuItem* own = ItemForKey(fMenuBar, key, modifiers)) {

@@ -1,6 +1,8 @@
 #include "host/application/ResourceDocument.h"
 
+#include <algorithm>
 #include <cstring>
+#include <set>
 
 #include <sys/stat.h>
 
@@ -21,6 +23,33 @@ AddItemTo(BResources& resources, const BResourceItem& item)
 {
 	const void* data = item.Size() > 0 ? item.Data() : "";
 	return resources.AddResource(item.Type(), item.ID(), data, item.Size(), item.Name());
+}
+
+
+// Moves a resource to the end, as it is.
+status_t
+AddAgain(BResources& resources, type_code type, int32 id)
+{
+	const char* name;
+	size_t size;
+	const void* data = resources.LoadResource(type, id, &size);
+	if (data == nullptr || !resources.GetResourceInfo(type, id, &name, &size))
+		return B_IO_ERROR;
+	return resources.AddResource(type, id, data, size, name);
+}
+
+
+std::vector<std::pair<type_code, int32>>
+KeysOf(BResources& resources)
+{
+	std::vector<std::pair<type_code, int32>> keys;
+	type_code type;
+	int32 id;
+	const char* name;
+	size_t size;
+	for (int32 i = 0; resources.GetResourceInfo(i, &type, &id, &name, &size); i++)
+		keys.emplace_back(type, id);
+	return keys;
 }
 
 
@@ -75,22 +104,23 @@ ResourceDocument::Load(const char* path)
 	if (status != B_OK)
 		return status;
 
+	// Everything is in memory before the present items go.
 	const FileStamp stamp = _StampOf(path);
-	WriteAccess access(this, NULL);
-	fReplaying = true; // loading is no undo step
-	while (CountItems() > 0)
-		RemoveItem(HandleAt(CountItems() - 1));
-
 	type_code type;
 	int32 id;
 	const char* name;
 	size_t size;
 	for (int32 i = 0; resources.GetResourceInfo(i, &type, &id, &name, &size); i++) {
+		if (resources.LoadResource(type, id, &size) == nullptr && size > 0)
+			return B_IO_ERROR;
+	}
+
+	WriteAccess access(this, NULL);
+	fReplaying = true; // loading is no undo step
+	while (CountItems() > 0)
+		RemoveItem(HandleAt(CountItems() - 1));
+	for (int32 i = 0; resources.GetResourceInfo(i, &type, &id, &name, &size); i++) {
 		const void* data = resources.LoadResource(type, id, &size);
-		if (data == nullptr && size > 0) {
-			status = B_IO_ERROR;
-			continue;
-		}
 		AddItem(NULL, type, id, name, data, size);
 	}
 	fReplaying = false;
@@ -100,7 +130,7 @@ ResourceDocument::Load(const char* path)
 	fPath = path;
 	fSaved = _PresentItems();
 	fStamp = stamp;
-	return status;
+	return B_OK;
 }
 
 
@@ -355,8 +385,8 @@ ResourceDocument::_PresentItems() const
 }
 
 
-// Only what differs is touched, so that everything else in the file stays as it is. Items keep
-// their places; new ones follow in the document's order.
+// Only what differs is touched, so that everything else in the file stays as it is, also what
+// another program has put there since it was read.
 status_t
 ResourceDocument::_WriteDifferences(const char* path, const SavedItems& present)
 {
@@ -374,44 +404,52 @@ ResourceDocument::_WriteDifferences(const char* path, const SavedItems& present)
 			resources.RemoveResource(key.first, key.second);
 	}
 	status = _WriteChanged(resources, present);
-	for (int32 i = 0; status == B_OK && i < CountItems(); i++) {
-		const BResourceItem* item = Item(HandleAt(i));
-		const ItemKey key(item->Type(), item->ID());
-		if (!resources.HasResource(key.first, key.second) && _HasChanged(key, present))
-			status = AddItemTo(resources, *item);
-	}
 	return status == B_OK ? resources.Sync() : status;
 }
 
 
-// What is added goes to the end. So from the first item that changes on, all are added again.
+// What is added goes to the end. So from the first item that changes or moves on, all are added
+// again.
 status_t
 ResourceDocument::_WriteChanged(BResources& resources, const SavedItems& present) const
 {
-	type_code type;
-	int32 id;
-	const char* name;
-	size_t size;
-	int32 count = 0;
-	int32 first = -1;
-	for (; resources.GetResourceInfo(count, &type, &id, &name, &size); count++) {
-		if (first < 0 && _HasChanged({ type, id }, present))
-			first = count;
-	}
+	const std::vector<ItemKey> former = KeysOf(resources);
+	const std::vector<ItemKey> order = _OrderInFile(former, present);
+	size_t first = 0;
+	while (first < order.size() && first < former.size() && order[first] == former[first]
+		&& !_HasChanged(order[first], present))
+		first++;
 
 	status_t status = B_OK;
-	for (int32 i = first; first >= 0 && i < count && status == B_OK; i++) {
-		resources.GetResourceInfo(first, &type, &id, &name, &size);
-		const BString oldName(name);
-		const void* oldData = resources.LoadResource(type, id, &size);
-		if (_HasChanged({ type, id }, present))
-			status = AddItemTo(resources, *Item(FindItem(type, id)));
-		else if (oldData != nullptr)
-			status = resources.AddResource(type, id, oldData, size, oldName.String());
-		else
-			status = B_IO_ERROR;
+	for (size_t i = first; i < order.size() && status == B_OK; i++) {
+		const auto [type, id] = order[i];
+		status = _HasChanged(order[i], present) ? AddItemTo(resources, *Item(FindItem(type, id)))
+												: AddAgain(resources, type, id);
 	}
 	return status;
+}
+
+
+// The document's order, with the items that only the file has behind those that they follow there.
+std::vector<ResourceDocument::ItemKey>
+ResourceDocument::_OrderInFile(const std::vector<ItemKey>& former, const SavedItems& present) const
+{
+	const std::set<ItemKey> inFile(former.begin(), former.end());
+	std::vector<ItemKey> order;
+	for (int32 i = 0; i < CountItems(); i++) {
+		const BResourceItem* item = Item(HandleAt(i));
+		const ItemKey key(item->Type(), item->ID());
+		if (inFile.count(key) > 0 || _HasChanged(key, present))
+			order.push_back(key);
+	}
+	for (size_t i = 0; i < former.size(); i++) {
+		if (present.count(former[i]) > 0)
+			continue;
+		const auto before =
+			i == 0 ? order.end() : std::find(order.begin(), order.end(), former[i - 1]);
+		order.insert(before == order.end() ? order.begin() : before + 1, former[i]);
+	}
+	return order;
 }
 
 

@@ -86,6 +86,8 @@ private:
 	SavedItems _PresentItems() const;
 	status_t _WriteDifferences(const char* path, const SavedItems& present);
 	status_t _WriteChanged(BResources& resources, const SavedItems& present) const;
+	std::vector<ItemKey> _OrderInFile(
+		const std::vector<ItemKey>& former, const SavedItems& present) const;
 	bool _HasChanged(const ItemKey& key, const SavedItems& present) const;
 	bool _Replay(std::vector<Step>& from, std::vector<Step>& to, bool undo);
 	void _ReplayChange(const Change& change, bool undo);

@@ -60,14 +60,14 @@ BResourceItem::Size() const
 status_t
 BResourceItem::SetType(type_code type)
 {
-	return _SetKey(type, fID);
+	return SetKey(type, fID);
 }
 
 
 status_t
 BResourceItem::SetID(int32 id)
 {
-	return _SetKey(fType, id);
+	return SetKey(fType, id);
 }
 
 
@@ -104,7 +104,7 @@ BResourceItem::SetData(const void* data, size_t size)
 
 
 status_t
-BResourceItem::_SetKey(type_code type, int32 id)
+BResourceItem::SetKey(type_code type, int32 id)
 {
 	if (type == fType && id == fID)
 		return B_OK;

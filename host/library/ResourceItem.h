@@ -33,6 +33,7 @@ public:
 	// B_NAME_IN_USE and change nothing. Data is copied. Setting what is already there is no change.
 	status_t SetType(type_code type);
 	status_t SetID(int32 id);
+	status_t SetKey(type_code type, int32 id); // both in one step
 	status_t SetName(const char* name);
 	status_t SetData(const void* data, size_t size);
 
@@ -41,8 +42,6 @@ private:
 
 	BResourceItem(BResourceCollection* collection, const BResourceHandle& handle);
 	BResourceItem& operator=(const BResourceItem&) = delete;
-
-	status_t _SetKey(type_code type, int32 id);
 
 	BResourceCollection* fCollection; // borrowed: the collection owns the item
 	BResourceHandle fHandle;

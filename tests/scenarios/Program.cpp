@@ -62,6 +62,7 @@ RunningProgram::RunningProgram(const std::vector<std::string>& command,
 		Redirect(fFolder + "/err", STDERR_FILENO);
 		if (inheritedPipe >= 0)
 			fcntl(inheritedPipe, F_SETFD, 0);
+		setenv("XDG_CONFIG_HOME", fFolder.c_str(), 1); // the user's own settings are not ours
 		Execute(command, environment);
 	}
 	fHandle = static_cast<int>(syscall(SYS_pidfd_open, fProcess, 0));
