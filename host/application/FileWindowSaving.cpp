@@ -5,7 +5,6 @@
 
 #include <Alert.h>
 #include <AppDefs.h>
-#include <Entry.h>
 #include <Message.h>
 #include <Path.h>
 
@@ -149,8 +148,7 @@ FileWindow::_AskAndRevert()
 void
 FileWindow::_AskAboutChangeOnDisk()
 {
-	const bool isThere = BEntry(fDocument->Path()).Exists();
-	if (fAskedAboutDisk || fAfterClosing || !isThere || !fDocument->IsChangedOnDisk())
+	if (fAskedAboutDisk || fAfterClosing || !fDocument->IsChangedOnDisk())
 		return;
 
 	fAskedAboutDisk = true;

@@ -142,7 +142,9 @@ ResourceDocument::Save()
 
 	ReadAccess access(this);
 	const SavedItems present = _PresentItems();
-	const status_t status = _WriteDifferences(fPath.c_str(), present);
+	const bool isThere = BEntry(fPath.c_str()).Exists();
+	const status_t status =
+		isThere ? _WriteDifferences(fPath.c_str(), present) : _WriteAll(fPath.c_str());
 	if (status == B_OK) {
 		fSaved = present;
 		fStamp = _StampOf(fPath.c_str());
@@ -158,29 +160,13 @@ ResourceDocument::SaveAs(const char* path)
 		return Save();
 
 	ReadAccess access(this);
-	BResources resources;
-	status_t status = B_OK;
-	for (int32 i = 0; status == B_OK && i < CountItems(); i++)
-		status = AddItemTo(resources, *Item(HandleAt(i)));
-	if (status != B_OK)
-		return status;
-
-	// What an existing file holds, whatever it is, is replaced in one step, once everything is written.
-	const bool isNew = !BEntry(path).Exists();
-	BFile file(path, B_READ_WRITE | B_CREATE_FILE);
-	status = file.InitCheck();
-	if (status == B_OK)
-		status = write_resources_over(&resources, &file);
-	if (status != B_OK) {
-		if (isNew)
-			BEntry(path).Remove();
-		return status;
+	const status_t status = _WriteAll(path);
+	if (status == B_OK) {
+		fPath = path;
+		fSaved = _PresentItems();
+		fStamp = _StampOf(path);
 	}
-
-	fPath = path;
-	fSaved = _PresentItems();
-	fStamp = _StampOf(path);
-	return B_OK;
+	return status;
 }
 
 
@@ -224,7 +210,8 @@ ResourceDocument::IsModified() const
 bool
 ResourceDocument::IsChangedOnDisk() const
 {
-	return !fPath.empty() && _StampOf(fPath.c_str()) != fStamp;
+	const FileStamp present = _StampOf(fPath.c_str());
+	return present != FileStamp() && present != fStamp;
 }
 
 
@@ -382,6 +369,28 @@ ResourceDocument::_PresentItems() const
 			std::vector<uint8>(bytes, bytes + item->Size()) };
 	}
 	return items;
+}
+
+
+// What an existing file holds, whatever it is, is replaced in one step, once everything is written.
+status_t
+ResourceDocument::_WriteAll(const char* path) const
+{
+	BResources resources;
+	status_t status = B_OK;
+	for (int32 i = 0; status == B_OK && i < CountItems(); i++)
+		status = AddItemTo(resources, *Item(HandleAt(i)));
+	if (status != B_OK)
+		return status;
+
+	const bool isNew = !BEntry(path).Exists();
+	BFile file(path, B_READ_WRITE | B_CREATE_FILE);
+	status = file.InitCheck();
+	if (status == B_OK)
+		status = write_resources_over(&resources, &file);
+	if (status != B_OK && isNew)
+		BEntry(path).Remove();
+	return status;
 }
 
 

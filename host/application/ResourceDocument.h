@@ -23,8 +23,8 @@ public:
 	// Reads the file; what it held before is forgotten. On an error nothing changes.
 	status_t Load(const char* path);
 
-	// Writes the differences into the file, which is replaced as a whole. B_NO_INIT when there is
-	// no path yet.
+	// Writes the differences into the file, which is replaced as a whole; all of it, when the file
+	// is gone. B_NO_INIT when there is no path yet.
 	status_t Save();
 
 	// Writes everything into that file, new or not, and belongs to it from then on.
@@ -36,7 +36,8 @@ public:
 	// Whether the items differ from what was last read or saved.
 	bool IsModified() const;
 
-	// Whether somebody else has changed the file since it was last read or saved.
+	// Whether somebody else has changed the file since it was last read or saved. Not so when it
+	// is gone.
 	bool IsChangedOnDisk() const;
 
 	// The text of the step, NULL when there is none.
@@ -84,6 +85,7 @@ private:
 
 	static FileStamp _StampOf(const char* path);
 	SavedItems _PresentItems() const;
+	status_t _WriteAll(const char* path) const;
 	status_t _WriteDifferences(const char* path, const SavedItems& present);
 	status_t _WriteChanged(BResources& resources, const SavedItems& present) const;
 	std::vector<ItemKey> _OrderInFile(

@@ -170,6 +170,14 @@ TEST(ChangedOnDisk, IsNoticedWhenTheWindowIsUsedAgain)
 }
 
 
+TEST(ChangedOnDisk, AFileThatIsGoneIsWrittenAgain)
+{
+	Scene scene;
+	scene.Play("click item \"ARCV:2\"\nkey Delete\nrun \"rm $FILE\"\n" + kSave);
+	EXPECT_EQ((Names { "ARCV:1 r5", "ARCV:3 haiku managed" }), ItemsOf(scene.file));
+}
+
+
 TEST(RecentFiles, AreOpenedFromTheMenu)
 {
 	Scene scene;
