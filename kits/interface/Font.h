@@ -121,6 +121,8 @@ public:
 	void SetSize(float size);
 	void SetShear(float shear); // 45 to 135 degrees, 90 is upright
 	void SetRotation(float rotation); // degrees against the clock
+	// B_FIXED_SPACING gives all characters the width of a "W"; B_STRING_SPACING puts each on a whole
+	// pixel without changing the text's width; the other two take the outlines' own widths.
 	void SetSpacing(uint8 spacing);
 	void SetEncoding(uint8 encoding);
 	void SetFace(uint16 face); // chooses the family's style that fits best

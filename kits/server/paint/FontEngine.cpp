@@ -11,6 +11,7 @@
 
 #include "server/paint/FontList.h"
 #include "server/paint/GlyphFace.h"
+#include "server/paint/TextOrder.h"
 
 namespace BPrivate {
 
@@ -27,9 +28,13 @@ constexpr size_t kMaxImageBytes = 32 * 1024 * 1024;
 constexpr size_t kMaxStrikes = 256;
 
 
+// How far a glyph takes the pen on. Most spacings take the outline's own measure.
+enum class Spacing : uint8 { Outlines, WholePixels, Fixed };
+
 struct RunKey {
 	uint32 code;
 	float size;
+	Spacing spacing;
 	std::string_view text;
 
 	bool operator==(const RunKey& other) const = default;
@@ -38,9 +43,10 @@ struct RunKey {
 struct OwnedRunKey {
 	uint32 code;
 	float size;
+	Spacing spacing;
 	std::string text;
 
-	operator RunKey() const { return { code, size, text }; }
+	operator RunKey() const { return { code, size, spacing, text }; }
 };
 
 struct RunKeyHash {
@@ -50,7 +56,7 @@ struct RunKeyHash {
 		uint32 size;
 		memcpy(&size, &key.size, sizeof(size));
 		return std::hash<std::string_view>()(key.text)
-			^ ((size_t)key.code << 32 | size) * 0x9e3779b1;
+			^ ((size_t)key.code << 32 | size) * (0x9e3779b1 + 2 * (size_t)key.spacing);
 	}
 	size_t operator()(const OwnedRunKey& key) const { return (*this)((RunKey)key); }
 };
@@ -117,6 +123,15 @@ IsInvisible(uint32 character)
 		|| (character >= 0xfe00 && character <= 0xfe0f);
 }
 
+
+Spacing
+SpacingOf(const FontSpec& spec)
+{
+	if (spec.spacing == B_FIXED_SPACING)
+		return Spacing::Fixed;
+	return spec.spacing == B_STRING_SPACING ? Spacing::WholePixels : Spacing::Outlines;
+}
+
 } // namespace
 
 
@@ -130,8 +145,12 @@ struct FontEngine::Tables {
 	std::atomic<size_t> imageBytes = 0;
 
 	const FaceCharacter& Character(const GlyphFace& face, uint32 character);
-	std::shared_ptr<GlyphRun> MakeRun(uint32 code, float size, std::string_view text);
-	float Measure(uint32 code, float size, std::string_view text);
+	float Advance(const GlyphFace& face, const FaceCharacter& character, Spacing spacing);
+	// Calls with every character in the order of drawing.
+	template<typename Use>
+	void ForEach(const GlyphFace& face, std::string_view text, const Use& use);
+	std::shared_ptr<GlyphRun> MakeRun(const RunKey& key);
+	float Measure(const RunKey& key);
 	Strike* StrikeFor(const StrikeKey& key);
 	std::shared_ptr<const GlyphRun> FindRun(const RunKey& key);
 };
@@ -164,28 +183,59 @@ FontEngine::Tables::Character(const GlyphFace& face, uint32 character)
 }
 
 
+// In ems. With fixed spacing all that has a width has that of the widest Latin letter.
+float
+FontEngine::Tables::Advance(const GlyphFace& face, const FaceCharacter& character, Spacing spacing)
+{
+	if (spacing != Spacing::Fixed || character.advance == 0)
+		return character.advance;
+	return Character(face, 'W').advance;
+}
+
+
+template<typename Use>
+void
+FontEngine::Tables::ForEach(const GlyphFace& face, std::string_view text, const Use& use)
+{
+	if (!RunsFromTheRight(text)) {
+		for (size_t at = 0; at < text.size();)
+			use(Character(face, NextCharacter(text, &at)));
+		return;
+	}
+	std::vector<uint32> characters;
+	for (size_t at = 0; at < text.size();)
+		characters.push_back(NextCharacter(text, &at));
+	const auto hasForm = [&](uint32 form) { return Character(face, form).glyph != 0; };
+	for (const uint32 character : InDrawingOrder(characters, hasForm))
+		use(Character(face, character));
+}
+
+
 std::shared_ptr<GlyphRun>
-FontEngine::Tables::MakeRun(uint32 code, float size, std::string_view text)
+FontEngine::Tables::MakeRun(const RunKey& key)
 {
 	auto run = std::make_shared<GlyphRun>();
-	run->glyphs.reserve(text.size());
-	const GlyphFace& face = list.FaceAt(code);
-	for (size_t at = 0; at < text.size();) {
-		const FaceCharacter& character = Character(face, NextCharacter(text, &at));
-		run->glyphs.push_back({ character.face, character.glyph, run->width, character.isSpace });
-		run->width += character.advance * size;
-	}
+	run->glyphs.reserve(key.text.size());
+	const GlyphFace& face = list.FaceAt(key.code);
+	ForEach(face, key.text, [&](const FaceCharacter& character) {
+		const float x =
+			key.spacing == Spacing::WholePixels ? floorf(run->width + 0.5f) : run->width;
+		const FaceCharacter found = character;
+		run->glyphs.push_back({ found.face, found.glyph, x, found.isSpace });
+		run->width += Advance(face, found, key.spacing) * key.size;
+	});
 	return run;
 }
 
 
 float
-FontEngine::Tables::Measure(uint32 code, float size, std::string_view text)
+FontEngine::Tables::Measure(const RunKey& key)
 {
 	float width = 0;
-	const GlyphFace& face = list.FaceAt(code);
-	for (size_t at = 0; at < text.size();)
-		width += Character(face, NextCharacter(text, &at)).advance * size;
+	const GlyphFace& face = list.FaceAt(key.code);
+	ForEach(face, key.text, [&](const FaceCharacter& character) {
+		width += Advance(face, FaceCharacter(character), key.spacing) * key.size;
+	});
 	return width;
 }
 
@@ -203,12 +253,12 @@ FontEngine::Tables::FindRun(const RunKey& key)
 	if (older != olderRuns.end())
 		run = older->second;
 	else
-		run = MakeRun(key.code, key.size, key.text);
+		run = MakeRun(key);
 	if (runs.size() >= kMaxKeptRuns) {
 		olderRuns = std::move(runs);
 		runs.clear();
 	}
-	runs.emplace(OwnedRunKey { key.code, key.size, std::string(key.text) }, run);
+	runs.emplace(OwnedRunKey { key.code, key.size, key.spacing, std::string(key.text) }, run);
 	return run;
 }
 
@@ -419,20 +469,18 @@ FontEngine::Covers(uint32 code, uint32 character) const
 float
 FontEngine::StringWidth(const FontSpec& spec, std::string_view text)
 {
+	const RunKey key = { spec.familyAndStyle, spec.size, SpacingOf(spec), text };
 	std::lock_guard locker(fTables->lock);
-	if (text.size() > kMaxKeptText)
-		return fTables->Measure(spec.familyAndStyle, spec.size, text);
-	return fTables->FindRun({ spec.familyAndStyle, spec.size, text })->width;
+	return text.size() > kMaxKeptText ? fTables->Measure(key) : fTables->FindRun(key)->width;
 }
 
 
 std::shared_ptr<const GlyphRun>
 FontEngine::Run(const FontSpec& spec, std::string_view text)
 {
+	const RunKey key = { spec.familyAndStyle, spec.size, SpacingOf(spec), text };
 	std::lock_guard locker(fTables->lock);
-	if (text.size() > kMaxKeptText)
-		return fTables->MakeRun(spec.familyAndStyle, spec.size, text);
-	return fTables->FindRun({ spec.familyAndStyle, spec.size, text });
+	return text.size() > kMaxKeptText ? fTables->MakeRun(key) : fTables->FindRun(key);
 }
 
 
@@ -440,7 +488,9 @@ float
 FontEngine::Escapement(const FontSpec& spec, uint32 character)
 {
 	std::lock_guard locker(fTables->lock);
-	return fTables->Character(fTables->list.FaceAt(spec.familyAndStyle), character).advance;
+	const GlyphFace& face = fTables->list.FaceAt(spec.familyAndStyle);
+	const FaceCharacter found = fTables->Character(face, character);
+	return fTables->Advance(face, found, SpacingOf(spec));
 }
 
 

@@ -32,7 +32,7 @@ struct PlacedGlyph {
 };
 
 struct GlyphRun {
-	std::vector<PlacedGlyph> glyphs; // one per character
+	std::vector<PlacedGlyph> glyphs; // one per character, from left to right
 	float width = 0; // logical pixels
 };
 

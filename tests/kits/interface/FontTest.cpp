@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 #include <string.h>
+#include <string>
 
 #include <Shape.h>
 #include <String.h>
@@ -214,4 +215,44 @@ TEST(FontLists, AreSortedAndBounded)
 	font_family family;
 	EXPECT_NE(B_OK, get_font_family(count, &family));
 	EXPECT_NE(B_OK, get_font_family(-1, &family));
+}
+
+
+TEST(Font, FixedSpacingGivesAllCharactersOneWidth)
+{
+	BFont font(be_plain_font);
+	font.SetSpacing(B_FIXED_SPACING);
+	const float wide = font.StringWidth("W");
+	EXPECT_EQ(be_plain_font->StringWidth("W"), wide);
+	EXPECT_EQ(wide, font.StringWidth("i"));
+	EXPECT_NEAR(5 * wide, font.StringWidth("iWi.m"), 0.001f);
+	float escapements[2];
+	font.GetEscapements("iW", 2, escapements);
+	EXPECT_EQ(escapements[0], escapements[1]);
+}
+
+
+TEST(Font, OtherSpacingsHaveTheSameWidth)
+{
+	BFont font(be_plain_font);
+	const float width = font.StringWidth("Some words");
+	for (const uint8 spacing : { B_CHAR_SPACING, B_STRING_SPACING, B_BITMAP_SPACING }) {
+		font.SetSpacing(spacing);
+		EXPECT_EQ(width, font.StringWidth("Some words")) << int(spacing);
+	}
+}
+
+
+TEST(Font, WidthOfTextFromTheRightIsThatOfItsLetters)
+{
+	const float letters = be_plain_font->StringWidth("ש") + be_plain_font->StringWidth("ל");
+	EXPECT_NEAR(letters, be_plain_font->StringWidth("של"), 0.001f);
+	const std::string longText = [] {
+		std::string text;
+		for (int i = 0; i < 300; i++)
+			text += "ש";
+		return text;
+	}();
+	EXPECT_NEAR(
+		300 * be_plain_font->StringWidth("ש"), be_plain_font->StringWidth(longText.c_str()), 0.1f);
 }

@@ -270,3 +270,40 @@ TEST(Utf8, BadBytesAreReplacedAndAlwaysEnd)
 	at = 0;
 	EXPECT_EQ(0xfffdu, NextCharacter("\xed\xa0\x80", &at));
 }
+
+
+TEST(Text, LettersFromTheRightAreDrawnInTheirOrder)
+{
+	const char* const kShin = "\xd7\xa9";
+	const char* const kLamed = "\xd7\x9c";
+	PaintFixture whole, parts;
+	const BPoint end = whole.painter.DrawString(std::string(kShin) + kLamed, BPoint(5, 30));
+	const BPoint middle = parts.painter.DrawString(kLamed, BPoint(5, 30));
+	EXPECT_EQ(end, parts.painter.DrawString(kShin, middle));
+	bool hasInk = false;
+	for (int32 y = 0; y < 48; y++) {
+		for (int32 x = 0; x < 64; x++) {
+			hasInk |= whole.At(x, y) != 0xffffffff;
+			ASSERT_EQ(parts.At(x, y), whole.At(x, y)) << x << ' ' << y;
+		}
+	}
+	EXPECT_TRUE(hasInk);
+}
+
+
+TEST(Text, StringSpacingPutsEachCharacterOnAWholePixel)
+{
+	FontSpec spec;
+	spec.spacing = B_STRING_SPACING;
+	const auto run = FontEngine::Get().Run(spec, "Archway");
+	spec.spacing = B_CHAR_SPACING;
+	const auto exact = FontEngine::Get().Run(spec, "Archway");
+	ASSERT_EQ(exact->glyphs.size(), run->glyphs.size());
+	EXPECT_EQ(exact->width, run->width);
+	bool differs = false;
+	for (size_t i = 0; i < run->glyphs.size(); i++) {
+		EXPECT_EQ(floorf(exact->glyphs[i].x + 0.5f), run->glyphs[i].x);
+		differs |= exact->glyphs[i].x != run->glyphs[i].x;
+	}
+	EXPECT_TRUE(differs);
+}
