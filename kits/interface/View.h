@@ -153,6 +153,8 @@ public:
 	virtual void FrameResized(float newWidth, float newHeight);
 	virtual void TargetedByScrollView(BScrollView* scrollView);
 
+	// An outline that follows the pointer as a whole or by its right bottom corner, over what the
+	// view draws. The rectangle is the program's to work out from the pointer's place.
 	void BeginRectTracking(BRect startRect, uint32 style = B_TRACK_WHOLE_RECT);
 	void EndRectTracking();
 
@@ -390,6 +392,7 @@ private:
 	BPrivate::ViewExtras* _Extras();
 	BPrivate::Painter* _BeginDrawing();
 	void _SetPen(BPoint location);
+	void _InvalidateTracking();
 	void _CheckLock() const;
 	bool _CheckOwnerLock() const;
 	bool _StartDrag(BMessage* message, BBitmap* bitmap, drawing_mode mode, BRect rect,

@@ -1,6 +1,7 @@
 // Mouse, keys and drags of views.
 #include <View.h>
 
+#include <algorithm>
 #include <cmath>
 #include <cstring>
 #include <vector>
@@ -247,24 +248,78 @@ BView::_StartDrag(BMessage* message, BBitmap* bitmap, drawing_mode mode, BRect r
 // #pragma mark - rectangle tracking
 
 
+// The outline is drawn after the view itself, so that it needs no care when either changes.
 void
 BView::BeginRectTracking(BRect startRect, uint32 style)
 {
 	if (fOwner == nullptr || !_CheckOwnerLock())
 		return;
-	ViewExtras* extras = _Extras();
-	extras->trackingRect = startRect;
-	extras->trackingStyle = style;
-	extras->isTracking = true;
-	InvertRect(startRect);
+	EndRectTracking();
+	BPoint pointer;
+	WindowInternals& internals = WindowInternals::Of(fOwner);
+	GetMouse(&pointer, nullptr, false);
+	_Extras()->tracking.reset(new RectTracking { startRect, startRect, pointer, style });
+	internals.rectTracker = this;
+	_InvalidateTracking();
 }
 
 
 void
 BView::EndRectTracking()
 {
-	if (fExtras == nullptr || !fExtras->isTracking)
+	if (fExtras == nullptr || fExtras->tracking == nullptr)
 		return;
-	fExtras->isTracking = false;
-	InvertRect(fExtras->trackingRect);
+	_InvalidateTracking();
+	fExtras->tracking.reset();
+	if (fOwner != nullptr && WindowInternals::Of(fOwner).rectTracker == this)
+		WindowInternals::Of(fOwner).rectTracker = nullptr;
+}
+
+
+void
+BView::_InvalidateTracking()
+{
+	const BRect rect = fExtras->tracking->rect;
+	Invalidate(BRect(rect.left, rect.top, rect.right, rect.top));
+	Invalidate(BRect(rect.left, rect.bottom, rect.right, rect.bottom));
+	Invalidate(BRect(rect.left, rect.top, rect.left, rect.bottom));
+	Invalidate(BRect(rect.right, rect.top, rect.right, rect.bottom));
+}
+
+
+// A corner that is dragged beyond the fixed one stops there.
+void
+RectTracking::Follow(BPoint pointer)
+{
+	rect = start;
+	const BPoint way = pointer - pressed;
+	if (style == B_TRACK_WHOLE_RECT) {
+		rect.OffsetBy(way);
+		return;
+	}
+	rect.right = std::max(rect.left, rect.right + way.x);
+	rect.bottom = std::max(rect.top, rect.bottom + way.y);
+}
+
+
+void
+ViewPrivate::TrackRect(BPoint screen)
+{
+	RectTracking& tracking = *Extras()->tracking;
+	fView->_InvalidateTracking();
+	tracking.Follow(fView->ConvertFromScreen(screen));
+	fView->_InvalidateTracking();
+}
+
+
+void
+ViewPrivate::DrawTracking()
+{
+	if (Extras() == nullptr || Extras()->tracking == nullptr)
+		return;
+	fView->PushState();
+	fView->SetDrawingMode(B_OP_INVERT);
+	fView->SetPenSize(1);
+	fView->StrokeRect(Extras()->tracking->rect);
+	fView->PopState();
 }

@@ -76,6 +76,8 @@ ViewPrivate::CallDraw(BRect updateRect, bool afterChildren)
 	}
 	delete level;
 	view->fState = saved;
+	if (!afterChildren)
+		DrawTracking();
 	view->fTouched = touched;
 }
 

@@ -174,12 +174,6 @@ BWindow::Run()
 }
 
 
-void
-BWindow::task_looper()
-{
-}
-
-
 // #pragma mark - views
 
 

@@ -217,9 +217,6 @@ public:
 	virtual bool QuitRequested();
 	virtual thread_id Run();
 
-protected:
-	virtual void task_looper();
-
 private:
 	friend class BPrivate::WindowInternals;
 

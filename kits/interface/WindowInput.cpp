@@ -234,6 +234,8 @@ WindowInternals::_RouteMove(BMessage* message)
 	enteredView = changed ? view : nullptr;
 	if (otherCursor)
 		ApplyCursor();
+	if (rectTracker != nullptr)
+		ViewPrivate(rectTracker).TrackRect(lastScreen);
 	tips.PointerMoved(view, lastScreen, lastButtons == 0 && !drags);
 
 	bool delivered = _DeliverToMasks(*event, view, true);

@@ -91,7 +91,7 @@ WindowInternals::ViewsLeave(ServerView& top)
 		focus = nullptr;
 		window.SetPreferredHandler(nullptr);
 	}
-	for (BView** view : { &mouseView, &pointerTarget, &leftView, &enteredView }) {
+	for (BView** view : { &mouseView, &rectTracker, &pointerTarget, &leftView, &enteredView }) {
 		if (leaves(*view))
 			*view = nullptr;
 	}

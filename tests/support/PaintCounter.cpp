@@ -2,6 +2,7 @@
 
 #include <Window.h>
 
+#include "interface/private/TextLayout.h"
 #include "interface/private/WindowInternals.h"
 #include "server/Desktop.h"
 #include "server/ServerWindow.h"
@@ -53,6 +54,13 @@ int64
 PaintCounter::HitTested() const
 {
 	return _Read().hitTested - fStart.hitTested;
+}
+
+
+int64
+PaintCounter::LinesLaidOut()
+{
+	return BPrivate::TextLayout::CountLaidOut();
 }
 
 

@@ -18,6 +18,9 @@ public:
 	int64 Clippings() const; // made for views that draw
 	int64 HitTested() const; // views asked whether a point lies in them
 
+	// Lines of text laid out by any text view since the start of the program.
+	static int64 LinesLaidOut();
+
 private:
 	struct Counts {
 		int64 flushes, flushedPixels, drawn, clippings, hitTested;

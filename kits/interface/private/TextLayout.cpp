@@ -1,6 +1,7 @@
 #include "interface/private/TextLayout.h"
 
 #include <algorithm>
+#include <atomic>
 #include <cmath>
 
 #include <TextView.h>
@@ -15,6 +16,8 @@ constexpr uint32 kBullet = 0x2022;
 // A text with more lines is measured as far as it is shown.
 constexpr int32 kMeasureAllLines = 2000;
 constexpr int32 kLongestChunk = 96; // bytes of joining letters that are measured together
+
+std::atomic<int64> sLaidOut = 0; // lines
 
 } // namespace
 
@@ -117,6 +120,13 @@ private:
 	int32 fChunkEnd = -1;
 	float fBefore = 0;
 };
+
+
+int64
+TextLayout::CountLaidOut()
+{
+	return sLaidOut;
+}
 
 
 TextLayout::TextLayout(BTextView& view, TextModel& model) : fView(view), fModel(model)
@@ -449,6 +459,7 @@ TextLayout::_FindEnd(int32 start, float* _width)
 TextLayout::Line
 TextLayout::_MakeLine(int32 start, int32 end, float width, float* _height) const
 {
+	sLaidOut.fetch_add(1, std::memory_order_relaxed);
 	Line line { start, 0, 0, width };
 	*_height = 0;
 	const int32 first = fModel.RunIndexAt(start);

@@ -66,6 +66,9 @@ public:
 	};
 	void GetPieces(int32 line, std::vector<Piece>& pieces) const;
 
+	// How many lines the program has laid out so far; for tests of growth.
+	static int64 CountLaidOut();
+
 	// Steps over a character with its marks.
 	int32 NextPlace(int32 offset) const;
 	int32 PreviousPlace(int32 offset) const;

@@ -31,6 +31,9 @@ public:
 
 	// The state that a hook sets is undone afterwards.
 	void CallDraw(BRect updateRect, bool afterChildren);
+	// The pointer has moved while a rectangle follows it; and the outline of that.
+	void TrackRect(BPoint screen);
+	void DrawTracking();
 	// Flags and mode that an archive constructor sets.
 	void ForceWord(uint32 flags, uint32 mode);
 

@@ -28,6 +28,17 @@ struct ViewState {
 };
 
 
+// The outline of BeginRectTracking().
+struct RectTracking {
+	BRect rect; // the view's coordinates, as are the others
+	BRect start;
+	BPoint pressed; // where the pointer was at the beginning
+	uint32 style;
+
+	void Follow(BPoint pointer);
+};
+
+
 struct ViewExtras {
 	BScrollBar* bars[2] = { nullptr, nullptr }; // borrowed; by orientation
 	uint32 eventMask = 0;
@@ -38,9 +49,7 @@ struct ViewExtras {
 	std::string toolTip;
 	std::vector<PaintedLine> lines; // between BeginLineArray() and EndLineArray()
 	bool inLineArray = false;
-	BRect trackingRect;
-	bool isTracking = false;
-	uint32 trackingStyle = 0;
+	std::unique_ptr<RectTracking> tracking; // while a rectangle follows the pointer
 };
 
 

@@ -112,6 +112,7 @@ public:
 
 	BView* focus = nullptr; // borrowed, as are the following
 	BView* mouseView = nullptr;
+	BView* rectTracker = nullptr; // a rectangle in it follows the pointer
 	bool dragOver = false; // the last movement had something dragged
 	BButton* defaultButton = nullptr;
 	BView* defaultButtonView = nullptr; // the same
