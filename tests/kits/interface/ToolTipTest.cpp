@@ -86,9 +86,8 @@ TEST_F(ToolTip, IsNotShownWithoutAText)
 
 TEST_F(ToolTip, OfAViewHoldsForItsChildren)
 {
-	fixture.Locked([this] {
-		view->AddChild(new BView(BRect(40, 40, 80, 60), "child", 0, B_WILL_DRAW));
-	});
+	fixture.Locked(
+		[this] { view->AddChild(new BView(BRect(40, 40, 80, 60), "child", 0, B_WILL_DRAW)); });
 	driver.MoveTo(place);
 	EXPECT_TRUE(IsShown());
 }

@@ -1,0 +1,189 @@
+// What the classes say to scripts.
+#include <functional>
+#include <memory>
+
+#include <Alert.h>
+#include <Box.h>
+#include <Button.h>
+#include <CheckBox.h>
+#include <ColorControl.h>
+#include <ListView.h>
+#include <MenuBar.h>
+#include <MenuField.h>
+#include <OutlineListView.h>
+#include <PopUpMenu.h>
+#include <RadioButton.h>
+#include <ScrollBar.h>
+#include <ScrollView.h>
+#include <Slider.h>
+#include <StatusBar.h>
+#include <StringView.h>
+#include <TabView.h>
+#include <TextControl.h>
+#include <TextView.h>
+
+#include "ControlFixture.h"
+
+namespace {
+
+
+const BRect kFrame(20, 20, 119, 59);
+
+std::string
+SuitesOf(BHandler& handler)
+{
+	BMessage data;
+	EXPECT_EQ(B_OK, handler.GetSupportedSuites(&data));
+	std::string suites;
+	const char* suite;
+	for (int32 i = 0; data.FindString("suites", i, &suite) == B_OK; i++)
+		suites += (i > 0 ? " " : "") + std::string(suite);
+	return suites;
+}
+
+} // namespace
+
+
+TEST(Scripting, EveryClassNamesItsSuites)
+{
+	BApplication app("application/x-vnd.Archway-test");
+	BView view(kFrame, "", 0, 0);
+	const std::string base = SuitesOf(view);
+	EXPECT_NE("", base);
+
+	BButton button(kFrame, "", "", NULL);
+	BCheckBox check(kFrame, "", "", NULL);
+	BRadioButton radio(kFrame, "", "", NULL);
+	BTextControl field(kFrame, "", "", "", NULL);
+	BSlider slider(kFrame, "", "", NULL, 0, 1);
+	BColorControl color(BPoint(0, 0), B_CELLS_16x16, 4, "");
+	BControl* const controls[] = { &button, &check, &radio, &field, &slider, &color };
+	for (BControl* control : controls)
+		EXPECT_EQ("suite/vnd.Be-control " + base, SuitesOf(*control)) << "GetSupportedSuites()";
+
+	BListView list(kFrame, "");
+	BOutlineListView outline(kFrame, "");
+	EXPECT_EQ("suite/vnd.Be-list-view " + base, SuitesOf(list));
+	EXPECT_EQ("suite/vnd.Be-list-view " + base, SuitesOf(outline));
+	BMenu menu("menu");
+	BMenuBar bar(kFrame, "");
+	BPopUpMenu popUp("");
+	for (BMenu* each : { &menu, static_cast<BMenu*>(&bar), static_cast<BMenu*>(&popUp) })
+		EXPECT_EQ("suite/vnd.Be-menu " + base, SuitesOf(*each));
+	BTextView text(kFrame, "", kFrame, 0, 0);
+	EXPECT_NE(std::string::npos, SuitesOf(text).find("suite/vnd.Be-text-view"));
+
+	BBox box(kFrame);
+	BStatusBar status(kFrame, "");
+	BStringView string(kFrame, "", "");
+	BTabView tabs(kFrame, "");
+	BScrollView scroller("", NULL);
+	BScrollBar scrollBar(kFrame, "", NULL, 0, 1, B_VERTICAL);
+	BMenuField menuField(kFrame, "", "", new BMenu(""));
+	BView* const plain[] = { &box, &status, &string, &tabs, &scroller, &scrollBar, &menuField };
+	for (BView* each : plain)
+		EXPECT_EQ(base, SuitesOf(*each)) << typeid(*each).name();
+	BHandler handler;
+	EXPECT_EQ(SuitesOf(handler), base);
+}
+
+
+TEST(Scripting, EveryClassFindsItsChildrenByNameAndPlace)
+{
+	BApplication app("application/x-vnd.Archway-test");
+	BView view(kFrame, "", 0, 0);
+	BBox box(kFrame);
+	BButton button(kFrame, "", "", NULL);
+	BCheckBox check(kFrame, "", "", NULL);
+	BRadioButton radio(kFrame, "", "", NULL);
+	BTextControl field(kFrame, "", "", "", NULL);
+	BSlider slider(kFrame, "", "", NULL, 0, 1);
+	BColorControl color(BPoint(0, 0), B_CELLS_16x16, 4, "");
+	BStatusBar status(kFrame, "");
+	BStringView string(kFrame, "", "");
+	BTextView text(kFrame, "", kFrame, 0, 0);
+	BListView list(kFrame, "");
+	BOutlineListView outline(kFrame, "");
+	BTabView tabs(kFrame, "");
+	BScrollView scroller("", NULL);
+	BScrollBar bar(kFrame, "", NULL, 0, 1, B_VERTICAL);
+	BMenuField menuField(kFrame, "", "", new BMenu(""));
+	BMenuBar menuBar(kFrame, "");
+	BPopUpMenu popUp("");
+	BMenu menu("menu");
+	BView* const views[] = { &view, &box, &button, &check, &radio, &field, &slider, &color, &status,
+		&string, &text, &list, &outline, &tabs, &scroller, &bar, &menuField, &menuBar, &popUp,
+		&menu };
+	for (BView* each : views) {
+		SCOPED_TRACE(typeid(*each).name());
+		BView* inner = new BView(BRect(0, 0, 5, 5), "inner", 0, 0);
+		each->AddChild(inner);
+		BMessage byName(B_GET_PROPERTY);
+		byName.AddSpecifier("View", "inner");
+		int32 index, form;
+		BMessage specifier;
+		const char* property;
+		ASSERT_EQ(B_OK, byName.GetCurrentSpecifier(&index, &specifier, &form, &property));
+		EXPECT_EQ(inner, each->ResolveSpecifier(&byName, index, &specifier, form, property));
+
+		BMessage byPlace(B_GET_PROPERTY);
+		byPlace.AddSpecifier("View", each->CountChildren() - 1);
+		ASSERT_EQ(B_OK, byPlace.GetCurrentSpecifier(&index, &specifier, &form, &property));
+		EXPECT_EQ(inner, each->ResolveSpecifier(&byPlace, index, &specifier, form, property));
+
+		BMessage unknown(B_GET_PROPERTY);
+		unknown.AddSpecifier("View", "nobody");
+		ASSERT_EQ(B_OK, unknown.GetCurrentSpecifier(&index, &specifier, &form, &property));
+		EXPECT_EQ(nullptr, each->ResolveSpecifier(&unknown, index, &specifier, form, property));
+	}
+}
+
+
+TEST(Scripting, AWindowFindsItsViewsAndControlsAnswer)
+{
+	ControlFixture fixture;
+	BWindow* window = fixture.window;
+	BCheckBox* check = fixture.Add(new BCheckBox(kFrame, "check", "A label", NULL));
+	fixture.Locked([&] {
+		EXPECT_EQ(SuitesOf(*fixture.window), SuitesOf(*window));
+		BMessage direct(B_GET_PROPERTY);
+		direct.AddSpecifier("View", "check");
+		int32 index, form;
+		BMessage specifier;
+		const char* property;
+		ASSERT_EQ(B_OK, direct.GetCurrentSpecifier(&index, &specifier, &form, &property));
+		EXPECT_EQ(check, window->ResolveSpecifier(&direct, index, &specifier, form, property));
+	});
+
+	BMessage ask(B_GET_PROPERTY), answer;
+	ask.AddSpecifier("Label");
+	ask.AddSpecifier("View", "check");
+	ASSERT_EQ(B_OK, BMessenger(window).SendMessage(&ask, &answer));
+	EXPECT_STREQ("A label", answer.GetString("result", ""));
+
+	BMessage set(B_SET_PROPERTY), done;
+	set.AddSpecifier("Value");
+	set.AddSpecifier("View", "check");
+	set.AddInt32("data", 1);
+	ASSERT_EQ(B_OK, BMessenger(window).SendMessage(&set, &done));
+	EXPECT_EQ(B_OK, done.GetInt32("error", B_ERROR));
+	EXPECT_EQ(1, fixture.Locked([&] { return check->Value(); }));
+}
+
+
+TEST(Scripting, AnAlertIsAWindow)
+{
+	BApplication app("application/x-vnd.Archway-test");
+	BAlert* alert = new BAlert("Title", "Text", "OK");
+	BWindow* window = new BWindow(BRect(0, 0, 9, 9), "", B_TITLED_WINDOW, 0);
+	EXPECT_EQ(SuitesOf(*window), SuitesOf(*alert)) << "GetSupportedSuites()";
+	BMessage ask(B_GET_PROPERTY);
+	ask.AddSpecifier("View", "_tv_");
+	int32 index, form;
+	BMessage specifier;
+	const char* property;
+	ASSERT_EQ(B_OK, ask.GetCurrentSpecifier(&index, &specifier, &form, &property));
+	EXPECT_EQ(alert->TextView(), alert->ResolveSpecifier(&ask, index, &specifier, form, property));
+	alert->Quit();
+	window->Quit();
+}
