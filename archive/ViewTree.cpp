@@ -363,7 +363,8 @@ SetProportion(BScrollBar* bar)
 	const float visible = bar->Orientation() == B_HORIZONTAL ? bounds.Width() : bounds.Height();
 	float minimum, maximum;
 	bar->GetRange(&minimum, &maximum);
-	bar->SetProportion(visible / (maximum - minimum + visible));
+	const float whole = maximum - minimum + visible;
+	bar->SetProportion(whole > 0 ? visible / whole : 1); // all of a target without extent
 }
 
 

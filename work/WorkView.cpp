@@ -333,7 +333,7 @@ WorkView::_BeginMove(BView* view, BPoint where, bool copy)
 	MakeDragMessage(view, &drag);
 	SetEventMask(B_POINTER_EVENTS, 0); // the button is released elsewhere
 	ShowDragPointer(true);
-	DragMessage(&drag, image, B_OP_ALPHA, where, this);
+	DragMessage(&drag, image, B_OP_ALPHA, where - view->Bounds().LeftTop(), this);
 
 	fTaken.reset();
 	fTakenLeftTop = leftTop;

@@ -302,6 +302,21 @@ TEST(SetRange, IsEmptyForAContentThatFits)
 }
 
 
+TEST(SetProportions, ShowAllOfATargetWithoutExtent)
+{
+	TestWindow window;
+	BScrollView* scroll = window.Add(MakeScrollView(MakeView(0, 0, 0, 100)));
+	window.Locked([&] {
+		scroll->ScrollBar(B_HORIZONTAL)->SetRange(0, 0);
+		scroll->ScrollBar(B_VERTICAL)->SetRange(0, 300);
+		SetProportions(scroll);
+		EXPECT_EQ(1, scroll->ScrollBar(B_HORIZONTAL)->Proportion());
+		EXPECT_EQ(0.25f, scroll->ScrollBar(B_VERTICAL)->Proportion());
+		SetProportions(NULL);
+	});
+}
+
+
 TEST(MoveScrolledViews, AndBackLeavesEveryFrame)
 {
 	TestWindow window;

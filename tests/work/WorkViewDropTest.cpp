@@ -84,6 +84,21 @@ TEST_F(WorkViewDropTest, ADragMovesTheView)
 }
 
 
+TEST_F(WorkViewDropTest, AScrolledViewStaysUnderThePointer)
+{
+	BView* scrolled = new BView(BRect(20, 60, 99, 99), "scrolled", B_FOLLOW_NONE, B_WILL_DRAW);
+	window.Locked([&] {
+		root->AddChild(scrolled);
+		scrolled->ScrollTo(BPoint(5, 30));
+	});
+	window.driver.Click(scrolled, BPoint(15, 40));
+	window.driver.Drag(
+		Driver::PointIn(scrolled, BPoint(15, 40)), Driver::PointIn(root, BPoint(40, 130)));
+	ASSERT_NE(nullptr, Find("scrolled"));
+	EXPECT_EQ(BRect(30, 120, 109, 159), Find("scrolled")->Frame());
+}
+
+
 TEST_F(WorkViewDropTest, ADragIntoABoxChangesTheParent)
 {
 	DragSelected("button", box, BPoint(30, 60));
