@@ -171,3 +171,23 @@ TEST(Box, KeepsItsBoldLabelWithoutTheFamilyOfItsArchive)
 	EXPECT_EQ(be_bold_font->FamilyAndStyle(), font.FamilyAndStyle());
 	ExpectArchiveRoundTrip<BBox>(fixture, archive);
 }
+
+
+TEST(Box, PrefersItsPresentSizeAtLeast)
+{
+	ControlFixture fixture;
+	BBox* box = fixture.Add(new BBox(BRect(10, 10, 209, 109), "box"));
+	fixture.Locked([&] {
+		float width, height;
+		box->GetPreferredSize(&width, &height);
+		EXPECT_EQ(199, width);
+		EXPECT_EQ(99, height);
+		box->ResizeTo(20, 10);
+		box->SetLabel("A label that is far wider than the box");
+		box->GetPreferredSize(&width, &height);
+		EXPECT_GE(width, 20);
+		EXPECT_GE(height, 10);
+		box->ResizeToPreferred();
+		EXPECT_EQ(width, box->Frame().Width());
+	});
+}

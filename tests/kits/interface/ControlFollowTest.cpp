@@ -3,12 +3,20 @@
 #include <Button.h>
 #include <CheckBox.h>
 #include <ColorControl.h>
+#include <ListView.h>
+#include <MenuBar.h>
+#include <MenuField.h>
+#include <OutlineListView.h>
 #include <PictureButton.h>
 #include <RadioButton.h>
+#include <ScrollBar.h>
+#include <ScrollView.h>
 #include <Slider.h>
 #include <StatusBar.h>
 #include <StringView.h>
 #include <TabView.h>
+#include <TextControl.h>
+#include <TextView.h>
 
 #include "ControlFixture.h"
 
@@ -30,6 +38,14 @@ OneOfEachClass()
 		new BStatusBar(kFrame, "status", "Label"),
 		new BStringView(kFrame, "string", "Text"),
 		new BTabView(kFrame, "tabs"),
+		new BTextControl(kFrame, "field", "Label", "Text", NULL),
+		new BTextView(kFrame, "text", kFrame.OffsetToCopy(0, 0), 0, B_WILL_DRAW),
+		new BListView(kFrame, "list"),
+		new BOutlineListView(kFrame, "outline"),
+		new BScrollView("scroller", new BView(kFrame, "target", B_FOLLOW_ALL, B_WILL_DRAW)),
+		new BScrollBar(kFrame, "bar", NULL, 0, 10, B_VERTICAL),
+		new BMenuField(kFrame, "menu field", "Label", new BMenu("menu")),
+		new BMenuBar(kFrame, "menu bar", 0, B_ITEMS_IN_ROW, false),
 	};
 }
 

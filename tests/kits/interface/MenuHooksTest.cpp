@@ -290,7 +290,7 @@ TEST_F(MenuHooks, AListOfItemsIsAddedInItsOrder)
 }
 
 
-TEST_F(MenuHooks, AnItemKnowsItsSubmenu)
+TEST_F(MenuHooks, ABMenuItemKnowsItsSubmenu)
 {
 	fixture.Locked([this] {
 		EXPECT_EQ(menu, bar->ItemAt(0)->Submenu());
@@ -377,4 +377,40 @@ TEST(SeparatorItemHooks, HasASmallContent)
 	EXPECT_LT(height, 10);
 	EXPECT_LT(width, menu.StringWidth("Item"));
 	EXPECT_FALSE(separator->IsEnabled());
+}
+
+
+TEST(PopUpMenuHooks, ABPopUpMenuOfAFieldOpensOverItsMarkedItemUnlessItsClassSaysWhere)
+{
+	class Placed : public BPopUpMenu {
+	public:
+		Placed() : BPopUpMenu("menu") {}
+		BPoint ScreenLocation() override
+		{
+			return place.x >= 0 ? place : BPopUpMenu::ScreenLocation();
+		}
+		BPoint place { -1, -1 };
+	};
+	ControlFixture fixture;
+	Placed* menu = new Placed;
+	for (const char* label : { "One", "Two", "Three" })
+		menu->AddItem(new BMenuItem(label, NULL));
+	menu->ItemAt(1)->SetMarked(true);
+	BMenuField* field =
+		fixture.Add(new BMenuField(BRect(100, 100, 299, 125), "field", "Label", menu));
+	const auto placeOf = [&](int32 index) {
+		EXPECT_TRUE(menu->LockLooper()) << "not open";
+		const BPoint place = menu->ConvertToScreen(menu->ItemAt(index)->Frame().LeftTop());
+		menu->UnlockLooper();
+		return place;
+	};
+	const BPoint bar = Driver::PointIn(field->MenuBar(), BPoint(0, 0));
+	fixture.driver.Click(field->MenuBar());
+	EXPECT_NEAR(bar.y, placeOf(1).y, 4);
+	fixture.driver.Key("Escape");
+	menu->place = BPoint(600, 400);
+	fixture.driver.Click(field->MenuBar());
+	EXPECT_NEAR(600, placeOf(0).x, 2);
+	EXPECT_NEAR(400, placeOf(0).y, 2);
+	fixture.driver.Key("Escape");
 }

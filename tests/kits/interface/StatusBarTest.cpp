@@ -148,3 +148,17 @@ TEST(StatusBar, RevivesWhatItWrote)
 	EXPECT_EQ(5.0f, archive.GetFloat("_val", 0));
 	ExpectRoundTrip(fixture, bar);
 }
+
+
+TEST(StatusBar, ResizeToPreferredGivesItItsHeight)
+{
+	ControlFixture fixture;
+	BStatusBar* bar = fixture.Add(new BStatusBar(BRect(10, 10, 209, 40), "bar", "Label"));
+	fixture.Locked([&] {
+		float width, height;
+		bar->GetPreferredSize(&width, &height);
+		bar->ResizeTo(199, height + 20);
+		bar->ResizeToPreferred();
+		EXPECT_EQ(height, bar->Frame().Height());
+	});
+}

@@ -103,3 +103,46 @@ TEST(StringView, RevivesWhatItWrote)
 	EXPECT_EQ("_truncation _align", OwnFieldNames(ArchiveOf(view)));
 	ExpectRoundTrip(fixture, view);
 }
+
+
+TEST(StringView, ATextThatDoesNotFitIsCutAsItIsTold)
+{
+	ControlFixture fixture;
+	BStringView* view =
+		fixture.Add(new BStringView(BRect(10, 10, 69, 29), "s", "A text that does not fit"));
+	EXPECT_EQ(static_cast<uint32>(B_NO_TRUNCATION), view->Truncation());
+	const auto picture = [&] {
+		std::string pixels;
+		for (float y = 0; y <= 19; y++) {
+			for (float x = 0; x <= 59; x++)
+				pixels += static_cast<char>(fixture.driver.PixelAt(view, BPoint(x, y)).red);
+		}
+		return pixels;
+	};
+	const std::string whole = picture();
+	std::vector<std::string> pictures = { whole };
+	for (const uint32 mode : { B_TRUNCATE_END, B_TRUNCATE_MIDDLE, B_TRUNCATE_BEGINNING }) {
+		fixture.Locked([&] { view->SetTruncation(mode); });
+		EXPECT_EQ(mode, view->Truncation());
+		for (const std::string& other : pictures)
+			EXPECT_NE(other, picture()) << mode;
+		pictures.push_back(picture());
+	}
+	fixture.Locked([&] { view->SetTruncation(B_NO_TRUNCATION); });
+	EXPECT_EQ(whole, picture());
+}
+
+
+TEST(StringView, ResizeToPreferredShowsItsText)
+{
+	ControlFixture fixture;
+	BStringView* view = fixture.Add(new BStringView(BRect(10, 10, 20, 20), "s", "A longer text"));
+	fixture.Locked([&] {
+		view->ResizeToPreferred();
+		float width, height;
+		view->GetPreferredSize(&width, &height);
+		EXPECT_EQ(width, view->Frame().Width());
+		EXPECT_EQ(height, view->Frame().Height());
+		EXPECT_GE(width, view->StringWidth("A longer text"));
+	});
+}

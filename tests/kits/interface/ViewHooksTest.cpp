@@ -132,11 +132,9 @@ ExpectHooks(const char* name, const std::function<BView*(HookCounts&)>& make)
 } // namespace
 
 
-// AttachedToWindow(), AllAttached(), DetachedFromWindow(), AllDetached(), FrameMoved(),
-// FrameResized() and WindowActivated(), by AddChild(), RemoveSelf(), MoveBy(), ResizeTo() and
-// ActivateWindow().
 TEST(ViewHooks, OfGroupsAndTextsAreCalled)
 {
+	// By AddChild(), RemoveSelf(), MoveBy(), ResizeTo() and ActivateWindow().
 	ExpectHooks("BView", [](HookCounts& counts) {
 		return new Hooked<BView>(counts, kFrame, "view", B_FOLLOW_NONE, B_WILL_DRAW);
 	});
@@ -152,8 +150,9 @@ TEST(ViewHooks, OfGroupsAndTextsAreCalled)
 }
 
 
-TEST(ViewHooks, OfControlsAreCalledByRemoveSelfResizeToAndActivateWindow)
+TEST(ViewHooks, OfControlsAreCalled)
 {
+	// By AddChild(), RemoveSelf(), MoveBy(), ResizeTo() and ActivateWindow().
 	ExpectHooks("BButton", [](HookCounts& counts) {
 		return new Hooked<BButton>(counts, kFrame, "b", "Label", nullptr);
 	});
@@ -179,8 +178,9 @@ TEST(ViewHooks, OfControlsAreCalledByRemoveSelfResizeToAndActivateWindow)
 }
 
 
-TEST(ViewHooks, OfListsMenusAndBarsAreCalledByRemoveSelfResizeToAndActivateWindow)
+TEST(ViewHooks, OfListsMenusAndBarsAreCalled)
 {
+	// By AddChild(), RemoveSelf(), MoveBy(), ResizeTo() and ActivateWindow().
 	ExpectHooks("BListView",
 		[](HookCounts& counts) { return new Hooked<BListView>(counts, kFrame, "list"); });
 	ExpectHooks("BOutlineListView",
