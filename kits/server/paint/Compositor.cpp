@@ -2,7 +2,8 @@
 
 #include <algorithm>
 #include <string.h>
-#include <wchar.h>
+
+#include "server/paint/RowFill.h"
 
 namespace BPrivate {
 
@@ -20,20 +21,6 @@ struct RowFunctions {
 		uint32* row, const uint8* coverage, const uint8* bits, int32 count, const Ink& ink);
 	void (*pixels)(uint32* row, const uint32* source, int32 count, const Ink& ink);
 };
-
-
-// The C library writes more than a word at a time.
-inline void
-FillWords(uint32* row, int32 count, uint32 pixel)
-{
-	static_assert(sizeof(wchar_t) == sizeof(uint32));
-	if (count > 4) {
-		wmemset(reinterpret_cast<wchar_t*>(row), pixel, count);
-		return;
-	}
-	for (int32 i = 0; i < count; i++)
-		row[i] = pixel;
-}
 
 
 // The modes whose result does not depend on what is there.
@@ -254,9 +241,8 @@ Compositor::_FillPart(const clipping_rect& part)
 		if (IsConstant(fInk.mode)) {
 			const uint32 pixel = fInk.mode != B_OP_ERASE && bit ? fInk.high : fInk.low;
 			const int32 stride = fSurface.BytesPerRow() / sizeof(uint32);
-			uint32* row = fSurface.Row(part.top) + part.left;
-			for (int32 rows = part.bottom - part.top; rows >= 0; rows--, row += stride)
-				FillWords(row, count, pixel);
+			FillRows(fSurface.Row(part.top) + part.left, stride, part.bottom - part.top + 1, count,
+				pixel);
 			return;
 		}
 		for (int32 y = part.top; y <= part.bottom; y++)
