@@ -57,7 +57,7 @@ GalleryWindow::_AddMenus()
 
 	BMenu* alerts = new BMenu("Alerts");
 	const char* const names[] = { "Empty", "Info", "Idea", "Warning", "Stop" };
-	for (int32 type = B_EMPTY_ALERT; type <= B_STOP_ALERT; type++) {
+	for (int32 type = B_EMPTY_ALERT; type <= static_cast<int32>(B_STOP_ALERT); type++) {
 		BMessage* message = new BMessage(kShowAlert);
 		message->AddInt32("type", type);
 		alerts->AddItem(new BMenuItem(names[type], message));

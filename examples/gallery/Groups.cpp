@@ -176,7 +176,7 @@ NewSliderGroup(BRect frame)
 	block->SetValue(30);
 	box->AddChild(block);
 
-	BSlider* triangle = new BSlider(first.OffsetByCopy(0, 56), "triangle", "Triangle, filled",
+	BSlider* triangle = new BSlider(first.OffsetByCopy(0, 66), "triangle", "Triangle, filled",
 		NewMessage(), 0, 100, B_TRIANGLE_THUMB);
 	const rgb_color fill = { 50, 150, 255, 255 };
 	triangle->UseFillColor(true, &fill);
@@ -186,11 +186,11 @@ NewSliderGroup(BRect frame)
 	box->AddChild(triangle);
 
 	BSlider* disabled =
-		new BSlider(first.OffsetByCopy(0, 96), "disabled", "Disabled", NewMessage(), 0, 100);
+		new BSlider(first.OffsetByCopy(0, 122), "disabled", "Disabled", NewMessage(), 0, 100);
 	disabled->SetValue(70);
 	box->AddChild(Disabled(disabled));
 
-	const BRect upright(kLeft + 162, kTop, kLeft + 216, kTop + 132);
+	const BRect upright(kLeft + 162, kTop, kLeft + 216, kTop + 164);
 	BSlider* vertical = new BSlider(
 		upright, "vertical", "Upright", NewMessage(), 0, 100, B_VERTICAL, B_BLOCK_THUMB);
 	vertical->SetLimitLabels("low", "high");
@@ -238,6 +238,7 @@ NewPageGroup(BRect frame)
 	colors->AddChild(Disabled(disabled));
 	BPictureButton* picture = new BPictureButton(BRect(604, 14, 696, 52), "picture", NewMessage());
 	picture->SetLabel("Picture button");
+	picture->SetToolTip("A tool tip\nof two lines");
 	colors->AddChild(picture);
 	tabs->AddTab(colors);
 
