@@ -3,6 +3,8 @@
 
 #include <algorithm>
 #include <cstdio>
+#include <cstdlib>
+#include <cstring>
 #include <ctime>
 #include <vector>
 
@@ -32,25 +34,39 @@ seconds(const auto& work, int repeats)
 }
 
 
+// ARCHWAY_BENCH in the environment chooses the comparisons whose names contain it.
+inline bool
+is_chosen(const char* what)
+{
+	const char* chosen = getenv("ARCHWAY_BENCH");
+	return chosen == nullptr || strstr(what, chosen) != nullptr;
+}
+
+
 // Prints the median of nine ratios with the lowest and the highest, and returns whether the median
-// meets the goal. Each turn runs both for some milliseconds.
+// meets the goal. Each turn runs both for some milliseconds, after one run that does not count, so
+// that neither tidies up the heap that the other left.
 inline bool
 compare(const char* what, double goal, const auto& ours, const auto& theirs)
 {
+	if (!is_chosen(what))
+		return true;
 	constexpr int kTurns = 9;
 	constexpr double kTurnSeconds = 0.03;
 	const auto repeats_for = [&](const auto& work) {
 		return std::max(1, int(kTurnSeconds / std::max(seconds(work, 1), 1e-9)));
 	};
 	ours();
-	theirs();
 	const int ourRepeats = repeats_for(ours);
+	theirs();
 	const int theirRepeats = repeats_for(theirs);
 	std::vector<double> ratios;
 	double ourTime = 0;
 	double theirTime = 0;
 	for (int turn = 0; turn < kTurns; turn++) {
+		ours();
 		ourTime = seconds(ours, ourRepeats);
+		theirs();
 		theirTime = seconds(theirs, theirRepeats);
 		ratios.push_back(ourTime / theirTime);
 	}

@@ -210,12 +210,14 @@ verify(bool condition, const char* what)
 bool
 bench_bytes(const char* shape, int count, parent_func parent)
 {
+	const std::string name = std::string(shape) + " of " + std::to_string(count);
+	if (!bench::is_chosen(("unflatten / memcpy, " + name).c_str()))
+		return true; // has the other one's name in it
 	const BMessage tree = message_tree(count, parent);
 	const size_t size = size_t(tree.FlattenedSize());
 	std::string bytes(size, '\0');
 	std::string copy(size, '\0');
 	tree.Flatten(bytes.data(), ssize_t(size));
-	const std::string name = std::string(shape) + " of " + std::to_string(count);
 
 	bool met = bench::compare(("flatten / memcpy, " + name).c_str(), 1.5,
 		[&] { benchmark::DoNotOptimize(tree.Flatten(copy.data(), ssize_t(size))); },

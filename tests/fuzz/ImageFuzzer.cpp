@@ -106,6 +106,26 @@ ReadAsFile(const uint8_t* data, size_t size, const BBitmap* expected)
 }
 
 
+// What can be read and written is known whatever was read before. Without an application there are
+// no resources to take an image from.
+void
+RequireFormats(BTranslatorRoster& roster)
+{
+	translator_id* translators = NULL;
+	int32 count = 0;
+	Require(roster.GetAllTranslators(&translators, &count) == B_OK && count > 0);
+	const translation_format* formats = NULL;
+	int32 formatCount = 0;
+	Require(
+		roster.GetInputFormats(translators[0], &formats, &formatCount) == B_OK && formatCount > 5);
+	Require(
+		roster.GetOutputFormats(translators[0], &formats, &formatCount) == B_OK && formatCount > 3);
+	delete[] translators;
+	Require(BTranslationUtils::GetBitmap('bits', "name") == NULL);
+	Require(BTranslationUtils::GetBitmap('bits', 1) == NULL);
+}
+
+
 // A stream takes bytes in pieces, and never claims more than it has.
 void
 ReadAsRows(const uint8_t* data, size_t size)
@@ -140,11 +160,14 @@ LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
 	}
 	translator_info info;
 	file.Seek(0, SEEK_SET);
-	const status_t known = BTranslatorRoster::Default()->Identify(&file, NULL, &info);
+	BTranslatorRoster* roster = BTranslatorRoster::Default();
+	const status_t known = roster->Identify(&file, NULL, &info);
 	Require(bitmap == nullptr || known == B_OK);
 	// A file takes several calls of the system, so not each time.
-	if (size % 8 == 0)
+	if (size % 8 == 0) {
 		ReadAsFile(data, size, bitmap.get());
+		RequireFormats(*roster);
+	}
 	ReadAsRows(data, size);
 	return 0;
 }
