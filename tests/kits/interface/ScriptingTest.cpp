@@ -111,9 +111,10 @@ TEST(Scripting, EveryClassFindsItsChildrenByNameAndPlace)
 	BMenuBar menuBar(kFrame, "");
 	BPopUpMenu popUp("");
 	BMenu menu("menu");
+	BControl control(kFrame, "", "", NULL, 0, 0);
 	BView* const views[] = { &view, &box, &button, &check, &radio, &field, &slider, &color, &status,
 		&string, &text, &list, &outline, &tabs, &scroller, &bar, &menuField, &menuBar, &popUp,
-		&menu };
+		&menu, &control };
 	for (BView* each : views) {
 		SCOPED_TRACE(typeid(*each).name());
 		BView* inner = new BView(BRect(0, 0, 5, 5), "inner", 0, 0);

@@ -148,8 +148,8 @@ TEST_F(TabViewHooks, ShowTheFocusInAnActiveWindowOnly)
 {
 	fixture.Focus(tabs);
 	BWindow* other = new BWindow(BRect(600, 50, 700, 150), "Other", B_TITLED_WINDOW, 0);
-	other->Show();
 	sDrawn.clear();
+	other->Show();
 	fixture.driver.ActivateWindow(other);
 	EXPECT_NE(std::string::npos, sDrawn.find(" tabs")) << "WindowActivated(false) redraws";
 	EXPECT_EQ(std::string::npos, sDrawn.find(" mark"));
@@ -237,24 +237,4 @@ TEST_F(TabViewHooks, ItsPreferredSizeIsThatOfItsPages)
 		tabs->ResizeToPreferred();
 		EXPECT_EQ(frame, tabs->Frame()) << "pages keep their frames";
 	});
-}
-
-
-TEST_F(TabViewHooks, PulseComesToATabViewThatNeedsIt)
-{
-	class Pulsing : public HookedTabView {
-	public:
-		Pulsing() { SetFlags(Flags() | B_PULSE_NEEDED); }
-		void Pulse() override
-		{
-			HookedTabView::Pulse();
-			release_sem(came);
-		}
-		sem_id came = create_sem(0, "pulse");
-	};
-	fixture.Locked([this] { fixture.window->SetPulseRate(10000); });
-	Pulsing* pulsing = fixture.Add(new Pulsing);
-	EXPECT_EQ(B_OK, acquire_sem_etc(pulsing->came, 2, B_RELATIVE_TIMEOUT, 20000000));
-	delete_sem(pulsing->came);
-	fixture.Locked([this] { fixture.window->SetPulseRate(0); });
 }

@@ -204,6 +204,51 @@ TEST(ViewHooks, OfListsMenusAndBarsAreCalled)
 }
 
 
+namespace {
+
+template<class View> class Pulsing : public View {
+public:
+	template<class... Arguments>
+	explicit Pulsing(sem_id came, Arguments... arguments) : View(arguments...), fCame(came)
+	{
+		this->SetFlags(this->Flags() | B_PULSE_NEEDED);
+	}
+
+	void Pulse() override
+	{
+		View::Pulse();
+		release_sem(fCame);
+	}
+
+private:
+	sem_id fCame;
+};
+
+} // namespace
+
+
+TEST(ViewHooks, PulseComesToABSliderABScrollBarAndABTabViewThatNeedIt)
+{
+	ControlFixture fixture;
+	fixture.Locked([&] { fixture.window->SetPulseRate(10000); });
+	const auto expectPulse = [&](sem_id came, BView* view) {
+		fixture.Add(view);
+		EXPECT_EQ(B_OK, acquire_sem_etc(came, 2, B_RELATIVE_TIMEOUT, 20000000)) << view->Name();
+		fixture.Locked([&] { view->RemoveSelf(); });
+		delete view;
+		delete_sem(came);
+	};
+	const auto newSem = [] { return create_sem(0, "pulses"); };
+	sem_id came = newSem();
+	expectPulse(came, new Pulsing<BSlider>(came, kFrame, "slider", "Label", nullptr, 0, 10));
+	came = newSem();
+	expectPulse(came, new Pulsing<BScrollBar>(came, kFrame, "bar", nullptr, 0, 10, B_VERTICAL));
+	came = newSem();
+	expectPulse(came, new Pulsing<BTabView>(came, kFrame, "tabs"));
+	fixture.Locked([&] { fixture.window->SetPulseRate(0); });
+}
+
+
 TEST(ViewHooks, AnUnknownPerformIsRefusedByEveryClass)
 {
 	BApplication app("application/x-vnd.Archway-test");

@@ -275,3 +275,22 @@ TEST(BitmapCalls, BitsMayBeLockedAndFlagsAreKept)
 	BBitmap none(BRect(0, 0, -1, -1), B_RGB32);
 	EXPECT_NE(B_OK, none.LockBits());
 }
+
+
+TEST(BitmapCalls, AnOldArchiveNamesItsFlagsOneByOne)
+{
+	BApplication app("application/x-vnd.Archway-test");
+	BBitmap bitmap(BRect(0, 0, 7, 7), B_RGB32);
+	for (const char* name : { "_contiguous", "_continguous" }) {
+		BMessage archive = ArchiveOf(bitmap);
+		archive.RemoveName("_bmflags");
+		archive.AddBool("_view_ok", true);
+		archive.AddBool(name, true);
+		const std::unique_ptr<BBitmap> revived = Revive<BBitmap>(archive);
+		ASSERT_NE(nullptr, revived);
+		EXPECT_NE(0u, revived->Flags() & B_BITMAP_ACCEPTS_VIEWS) << name;
+		EXPECT_EQ(
+			static_cast<uint32>(B_BITMAP_IS_CONTIGUOUS), revived->Flags() & B_BITMAP_IS_CONTIGUOUS)
+			<< name;
+	}
+}
