@@ -160,7 +160,7 @@ compare_growth()
 	const std::vector<char> many = flat_tree(kManyViews, groups_of_ten);
 	const std::vector<char> few = flat_tree(kFewViews, groups_of_ten);
 	bool met = bench::compare(
-		"growth: open", kGoal, [&] { open_tree(many); }, [&] { open_tree(few); });
+		"growth: open and close", kGoal, [&] { open_tree(many); }, [&] { open_tree(few); });
 	const std::unique_ptr<BView> manyViews = open_tree(many);
 	const std::unique_ptr<BView> fewViews = open_tree(few);
 	met = bench::compare(
