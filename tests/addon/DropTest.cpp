@@ -11,8 +11,10 @@
 #include <Box.h>
 #include <Button.h>
 #include <CheckBox.h>
+#include <Entry.h>
 #include <File.h>
 #include <MenuBar.h>
+#include <NodeInfo.h>
 #include <Resources.h>
 
 #include "addon/EditorScene.h"
@@ -20,6 +22,37 @@
 #include "work/WorkBackgroundView.h"
 
 namespace {
+
+
+// Takes views as a file manager does: makes the file, and has the drag's source write it.
+class FolderView : public BView {
+public:
+	FolderView(const std::string& path) :
+		BView(BRect(0, 0, 199, 99), "folder", B_FOLLOW_NONE, B_WILL_DRAW), fPath(path)
+	{
+	}
+
+	void MessageReceived(BMessage* message) override
+	{
+		const char* name;
+		int32 action;
+		entry_ref directory;
+		if (!message->WasDropped() || message->FindString("be:clip_name", &name) != B_OK
+			|| message->FindInt32("be:actions", &action) != B_OK
+			|| get_ref_for_path(fPath.c_str(), &directory) != B_OK) {
+			BView::MessageReceived(message);
+			return;
+		}
+		BFile((fPath + '/' + name).c_str(), B_READ_WRITE | B_CREATE_FILE);
+		BMessage reply(static_cast<uint32>(action));
+		reply.AddRef("directory", &directory);
+		reply.AddString("name", name);
+		message->SendReply(&reply);
+	}
+
+private:
+	std::string fPath;
+};
 
 
 class DropTest : public testing::Test {
@@ -57,6 +90,47 @@ protected:
 	void DragWidget(const char* entry, BView* to, BPoint where)
 	{
 		scene.Input().Drag(scene.PaletteEntry(entry), Driver::PointIn(to, where));
+	}
+
+	// The file as which the dragged view ends in a folder; a button is expected.
+	void ExpectFile(BPoint from)
+	{
+		BWindow* window = new BWindow(BRect(1260, 500, 1459, 599), "folder", B_TITLED_WINDOW, 0);
+		FolderView* view = new FolderView(folder);
+		window->AddChild(view);
+		window->Show();
+		Driver::WaitUntilIdle();
+		input.ActivateWindow(scene.Window()); // the first click would do no more
+		input.Drag(from, Driver::PointIn(view, BPoint(100, 50)));
+		window->Lock();
+		window->Quit();
+
+		const std::string path = folder + "/DragMe Success";
+		BFile file(path.c_str(), B_READ_ONLY);
+		BResources resources(&file);
+		size_t size = 0;
+		const void* bytes = resources.LoadResource('ARCV', 1, &size);
+		ASSERT_NE(nullptr, bytes);
+		const char* name;
+		int32 id;
+		type_code type;
+		ASSERT_TRUE(resources.GetResourceInfo(0, &type, &id, &name, &size));
+		EXPECT_STREQ("zetka", name);
+		EXPECT_FALSE(resources.GetResourceInfo(1, &type, &id, &name, &size));
+		BMessage archive;
+		ASSERT_EQ(B_OK, archive.Unflatten(static_cast<const char*>(bytes)));
+		EXPECT_EQ(uint32('drop'), archive.what);
+		EXPECT_STREQ("BButton", archive.FindString("class"));
+		char mime[B_MIME_TYPE_LENGTH + 1];
+		BNodeInfo info(&file);
+		ASSERT_EQ(B_OK, info.GetType(mime));
+		EXPECT_STREQ("application/x-tamvex-resource", mime);
+
+		const BView* before = scene.Work()->SelectedView();
+		input.DropFile(path.c_str(), Driver::PointIn(box, BPoint(30, 150)));
+		EXPECT_NE(before, scene.Work()->SelectedView());
+		EXPECT_NE(nullptr, dynamic_cast<BButton*>(scene.Work()->SelectedView()));
+		EXPECT_EQ(BPoint(30, 150), scene.Work()->SelectedView()->Frame().LeftTop());
 	}
 
 	BWindow* Question()
@@ -191,6 +265,24 @@ TEST_F(DropTest, AFileOfAViewBecomesTheView)
 	EXPECT_EQ(box, view->Parent());
 	EXPECT_EQ(BRect(30, 50, 100, 74), view->Frame());
 	EXPECT_EQ(view, scene.Work()->SelectedView());
+}
+
+
+TEST_F(DropTest, AWidgetOfThePaletteBecomesAFileInAFolder)
+{
+	ExpectFile(scene.PaletteEntry("BButton"));
+	EXPECT_EQ(1, box->CountChildren());
+}
+
+
+TEST_F(DropTest, AViewOfTheDesignBecomesAFileInAFolder)
+{
+	BButton* button = new BButton(BRect(10, 20, 80, 44), "button", "Press", NULL);
+	scene.Locked([&] { box->AddChild(button); });
+	input.Click(button);
+	ExpectFile(Driver::PointIn(button, BPoint(10, 10)));
+	EXPECT_EQ(1, box->CountChildren()); // the one that came back
+	EXPECT_STREQ("button", box->ChildAt(0)->Name());
 }
 
 
