@@ -80,11 +80,14 @@ RealScreen::RealScreen()
 	close(ends[1]);
 	fDisplay = ':' + ReadDisplay(ends[0]);
 	close(ends[0]);
+	// A window that comes while the manager starts is never shown by it. So it says itself when it
+	// has started.
 	fManager = std::make_unique<RunningProgram>(
-		std::vector<std::string> { "openbox", "--sm-disable" }, Environment());
+		std::vector<std::string> {
+			"openbox", "--sm-disable", "--startup", "xprop -root -f READY 8s -set READY yes" },
+		Environment());
 	fIsRunning = Poll([this] {
-		return Run({ "xprop", "-root", "_NET_SUPPORTING_WM_CHECK" }, Environment())
-				   .output.find("window id")
+		return Run({ "xprop", "-root", "READY" }, Environment()).output.find("yes")
 			!= std::string::npos;
 	});
 }

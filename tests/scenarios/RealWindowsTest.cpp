@@ -31,6 +31,18 @@ protected:
 		ASSERT_TRUE(screen->IsRunning());
 	}
 
+	// What the program had to say is told with a failure.
+	void TearDown() override
+	{
+		if (!HasFailure() || program == nullptr)
+			return;
+		const bool wasRunning = program->IsRunning();
+		const ProgramResult end = program->Finish(0);
+		ADD_FAILURE() << (wasRunning ? "still running" : "ended by itself") << ", " << end.status
+					  << '\n'
+					  << end.errors << screen->Do({ "search", "--name", "." });
+	}
+
 	void Start(const std::vector<std::string>& command)
 	{
 		program = std::make_unique<RunningProgram>(command, screen->Environment());
