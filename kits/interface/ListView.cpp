@@ -142,6 +142,7 @@ void
 BListView::DetachedFromWindow()
 {
 	fTracking.reset();
+	_LightBorder(false);
 	BView::DetachedFromWindow();
 }
 
@@ -181,9 +182,11 @@ BListView::FrameResized(float width, float height)
 void
 BListView::TargetedByScrollView(BScrollView* scroller)
 {
+	_LightBorder(false);
 	fScrollView = scroller;
 	if (scroller != NULL && !is_revived(this))
 		_UpdateScrollBars();
+	_ShowFocus();
 }
 
 
@@ -228,8 +231,16 @@ BListView::WindowActivated(bool active)
 void
 BListView::_ShowFocus()
 {
-	if (fScrollView != NULL)
-		fScrollView->SetBorderHighlighted(IsFocus() && Window() != NULL && Window()->IsActive());
+	_LightBorder(IsFocus() && Window() != NULL && Window()->IsActive());
+}
+
+
+// A scroll view that the list has left may be gone.
+void
+BListView::_LightBorder(bool lit)
+{
+	if (fScrollView != NULL && Parent() == fScrollView)
+		fScrollView->SetBorderHighlighted(lit);
 }
 
 

@@ -170,6 +170,7 @@ private:
 	bool _HandleTypeAhead(const char* bytes, int32 numBytes);
 	void _ScrollToItem(int32 index);
 	void _ShowFocus();
+	void _LightBorder(bool lit);
 
 	std::vector<BListItem*> fItems; // borrowed
 	std::unordered_set<BListItem*> fRevived; // made from the list's archive, and still in it

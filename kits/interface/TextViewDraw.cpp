@@ -5,6 +5,7 @@
 #include <cmath>
 
 #include <Region.h>
+#include <ScrollView.h>
 #include <Window.h>
 
 #include "interface/private/TextHistory.h"
@@ -134,6 +135,8 @@ BTextView::_SetActive(bool active)
 	fCaretTime = system_time();
 	if (Window() == NULL)
 		return;
+	if (BScrollView* scroller = dynamic_cast<BScrollView*>(Parent()))
+		scroller->SetBorderHighlighted(active);
 	Invalidate(_CaretRect(fCaret));
 	_InvalidateRange(_Start(), _End());
 }

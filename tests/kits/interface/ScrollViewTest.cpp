@@ -1,11 +1,14 @@
-// Scroll bars and scroll views.
+// Scroll views.
 #include <gtest/gtest.h>
 
 #include <vector>
 
+#include <AppDefs.h>
+#include <ListView.h>
 #include <Message.h>
 #include <ScrollBar.h>
 #include <ScrollView.h>
+#include <TextView.h>
 #include <Window.h>
 
 #include "support/TestWindow.h"
@@ -114,4 +117,69 @@ TEST(ScrollView, RevivesItsTargetAndBarsByKind)
 	ASSERT_EQ(B_OK, copy->Archive(&second));
 	EXPECT_TRUE(second.FindBool("_no_target_"));
 	delete copy;
+}
+
+
+namespace {
+
+// The view's scroll view is lit while the view has the focus in an active window.
+void
+ExpectFocusBorder(BView* view)
+{
+	TestWindow window;
+	BScrollView* scroller =
+		window.Add(new BScrollView("scroller", view, B_FOLLOW_NONE, 0, false, true));
+	window.driver.ActivateWindow(window.Window());
+	const auto lit = [&] {
+		bool result = false;
+		window.Locked([&] { result = scroller->IsBorderHighlighted(); });
+		return result;
+	};
+	const rgb_color plain = window.driver.PixelAt(scroller, BPoint(30, 1));
+	EXPECT_FALSE(lit());
+	window.Locked([&] { view->MakeFocus(); });
+	EXPECT_TRUE(lit());
+	EXPECT_NE(plain, window.driver.PixelAt(scroller, BPoint(30, 1)));
+
+	BWindow* other = new BWindow(BRect(600, 50, 700, 150), "Other", B_TITLED_WINDOW, 0);
+	other->Show();
+	window.driver.ActivateWindow(other);
+	EXPECT_EQ(plain, window.driver.PixelAt(scroller, BPoint(30, 1)));
+	window.driver.ActivateWindow(window.Window());
+	EXPECT_TRUE(lit());
+	BMessenger(other).SendMessage(B_QUIT_REQUESTED);
+	Driver::WaitUntilIdle();
+
+	window.Locked([&] { view->MakeFocus(false); });
+	EXPECT_FALSE(lit());
+	window.Locked([&] { view->MakeFocus(); });
+	window.Locked([&] { scroller->SetTarget(NULL); });
+	EXPECT_FALSE(lit()) << "its target has gone";
+	EXPECT_EQ(plain, window.driver.PixelAt(scroller, BPoint(30, 1)));
+
+	// It may outlive its scroll view.
+	window.Locked([&] {
+		scroller->SetTarget(view);
+		view->RemoveSelf();
+		scroller->RemoveSelf();
+		delete scroller;
+		window.Window()->AddChild(view);
+		view->MakeFocus();
+		EXPECT_TRUE(view->IsFocus());
+	});
+}
+
+} // namespace
+
+
+TEST(ScrollView, ItsBorderShowsTheFocusOfAList)
+{
+	ExpectFocusBorder(new BListView(BRect(10, 10, 109, 109), "list"));
+}
+
+
+TEST(ScrollView, ItsBorderShowsTheFocusOfAText)
+{
+	ExpectFocusBorder(new BTextView(
+		BRect(10, 10, 109, 109), "text", BRect(2, 2, 97, 97), B_FOLLOW_NONE, B_WILL_DRAW));
 }
