@@ -1,5 +1,7 @@
 // The resource editor's file panels, as a person uses them.
 
+#include <fstream>
+
 #include <gtest/gtest.h>
 
 #include "scenarios/Archway.h"
@@ -76,6 +78,17 @@ TEST(FilePanels, AskBeforeAnotherFileIsReplaced)
 	EXPECT_TRUE(BytesOf(kOther) == BytesOf(other));
 	scene.Play(ask + "answer \"Replace\"\nwait window \"other.rsrc\"\n");
 	EXPECT_TRUE(BytesOf(kDesign) == BytesOf(other));
+}
+
+
+TEST(FilePanels, AnyFileIsReplacedWhenThePersonAgrees)
+{
+	Scene scene;
+	const std::string notes = scene.folder.Path("notes.txt");
+	std::ofstream(notes) << "no resources, but somebody's notes";
+	scene.Play("key s with Command Shift\nkey a with Command\ntype \"notes.txt\\n\"\n"
+			   "answer \"Replace\"\nwait window \"notes.txt\"\n");
+	EXPECT_TRUE(BytesOf(kDesign) == BytesOf(notes));
 }
 
 
