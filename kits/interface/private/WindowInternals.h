@@ -18,6 +18,10 @@ namespace BPrivate {
 
 class ViewWalk;
 
+// What a window adds to a mouse message for one view.
+constexpr const char* kViewWhere = "be:view_where"; // a point in the view's coordinates
+constexpr const char* kTransit = "be:transit";
+
 
 // Belongs to who holds the window's lock, except for PostInput(), which the display thread calls.
 class WindowInternals final : public WindowClient, public ViewTreeClient {
