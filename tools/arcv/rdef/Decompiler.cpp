@@ -22,6 +22,22 @@ constexpr size_t kRawLine = 32; // bytes
 constexpr size_t kStringLine = 64;
 
 
+// Of two fields with one name nobody can ask for the second. No program makes such a message; its
+// bytes are written as they are.
+bool
+HasTwinFields(const BMessage& message)
+{
+	std::set<std::string_view> names;
+	char* name;
+	type_code type;
+	for (int32 i = 0; message.GetInfo(B_ANY_TYPE, i, &name, &type) == B_OK; i++) {
+		if (!names.insert(name).second)
+			return true;
+	}
+	return false;
+}
+
+
 std::string
 Tabs(int32 depth)
 {
@@ -193,7 +209,8 @@ private:
 		std::string code;
 		std::string value;
 		BMessage nested;
-		if (type == B_MESSAGE_TYPE && fMessage.FindMessage(name, index, &nested) == B_OK)
+		if (type == B_MESSAGE_TYPE && fMessage.FindMessage(name, index, &nested) == B_OK
+			&& !HasTwinFields(nested))
 			value = MessageWriter(nested, fDepth + 1).Text();
 		else
 			value = ValueText(type, data, size, fDepth + 1, &code);
@@ -329,7 +346,8 @@ ReadWholeMessage(const void* data, size_t size, BMessage* _message)
 	message_form_info info;
 	size_t used = 0;
 	return get_message_form(data, size, &info) == B_OK
-		&& unflatten_message(_message, data, size, NULL, &used) == B_OK && used == size;
+		&& unflatten_message(_message, data, size, NULL, &used) == B_OK && used == size
+		&& !HasTwinFields(*_message);
 }
 
 } // namespace
