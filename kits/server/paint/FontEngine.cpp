@@ -124,6 +124,19 @@ IsInvisible(uint32 character)
 }
 
 
+// In ems, from the pen.
+float
+InkMiddle(const FaceCharacter& character)
+{
+	const PathData outline = character.face->Outline(character.glyph);
+	if (outline.points.empty())
+		return 0;
+	const auto [left, right] = std::minmax_element(
+		outline.points.begin(), outline.points.end(), [](BPoint a, BPoint b) { return a.x < b.x; });
+	return (left->x + right->x) / 2;
+}
+
+
 Spacing
 SpacingOf(const FontSpec& spec)
 {
@@ -146,7 +159,8 @@ struct FontEngine::Tables {
 
 	const FaceCharacter& Character(const GlyphFace& face, uint32 character);
 	float Advance(const GlyphFace& face, const FaceCharacter& character, Spacing spacing);
-	// Calls with every character in the order of drawing.
+	// Calls with every character in the order of drawing, and whether it is a mark that stands
+	// above or below the letter before it.
 	template<typename Use>
 	void ForEach(const GlyphFace& face, std::string_view text, const Use& use);
 	std::shared_ptr<GlyphRun> MakeRun(const RunKey& key);
@@ -199,15 +213,20 @@ FontEngine::Tables::ForEach(const GlyphFace& face, std::string_view text, const 
 {
 	if (!RunsFromTheRight(text)) {
 		for (size_t at = 0; at < text.size();)
-			use(Character(face, NextCharacter(text, &at)));
+			use(Character(face, NextCharacter(text, &at)), false);
 		return;
 	}
 	std::vector<uint32> characters;
 	for (size_t at = 0; at < text.size();)
 		characters.push_back(NextCharacter(text, &at));
 	const auto hasForm = [&](uint32 form) { return Character(face, form).glyph != 0; };
-	for (const uint32 character : InDrawingOrder(characters, hasForm))
-		use(Character(face, character));
+	for (const uint32 character : InDrawingOrder(characters, hasForm)) {
+		FaceCharacter found = Character(face, character);
+		const bool isMark = IsMarkFromTheRight(character);
+		if (isMark)
+			found.advance = 0;
+		use(found, isMark);
+	}
 }
 
 
@@ -217,12 +236,19 @@ FontEngine::Tables::MakeRun(const RunKey& key)
 	auto run = std::make_shared<GlyphRun>();
 	run->glyphs.reserve(key.text.size());
 	const GlyphFace& face = list.FaceAt(key.code);
-	ForEach(face, key.text, [&](const FaceCharacter& character) {
-		const float x =
-			key.spacing == Spacing::WholePixels ? floorf(run->width + 0.5f) : run->width;
+	float letterX = 0, letterWidth = 0; // of the one that marks belong to
+	ForEach(face, key.text, [&](const FaceCharacter& character, bool isMark) {
 		const FaceCharacter found = character;
+		const float advance = Advance(face, found, key.spacing) * key.size;
+		float x = key.spacing == Spacing::WholePixels ? floorf(run->width + 0.5f) : run->width;
+		if (isMark) {
+			x = letterX + letterWidth / 2 - InkMiddle(found) * key.size;
+		} else {
+			letterX = x;
+			letterWidth = advance;
+		}
 		run->glyphs.push_back({ found.face, found.glyph, x, found.isSpace });
-		run->width += Advance(face, found, key.spacing) * key.size;
+		run->width += advance;
 	});
 	return run;
 }
@@ -233,7 +259,7 @@ FontEngine::Tables::Measure(const RunKey& key)
 {
 	float width = 0;
 	const GlyphFace& face = list.FaceAt(key.code);
-	ForEach(face, key.text, [&](const FaceCharacter& character) {
+	ForEach(face, key.text, [&](const FaceCharacter& character, bool) {
 		width += Advance(face, FaceCharacter(character), key.spacing) * key.size;
 	});
 	return width;

@@ -1,6 +1,7 @@
 #include "server/paint/TextOrder.h"
 
 #include <algorithm>
+#include <utility>
 
 #include "server/paint/ArabicForms.h"
 #include "server/paint/FontEngine.h"
@@ -100,6 +101,14 @@ IsRightward(Kind kind)
 }
 
 
+// Numbers count as from the right.
+Kind
+SideOf(Kind kind)
+{
+	return kind == Kind::Left ? Kind::Left : Kind::Right;
+}
+
+
 uint32
 Mirrored(uint32 c)
 {
@@ -126,6 +135,8 @@ private:
 	void _ResolveNumbers();
 	void _ResolveSeparators();
 	void _ResolveTerminators();
+	void _ResolveBrackets();
+	void _ResolvePair(size_t open, size_t close);
 	void _ResolveNeutrals();
 	void _SetLevels();
 	void _Reverse(uint8 level);
@@ -155,6 +166,7 @@ Line::Ordered()
 	_ResolveNumbers();
 	_ResolveSeparators();
 	_ResolveTerminators();
+	_ResolveBrackets();
 	_ResolveNeutrals();
 	_SetLevels();
 	const uint8 highest = *std::max_element(fLevels.begin(), fLevels.end());
@@ -236,12 +248,63 @@ Line::_ResolveTerminators()
 }
 
 
+// Of brackets within each other the outer ones come first.
+void
+Line::_ResolveBrackets()
+{
+	static constexpr std::string_view kOpen = "([{", kClose = ")]}";
+	std::vector<size_t> open;
+	std::vector<std::pair<size_t, size_t>> pairs;
+	for (size_t i = 0; i < fCharacters.size(); i++) {
+		if (fKinds[i] != Kind::Neutral || fCharacters[i] >= 0x80)
+			continue;
+		const char bracket = static_cast<char>(fCharacters[i]);
+		if (kOpen.find(bracket) != kOpen.npos)
+			open.push_back(i);
+		const size_t kind = kClose.find(bracket);
+		if (kind == kClose.npos)
+			continue;
+		for (size_t at = open.size(); at-- > 0;) {
+			if (fCharacters[open[at]] == static_cast<uint32>(kOpen[kind])) {
+				pairs.emplace_back(open[at], i);
+				open.resize(at);
+				break;
+			}
+		}
+	}
+	std::sort(pairs.begin(), pairs.end());
+	for (const auto& [from, to] : pairs)
+		_ResolvePair(from, to);
+}
+
+
+// Brackets go with what they hold, if that is of the line's own direction or of that before them.
+void
+Line::_ResolvePair(size_t open, size_t close)
+{
+	bool holdsBase = false, holdsOther = false;
+	for (size_t i = open + 1; i < close; i++) {
+		if (fKinds[i] != Kind::Neutral && fKinds[i] != Kind::Space)
+			(SideOf(fKinds[i]) == fBase ? holdsBase : holdsOther) = true;
+	}
+	if (!holdsBase && !holdsOther)
+		return;
+	Kind before = fBase;
+	for (size_t i = open; i-- > 0;) {
+		if (fKinds[i] != Kind::Neutral && fKinds[i] != Kind::Space) {
+			before = SideOf(fKinds[i]);
+			break;
+		}
+	}
+	fKinds[open] = fKinds[close] = holdsBase ? fBase : before;
+}
+
+
 // Between parts of one direction they take that, numbers counting as from the right; otherwise the
 // line's own.
 void
 Line::_ResolveNeutrals()
 {
-	const auto side = [](Kind kind) { return kind == Kind::Left ? Kind::Left : Kind::Right; };
 	for (size_t i = 0; i < fKinds.size();) {
 		if (fKinds[i] != Kind::Neutral && fKinds[i] != Kind::Space) {
 			i++;
@@ -250,10 +313,9 @@ Line::_ResolveNeutrals()
 		size_t end = i;
 		while (end < fKinds.size() && (fKinds[end] == Kind::Neutral || fKinds[end] == Kind::Space))
 			end++;
-		const Kind before = side(_Before(i));
-		const Kind behind = end < fKinds.size() ? side(fKinds[end]) : fBase;
-		std::fill(
-			fKinds.begin() + i, fKinds.begin() + end, before == behind ? before : side(fBase));
+		const Kind before = SideOf(_Before(i));
+		const Kind behind = end < fKinds.size() ? SideOf(fKinds[end]) : fBase;
+		std::fill(fKinds.begin() + i, fKinds.begin() + end, before == behind ? before : fBase);
 		i = end;
 	}
 }
@@ -336,6 +398,13 @@ RunsFromTheRight(std::string_view text)
 			return true;
 	}
 	return false;
+}
+
+
+bool
+IsMarkFromTheRight(uint32 character)
+{
+	return character >= 0x590 && IsMark(character);
 }
 
 

@@ -81,6 +81,9 @@ TEST(TextOrder, BracketsAreMirrored)
 {
 	EXPECT_EQ(CharactersOf("(םולש) ילב"), Ordered("בלי (שלום)"));
 	EXPECT_EQ(CharactersOf("a (םולש)"), Ordered("a (שלום)"));
+	EXPECT_EQ(CharactersOf("12.5 (abc) םולש"), Ordered("שלום (abc) 12.5"));
+	EXPECT_EQ(CharactersOf("[a (b) {c}] םולש"), Ordered("שלום [a (b) {c}]"));
+	EXPECT_EQ(CharactersOf("x (a) y"), Ordered("x (a) y"));
 }
 
 

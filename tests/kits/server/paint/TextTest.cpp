@@ -307,3 +307,26 @@ TEST(Text, StringSpacingPutsEachCharacterOnAWholePixel)
 	}
 	EXPECT_TRUE(differs);
 }
+
+
+TEST(Text, MarksStandInTheMiddleOfTheirLetter)
+{
+	FontSpec spec;
+	spec.size = 40;
+	const char* const kLetter = "\xd7\xa9"; // shin
+	const std::string marked = std::string(kLetter) + "\xd6\xb8"; // and qamats
+	const auto alone = FontEngine::Get().Run(spec, kLetter);
+	const auto run = FontEngine::Get().Run(spec, marked);
+	ASSERT_EQ(2u, run->glyphs.size());
+	EXPECT_EQ(alone->width, run->width) << "a mark takes no room";
+	EXPECT_EQ(alone->width, FontEngine::Get().StringWidth(spec, marked));
+	EXPECT_EQ(alone->glyphs[0].glyph, run->glyphs[0].glyph);
+	const PathData outline = FontEngine::Get().Outline(run->glyphs[1]);
+	ASSERT_FALSE(outline.points.empty());
+	float left = 1000, right = -1000;
+	for (const BPoint& point : outline.points) {
+		left = std::min(left, run->glyphs[1].x + point.x * spec.size);
+		right = std::max(right, run->glyphs[1].x + point.x * spec.size);
+	}
+	EXPECT_NEAR(run->width / 2, (left + right) / 2, 0.01f);
+}
