@@ -88,8 +88,9 @@ BControl::Archive(BMessage* archive, bool deep) const
 	writer.Bool("_disable", !fEnabled, false, !fEnabled);
 	// Without the field the flags answer, which a disabled control has no longer.
 	const bool navigable = (Flags() & B_NAVIGABLE) != 0;
-	bool said = navigable;
-	writer.Source().FindBool("be:wants_nav", &said);
+	bool said;
+	if (writer.Source().FindBool("be:wants_nav", &said) != B_OK)
+		said = navigable;
 	if (!writer.Keep("be:wants_nav", said == fWantsNavigation) && fWantsNavigation != navigable)
 		archive->AddBool("be:wants_nav", fWantsNavigation);
 	return writer.Status();
