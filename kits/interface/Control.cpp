@@ -86,12 +86,14 @@ BControl::Archive(BMessage* archive, bool deep) const
 	BPrivate::write_text(writer, archive, "_label", fLabel);
 	writer.Int32("_val", fValue, B_CONTROL_OFF, fValue != B_CONTROL_OFF);
 	writer.Bool("_disable", !fEnabled, false, !fEnabled);
-	// Without the field the flags answer, which a disabled control has no longer.
+	// Without the field the flags answer, which a disabled control has no longer. An enabled one
+	// need not say what its flags say.
 	const bool navigable = (Flags() & B_NAVIGABLE) != 0;
 	bool said;
 	if (writer.Source().FindBool("be:wants_nav", &said) != B_OK)
-		said = navigable;
-	if (!writer.Keep("be:wants_nav", said == fWantsNavigation) && fWantsNavigation != navigable)
+		said = fEnabled ? fWantsNavigation : navigable;
+	const bool kept = writer.Keep("be:wants_nav", said == fWantsNavigation);
+	if (!kept && !fEnabled && fWantsNavigation != navigable)
 		archive->AddBool("be:wants_nav", fWantsNavigation);
 	return writer.Status();
 }

@@ -299,6 +299,26 @@ TEST(Control, ADisabledControlIsReachedByKeysAgainAfterAnArchive)
 }
 
 
+TEST(Control, TheFlagsOfAnEnabledControlAreAllThatChangesWithThem)
+{
+	ControlFixture fixture;
+	for (const uint32 flags : { uint32(B_WILL_DRAW), uint32(B_WILL_DRAW | B_NAVIGABLE) }) {
+		BMessage archive;
+		{
+			BCheckBox box(BRect(0, 0, 99, 19), "box", "Box", NULL, B_FOLLOW_NONE, flags);
+			ASSERT_EQ(B_OK, box.Archive(&archive));
+		}
+		BMessage expected(archive);
+		BCheckBox revived(&archive);
+		revived.SetFlags(revived.Flags() ^ B_NAVIGABLE);
+		BMessage changed;
+		ASSERT_EQ(B_OK, revived.Archive(&changed));
+		expected.ReplaceInt32("_flags", int32(revived.Flags()));
+		EXPECT_TRUE(changed.HasSameData(expected, true, true));
+	}
+}
+
+
 TEST(Control, DisablingARevivedControlSaysThatItWasReachedByKeys)
 {
 	ControlFixture fixture;
