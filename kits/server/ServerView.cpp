@@ -2,6 +2,8 @@
 
 #include <atomic>
 
+#include "server/ViewTree.h"
+
 namespace BPrivate {
 
 namespace {
@@ -118,6 +120,15 @@ ServerView::InsertChild(ServerView* child, ServerView* before)
 	(before != nullptr ? before->fPrevious : fLast) = child;
 	fChildCount++;
 	sLinkVersion.fetch_add(1, std::memory_order_relaxed);
+	if (fIndex == nullptr)
+		return;
+	// Between two numbers there is no other one: the children are numbered again when asked for.
+	if (before != nullptr) {
+		fIndex.reset();
+		return;
+	}
+	child->fOrder = child->fPrevious != nullptr ? child->fPrevious->fOrder + 1 : 0;
+	fIndex->Add(*child);
 }
 
 
@@ -126,11 +137,25 @@ ServerView::Unlink()
 {
 	if (fParent == nullptr)
 		return;
+	if (fParent->fIndex != nullptr)
+		fParent->fIndex->Remove(*this, fFrame);
 	(fPrevious != nullptr ? fPrevious->fNext : fParent->fFirst) = fNext;
 	(fNext != nullptr ? fNext->fPrevious : fParent->fLast) = fPrevious;
 	fParent->fChildCount--;
 	fParent = fNext = fPrevious = nullptr;
 	sLinkVersion.fetch_add(1, std::memory_order_relaxed);
+}
+
+
+void
+ServerView::SetFrame(BRect frame)
+{
+	ChildIndex* index = fParent != nullptr ? fParent->fIndex.get() : nullptr;
+	if (index != nullptr)
+		index->Remove(*this, fFrame);
+	fFrame = frame;
+	if (index != nullptr)
+		index->Add(*this);
 }
 
 
@@ -170,6 +195,18 @@ ServerView::IsHidden(const ServerView* top) const
 			return true;
 	}
 	return false;
+}
+
+
+const ChildIndex&
+ServerView::_Index() const
+{
+	if (fIndex == nullptr) {
+		fIndex = std::make_unique<ChildIndex>(*this);
+		if (fTree != nullptr)
+			fTree->AddVisited(fChildCount);
+	}
+	return *fIndex;
 }
 
 

@@ -2,11 +2,13 @@
 #pragma once
 
 #include <memory>
+#include <span>
 
 #include <GraphicsDefs.h>
 #include <Rect.h>
 #include <Region.h>
 
+#include "server/ChildIndex.h"
 #include "server/paint/Surface.h"
 
 class BView;
@@ -53,13 +55,32 @@ public:
 	ServerView* NextInTree(const ServerView* top) const;
 	ServerView* NextSkippingChildren(const ServerView* top) const;
 
+	// Calls the function with the children, in their order, that may have pixels in one of the areas
+	// (own coordinates), until it returns false; with those behind `after` alone, if that is given.
+	// Among many children it takes time for what lies in the areas, and not for the others.
+	template<typename Function>
+	void ForEachChildIn(
+		std::span<const clipping_rect> areas, const ServerView* after, Function&& function) const
+	{
+		if (!ChildIndex::IsWorthAsking(areas, fChildCount)) {
+			ServerView* child = after != nullptr ? after->fNext : fFirst;
+			while (child != nullptr && function(*child))
+				child = child->fNext;
+			return;
+		}
+		for (ServerView* child : _Index().Find(areas)) {
+			if ((after == nullptr || after->fOrder < child->fOrder) && !function(*child))
+				return;
+		}
+	}
+
 	// NULL appends.
 	void InsertChild(ServerView* child, ServerView* before);
 	void Unlink();
 
 	// In the parent's coordinates; its size is that of the bounds.
 	BRect Frame() const { return fFrame; }
-	void SetFrame(BRect frame) { fFrame = frame; }
+	void SetFrame(BRect frame);
 	BPoint Scroll() const { return fScroll; }
 	void SetScroll(BPoint leftTop) { fScroll = leftTop; }
 	BRect Bounds() const;
@@ -89,8 +110,16 @@ public:
 	uint16 Marks() const { return fMarks; }
 	void SetMarks(uint16 marks) { fMarks = marks; }
 
+	// For the parent's index of its children.
+	uint32 Order() const { return fOrder; }
+	void SetOrder(uint32 order) { fOrder = order; }
+	uint32 PlaceInCell() const { return fPlaceInCell; }
+	void SetPlaceInCell(uint32 place) { fPlaceInCell = place; }
+
 private:
 	friend class ViewTree;
+
+	const ChildIndex& _Index() const;
 
 	BView* fOwner; // borrowed
 	ViewTree* fTree = nullptr; // borrowed
@@ -106,6 +135,9 @@ private:
 	int32 fChildCount = 0;
 	int16 fHideCount = 0;
 	uint16 fMarks = 0;
+	uint32 fOrder = 0; // among its siblings, while the parent has an index
+	uint32 fPlaceInCell = 0; // of that index
+	mutable std::unique_ptr<ChildIndex> fIndex; // NULL until it is asked for
 	std::unique_ptr<ViewBackground> fBackground;
 };
 

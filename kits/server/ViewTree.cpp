@@ -1,5 +1,6 @@
 #include "server/ViewTree.h"
 
+#include <array>
 #include <cmath>
 
 namespace BPrivate {
@@ -219,14 +220,13 @@ ViewTree::ViewAt(BPoint point) const
 	ServerView* found = nullptr;
 	while (view != nullptr) {
 		const ServerView* hit = nullptr;
-		for (const ServerView* child = view->FirstChild(); child != nullptr;
-			 child = child->Next()) {
+		const std::array area = { to_pixels(BRect(where, where)) };
+		view->ForEachChildIn(area, nullptr, [&](const ServerView& child) {
 			fCountHitTested++;
-			if (child->HideCount() <= 0 && child->Frame().Contains(where)) {
-				hit = child;
-				break;
-			}
-		}
+			if (child.HideCount() <= 0 && child.Frame().Contains(where))
+				hit = &child;
+			return hit == nullptr;
+		});
 		if (hit != nullptr) {
 			where = where - hit->Frame().LeftTop() + hit->Scroll();
 			found = const_cast<ServerView*>(hit);

@@ -76,6 +76,9 @@ public:
 	int64 CountDrawn() const { return fCountDrawn; }
 	int64 CountClippings() const { return fCountClippings; } // made for a view that draws
 	int64 CountHitTested() const { return fCountHitTested; } // views asked for a point
+	// Children looked at because something is painted or clipped, or to find them quickly later.
+	int64 CountVisited() const { return fCountVisited; }
+	void AddVisited(int64 count) const { fCountVisited += count; }
 
 	// Makes the view the one that the painter draws for; NULL when nothing of it can be painted.
 	// The constraint is in its own coordinates and asked for only when clipping is made anew.
@@ -152,6 +155,7 @@ private:
 	int64 fCountDrawn = 0;
 	int64 fCountClippings = 0;
 	mutable int64 fCountHitTested = 0;
+	mutable int64 fCountVisited = 0;
 };
 
 

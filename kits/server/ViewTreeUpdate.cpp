@@ -1,4 +1,5 @@
 // The walk that paints, clipping, and the moving of pixels.
+#include <array>
 #include <cmath>
 
 #include "server/ViewTree.h"
@@ -8,12 +9,38 @@ namespace BPrivate {
 namespace {
 
 constexpr size_t kFewRects = 8;
+constexpr int32 kFewAreas = 16;
 
 
 int32
 rounded(float value)
 {
 	return static_cast<int32>(std::lround(value));
+}
+
+
+// A part of the window in the coordinates of a view, to the nearest pixel.
+clipping_rect
+in_view(const clipping_rect& rect, BPoint origin)
+{
+	const int32 x = rounded(origin.x);
+	const int32 y = rounded(origin.y);
+	return { rect.left - x, rect.top - y, rect.right - x, rect.bottom - y };
+}
+
+
+// The same of a region, for finding some of many children. One that is scattered counts as a whole.
+std::vector<clipping_rect>
+search_areas(const BRegion& region, BPoint origin)
+{
+	std::vector<clipping_rect> rects;
+	if (region.CountRects() > kFewAreas) {
+		rects.push_back(in_view(region.FrameInt(), origin));
+		return rects;
+	}
+	for (int32 i = 0; i < region.CountRects(); i++)
+		rects.push_back(in_view(region.RectAtInt(i), origin));
+	return rects;
 }
 
 
@@ -85,8 +112,14 @@ ViewTree::_Collect(ServerView& view, const Place& parent, std::vector<Step>& ste
 	if (place.hidden || is_empty(place.cut) || !fUpdateRegion->Intersects(place.cut))
 		return;
 	steps.push_back({ &view, place.origin, place.cut });
-	for (ServerView* child = view.FirstChild(); child != nullptr; child = child->Next())
-		_Collect(*child, place, steps);
+	std::vector<clipping_rect> areas;
+	if (view.CountChildren() >= ChildIndex::kFewestChildren)
+		areas = search_areas(fUpdateRegion->Part(place.cut), place.origin);
+	view.ForEachChildIn(areas, nullptr, [&](ServerView& child) {
+		fCountVisited++;
+		_Collect(child, place, steps);
+		return true;
+	});
 }
 
 
@@ -117,15 +150,23 @@ ViewTree::_UpdateStep(const Step& step, bool afterChildren)
 void
 ViewTree::_ExcludeChildren(const ServerView& view, BPoint origin, BRegion& region) const
 {
+	if (view.FirstChild() == nullptr || region.IsEmpty())
+		return;
+	const clipping_rect frame = region.FrameInt();
 	std::vector<clipping_rect> rects;
-	for (const ServerView* child = view.FirstChild(); child != nullptr; child = child->Next()) {
-		if (child->HideCount() > 0 || child->Has(kTransparentBackground))
-			continue;
-		const clipping_rect rect = to_pixels(child->Frame().OffsetByCopy(origin));
-		const clipping_rect part = intersect(rect, region.FrameInt());
+	std::vector<clipping_rect> areas;
+	if (view.CountChildren() >= ChildIndex::kFewestChildren)
+		areas = search_areas(region, origin);
+	view.ForEachChildIn(areas, nullptr, [&](const ServerView& child) {
+		fCountVisited++;
+		if (child.HideCount() > 0 || child.Has(kTransparentBackground))
+			return true;
+		const clipping_rect rect = to_pixels(child.Frame().OffsetByCopy(origin));
+		const clipping_rect part = intersect(rect, frame);
 		if (!is_empty(part))
 			rects.push_back(part);
-	}
+		return true;
+	});
 	exclude_all(region, rects);
 }
 
@@ -214,15 +255,17 @@ ViewTree::_Covering(const ServerView& view, const clipping_rect& cut, bool opaqu
 		if (level->Next() == nullptr)
 			continue;
 		const Place parent = _PlaceOf(*level->Parent());
-		for (const ServerView* sibling = level->Next(); sibling != nullptr;
-			 sibling = sibling->Next()) {
-			if (sibling->HideCount() > 0 || (opaqueOnly && !sibling->IsOpaque()))
-				continue;
-			const Place place = _PlaceIn(parent, *sibling, sibling->Frame());
+		const std::array area = { in_view(cut, parent.origin) };
+		level->Parent()->ForEachChildIn(area, level, [&](const ServerView& sibling) {
+			fCountVisited++;
+			if (sibling.HideCount() > 0 || (opaqueOnly && !sibling.IsOpaque()))
+				return true;
+			const Place place = _PlaceIn(parent, sibling, sibling.Frame());
 			const clipping_rect part = intersect(place.cut, cut);
 			if (!is_empty(part))
 				rects.push_back(part);
-		}
+			return true;
+		});
 	}
 	return unite(rects);
 }

@@ -64,6 +64,13 @@ PaintCounter::LinesLaidOut()
 }
 
 
+int64
+PaintCounter::Visited() const
+{
+	return _Read().visited - fStart.visited;
+}
+
+
 PaintCounter::Counts
 PaintCounter::_Read() const
 {
@@ -74,6 +81,7 @@ PaintCounter::_Read() const
 	counts.drawn = internals.tree.CountDrawn();
 	counts.clippings = internals.tree.CountClippings();
 	counts.hitTested = internals.tree.CountHitTested();
+	counts.visited = internals.tree.CountVisited();
 	const WindowRecord& record = internals.server->Record();
 	fWindow->Unlock();
 	// Those two belong to the display's thread.

@@ -17,13 +17,14 @@ public:
 	int64 Drawn() const; // Draw() calls and painted backgrounds of views
 	int64 Clippings() const; // made for views that draw
 	int64 HitTested() const; // views asked whether a point lies in them
+	int64 Visited() const; // children looked at because something was painted or clipped
 
 	// Lines of text laid out by any text view since the start of the program.
 	static int64 LinesLaidOut();
 
 private:
 	struct Counts {
-		int64 flushes, flushedPixels, drawn, clippings, hitTested;
+		int64 flushes, flushedPixels, drawn, clippings, hitTested, visited;
 	};
 
 	Counts _Read() const;
