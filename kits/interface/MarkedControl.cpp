@@ -1,5 +1,7 @@
 #include <MarkedControl.h>
 
+#include <algorithm>
+
 #include <Message.h>
 #include <Window.h>
 
@@ -14,6 +16,7 @@ namespace {
 
 const BPoint kMarkPlace(1, 3);
 constexpr float kLabelLeft = 20;
+constexpr float kClosestLabelLeft = 16; // where the label would be cut otherwise
 constexpr float kHorizontalPadding = 22;
 constexpr float kVerticalPadding = 6;
 
@@ -22,13 +25,17 @@ constexpr float kVerticalPadding = 6;
 
 _BMarkedControl_::_BMarkedControl_(BRect frame, const char* name, const char* label,
 	BMessage* message, uint32 resizingMode, uint32 flags) :
-	BControl(frame, name, label, message, resizingMode, flags),
-	fPressed(false)
+	_BPressControl_(frame, name, label, message, resizingMode, flags)
 {
+	// Never less high than its mark and its label.
+	float height;
+	_BMarkedControl_::GetPreferredSize(NULL, &height);
+	if (Bounds().Height() < height)
+		ResizeTo(Bounds().Width(), height);
 }
 
 
-_BMarkedControl_::_BMarkedControl_(BMessage* archive) : BControl(archive), fPressed(false)
+_BMarkedControl_::_BMarkedControl_(BMessage* archive) : _BPressControl_(archive)
 {
 }
 
@@ -42,7 +49,7 @@ void
 _BMarkedControl_::Draw(BRect updateRect)
 {
 	uint32 state = IsEnabled() ? Look::kNormal : Look::kDisabled;
-	if (fPressed)
+	if (IsPressed())
 		state |= Look::kPressed;
 	if (Value() == B_CONTROL_PARTIALLY_ON)
 		state |= Look::kPartlyOn;
@@ -54,69 +61,11 @@ _BMarkedControl_::Draw(BRect updateRect)
 
 	const float baseline = BPrivate::centered_baseline(
 		LabelMetrics(this), kMarkPlace.y, kMarkPlace.y + Look::kCheckBoxSize - 1);
-	BPrivate::draw_label(this, Label(), BPoint(kLabelLeft, baseline), IsEnabled());
-	if (IsFocus() && IsEnabled() && Window()->IsActive()) {
-		Look::DrawFocusLine(
-			this, kLabelLeft, kLabelLeft + BPrivate::label_width(this, Label()) - 1, baseline);
-	}
-}
-
-
-void
-_BMarkedControl_::MouseDown(BPoint where)
-{
-	if (!IsEnabled())
-		return;
-
-	fPressed = true;
-	Invalidate();
-	SetTracking(true);
-	SetMouseEventMask(B_POINTER_EVENTS, B_LOCK_WINDOW_FOCUS | B_NO_POINTER_HISTORY);
-}
-
-
-void
-_BMarkedControl_::MouseMoved(BPoint where, uint32 transit, const BMessage* dragMessage)
-{
-	if (!IsTracking() || fPressed == Bounds().Contains(where))
-		return;
-	fPressed = !fPressed;
-	Invalidate();
-}
-
-
-void
-_BMarkedControl_::MouseUp(BPoint where)
-{
-	if (!IsTracking())
-		return;
-
-	SetTracking(false);
-	if (fPressed) {
-		fPressed = false;
-		Invalidate();
-	}
-	if (Bounds().Contains(where))
-		Choose();
-}
-
-
-void
-_BMarkedControl_::KeyDown(const char* bytes, int32 numBytes)
-{
-	if (IsEnabled() && numBytes == 1 && (bytes[0] == B_SPACE || bytes[0] == B_ENTER)) {
-		Choose();
-		return;
-	}
-	BControl::KeyDown(bytes, numBytes);
-}
-
-
-void
-_BMarkedControl_::DetachedFromWindow()
-{
-	fPressed = false;
-	BControl::DetachedFromWindow();
+	const float width = BPrivate::label_width(this, Label());
+	const float left = std::clamp(Bounds().right + 1 - width, kClosestLabelLeft, kLabelLeft);
+	BPrivate::draw_label(this, Label(), BPoint(left, baseline), IsEnabled());
+	if (IsFocus() && IsEnabled() && Window()->IsActive())
+		Look::DrawFocusLine(this, left, left + width - 1, baseline);
 }
 
 

@@ -14,14 +14,14 @@ namespace Look = BPrivate::Look;
 
 BPictureButton::BPictureButton(BRect frame, const char* name, BMessage* message, uint32 behavior,
 	uint32 resizingMode, uint32 flags) :
-	BControl(frame, name, NULL, message, resizingMode, flags),
-	fBehavior(behavior), fPressed(false)
+	_BPressControl_(frame, name, NULL, message, resizingMode, flags),
+	fBehavior(behavior)
 {
 }
 
 
 BPictureButton::BPictureButton(BMessage* archive) :
-	BControl(archive), fBehavior(B_ONE_STATE_BUTTON), fPressed(false)
+	_BPressControl_(archive), fBehavior(B_ONE_STATE_BUTTON)
 {
 	// The pictures' own fields are never looked up, and so come out as they came in.
 	int32 behavior;
@@ -59,7 +59,7 @@ void
 BPictureButton::Draw(BRect updateRect)
 {
 	const BRect bounds = Bounds();
-	const bool down = fPressed || Value() != B_CONTROL_OFF;
+	const bool down = IsPressed() || Value() != B_CONTROL_OFF;
 	Look::DrawRaised(this, bounds, Look::BaseColor(this),
 		(IsEnabled() ? Look::kNormal : Look::kDisabled) | (down ? Look::kPressed : Look::kNormal));
 	if (Label() != NULL) {
@@ -73,67 +73,6 @@ BPictureButton::Draw(BRect updateRect)
 		ring.InsetBy(2, 2);
 		Look::DrawRing(this, ring, Look::NavigationColor(), Look::NavigationColor());
 	}
-}
-
-
-void
-BPictureButton::MouseDown(BPoint where)
-{
-	if (!IsEnabled())
-		return;
-	fPressed = true;
-	Invalidate();
-	SetTracking(true);
-	SetMouseEventMask(B_POINTER_EVENTS, B_LOCK_WINDOW_FOCUS | B_NO_POINTER_HISTORY);
-}
-
-
-void
-BPictureButton::MouseMoved(BPoint where, uint32 transit, const BMessage* dragMessage)
-{
-	if (!IsTracking() || fPressed == Bounds().Contains(where))
-		return;
-	fPressed = !fPressed;
-	Invalidate();
-}
-
-
-void
-BPictureButton::MouseUp(BPoint where)
-{
-	if (!IsTracking())
-		return;
-	SetTracking(false);
-	fPressed = false;
-	Invalidate();
-	if (Bounds().Contains(where))
-		_Activate();
-}
-
-
-void
-BPictureButton::KeyDown(const char* bytes, int32 numBytes)
-{
-	if (IsEnabled() && numBytes == 1 && (bytes[0] == B_SPACE || bytes[0] == B_ENTER)) {
-		_Activate();
-		return;
-	}
-	BControl::KeyDown(bytes, numBytes);
-}
-
-
-// A button with two states switches; one with a single state is back at once.
-void
-BPictureButton::_Activate()
-{
-	if (fBehavior == B_TWO_STATE_BUTTON) {
-		SetValue(Value() == B_CONTROL_ON ? B_CONTROL_OFF : B_CONTROL_ON);
-		Invoke();
-		return;
-	}
-	SetValue(B_CONTROL_ON);
-	Invoke();
-	SetValue(B_CONTROL_OFF);
 }
 
 
@@ -162,4 +101,19 @@ uint32
 BPictureButton::Behavior() const
 {
 	return fBehavior;
+}
+
+
+// A button with two states switches; one with a single state is back at once.
+void
+BPictureButton::Choose()
+{
+	if (fBehavior == B_TWO_STATE_BUTTON) {
+		SetValue(Value() == B_CONTROL_ON ? B_CONTROL_OFF : B_CONTROL_ON);
+		Invoke();
+		return;
+	}
+	SetValue(B_CONTROL_ON);
+	Invoke();
+	SetValue(B_CONTROL_OFF);
 }

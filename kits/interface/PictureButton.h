@@ -1,7 +1,7 @@
 // BPictureButton: a button that shows a picture for each of its states.
 #pragma once
 
-#include <Control.h>
+#include <PressControl.h>
 
 enum picture_button_behavior : uint32 { B_ONE_STATE_BUTTON = 0, B_TWO_STATE_BUTTON = 1 };
 
@@ -9,7 +9,7 @@ enum picture_button_behavior : uint32 { B_ONE_STATE_BUTTON = 0, B_TWO_STATE_BUTT
 // Pictures are not recorded or played on this platform. A button from an archive keeps the
 // archives of its pictures and gives them back unchanged; it draws as a bevelled button with its
 // label. Its value, its tracking and its invocation are those of the class.
-class _EXPORT BPictureButton : public BControl {
+class _EXPORT BPictureButton : public _BPressControl_ {
 public:
 	BPictureButton(BRect frame, const char* name, BMessage* message,
 		uint32 behavior = B_ONE_STATE_BUTTON, uint32 resizingMode = B_FOLLOW_LEFT | B_FOLLOW_TOP,
@@ -21,22 +21,18 @@ public:
 	virtual status_t Archive(BMessage* archive, bool deep = true) const;
 
 	virtual void Draw(BRect updateRect);
-	virtual void MouseDown(BPoint where);
-	virtual void MouseMoved(BPoint where, uint32 transit, const BMessage* dragMessage);
-	virtual void MouseUp(BPoint where);
-	virtual void KeyDown(const char* bytes, int32 numBytes);
 	virtual void GetPreferredSize(float* _width, float* _height);
 	virtual void ResizeToPreferred();
 
 	virtual void SetBehavior(uint32 behavior);
 	uint32 Behavior() const;
 
+protected:
+	virtual void Choose();
+
 private:
 	BPictureButton(const BPictureButton&) = delete;
 	BPictureButton& operator=(const BPictureButton&) = delete;
 
-	void _Activate();
-
 	uint32 fBehavior;
-	bool fPressed; // tracking, with the pointer inside
 };

@@ -96,10 +96,12 @@ _BMCMenuBar_::Draw(BRect)
 	GetFont(&font);
 	font_height height;
 	font.GetHeight(&height);
-	float left, right;
-	GetItemMargins(&left, NULL, &right, NULL);
+	float left;
+	GetItemMargins(&left, NULL, NULL, NULL);
+	// A long label may come as close to the mark as a pixel.
 	BString label(item->Label());
-	font.TruncateString(&label, B_TRUNCATE_END, Bounds().Width() - left - right + 2);
+	font.TruncateString(
+		&label, B_TRUNCATE_END, Bounds().Width() - left - Look::kPopUpMarkWidth - 1);
 	const float text = std::ceil(height.ascent) + std::ceil(height.descent);
 	const float baseline =
 		std::floor((Bounds().Height() + 1 - text) / 2) + std::ceil(height.ascent);
