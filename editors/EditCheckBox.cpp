@@ -2,15 +2,11 @@
 
 #include <CheckBox.h>
 
-#include "editors/PanelRows.h"
-
 
 EditCheckBox::EditCheckBox() :
 	EditorInterface("EditCheckBox", "Properties from BCheckBox", kSentencePanelHeight)
 {
-	BRect row = RowArea();
-	row.bottom = row.top + kRowHeight;
-	AddSentence(this, row, "The BCheckBox adds no extra settings.");
+	AddOnlySentence("The BCheckBox adds no extra settings.");
 }
 
 

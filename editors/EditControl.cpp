@@ -72,7 +72,8 @@ EditControl::ApplyEdit(BMessage* message)
 			_ShowValue();
 			break;
 		case kMessageChanged:
-			_ApplyMessageCode();
+			TakeMessageCode(fMessageControl, _Target()->Message(),
+				[&](BMessage* made) { _Target()->SetMessage(made); });
 			break;
 		default:
 			return false;
@@ -86,16 +87,6 @@ BControl*
 EditControl::_Target() const
 {
 	return static_cast<BControl*>(target);
-}
-
-
-// Only the code changes: the message keeps its fields.
-void
-EditControl::_ApplyMessageCode()
-{
-	if (_Target()->Message() == NULL)
-		_Target()->SetMessage(new BMessage(kNewMessage));
-	_Target()->Message()->what = TakeCode(fMessageControl);
 }
 
 

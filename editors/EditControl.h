@@ -20,7 +20,6 @@ protected:
 
 private:
 	BControl* _Target() const; // of the class that UseView() has tested
-	void _ApplyMessageCode();
 	void _ShowValue();
 
 	BTextControl* fMessageControl;

@@ -29,6 +29,7 @@ constexpr uint32 kAddAfterPressed = 'aftr';
 constexpr uint32 kDeletePressed = 'dlte';
 constexpr uint32 kAddSubmenuPressed = 'asub';
 
+constexpr uint32 kNoMessage = 0x3f3f3f3f; // shown as four question marks
 constexpr uint32 kNewItemMessage = 'menu';
 constexpr uint32 kSubItemMessage = 'xxxx';
 
@@ -257,7 +258,7 @@ EditMenuBar::_EntrySelected(const BMessage* message)
 	labelControl->TextView()->SelectAll();
 	labelControl->MakeFocus(true);
 	enabledCheckBox->SetValue(item->IsEnabled() ? B_CONTROL_ON : B_CONTROL_OFF);
-	ShowCode(messageControl, item->Message() != NULL ? item->Message()->what : kNewMessage);
+	ShowCode(messageControl, item->Message() != NULL ? item->Message()->what : kNoMessage);
 	SetSelectKind(item->Submenu());
 	_EnableButtons(true);
 }

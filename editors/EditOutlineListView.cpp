@@ -2,15 +2,11 @@
 
 #include <OutlineListView.h>
 
-#include "editors/PanelRows.h"
-
 
 EditOutlineListView::EditOutlineListView() :
 	EditorInterface("EditOutlineListView", "Properties from BOutlineListView", kSentencePanelHeight)
 {
-	BRect row = RowArea();
-	row.bottom = row.top + kRowHeight;
-	AddSentence(this, row, "The BOutlineListView adds no extra settings.");
+	AddOnlySentence("The BOutlineListView adds no extra settings.");
 }
 
 

@@ -2,15 +2,11 @@
 
 #include <RadioButton.h>
 
-#include "editors/PanelRows.h"
-
 
 EditRadioButton::EditRadioButton() :
 	EditorInterface("EditRadioButton", "Properties from BRadioButton", kSentencePanelHeight)
 {
-	BRect row = RowArea();
-	row.bottom = row.top + kRowHeight;
-	AddSentence(this, row, "The BRadioButton adds no extra settings.");
+	AddOnlySentence("The BRadioButton adds no extra settings.");
 }
 
 

@@ -101,7 +101,7 @@ EditSlider::ApplyEdit(BMessage* message)
 		case kLiveColorChanged:
 		case kColorComponentTyped:
 		case kDefaultColorPressed:
-			_ApplyBarColor(message->what);
+			ApplyBarColor(fBarColor, message->what, kDefaultColor, _Target());
 			break;
 		case kMinLabelChanged:
 		case kMaxLabelChanged:
@@ -184,16 +184,6 @@ EditSlider::_ApplyMarks(uint32 code)
 	}
 	target->Invalidate();
 	return true;
-}
-
-
-void
-EditSlider::_ApplyBarColor(uint32 code)
-{
-	if (!TakeBarColor(fBarColor, code, kDefaultColor, _Target()->BarColor()))
-		return;
-	_Target()->SetBarColor(fBarColor.control->ValueAsColor());
-	target->Invalidate();
 }
 
 

@@ -32,7 +32,6 @@ private:
 	void _AddMenuRow(BRect row);
 	void _AddMarksRow(BRect row);
 	bool _ApplyMarks(uint32 code);
-	void _ApplyBarColor(uint32 code);
 	void _ApplyLimitLabels();
 	void _ApplyLimits();
 	void _Rebuild(const std::function<void(BMessage& archive)>& change);

@@ -100,7 +100,7 @@ EditStatusBar::ApplyEdit(BMessage* message)
 		case kLiveColorChanged:
 		case kColorComponentTyped:
 		case kDefaultColorPressed:
-			_ApplyBarColor(message->what);
+			ApplyBarColor(fBarColor, message->what, kDefaultColor, _Target());
 			break;
 		default:
 			return false;
@@ -185,15 +185,5 @@ void
 EditStatusBar::_ApplyBarHeight()
 {
 	_Target()->SetBarHeight(fBarHeightControl->FloatValue());
-	target->Invalidate();
-}
-
-
-void
-EditStatusBar::_ApplyBarColor(uint32 code)
-{
-	if (!TakeBarColor(fBarColor, code, kDefaultColor, _Target()->BarColor()))
-		return;
-	_Target()->SetBarColor(fBarColor.control->ValueAsColor());
 	target->Invalidate();
 }

@@ -29,7 +29,6 @@ private:
 	void _ApplyValue();
 	void _ApplyMax();
 	void _ApplyBarHeight();
-	void _ApplyBarColor(uint32 code);
 
 	BTextControl* fLabelControl;
 	BTextControl* fTrailingLabelControl;

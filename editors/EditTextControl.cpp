@@ -80,7 +80,8 @@ EditTextControl::ApplyEdit(BMessage* message)
 			fDividerControl->ShowFloatValue(_Target()->Divider()); // which is a whole number
 			break;
 		case kMessageChanged:
-			_ApplyMessageCode();
+			TakeMessageCode(fMessageControl, _Target()->ModificationMessage(),
+				[&](BMessage* made) { _Target()->SetModificationMessage(made); });
 			break;
 		default:
 			return false;
@@ -94,14 +95,4 @@ BTextControl*
 EditTextControl::_Target() const
 {
 	return static_cast<BTextControl*>(target);
-}
-
-
-// Only the code changes: the message keeps its fields.
-void
-EditTextControl::_ApplyMessageCode()
-{
-	if (_Target()->ModificationMessage() == NULL)
-		_Target()->SetModificationMessage(new BMessage(kNewMessage));
-	_Target()->ModificationMessage()->what = TakeCode(fMessageControl);
 }

@@ -20,7 +20,6 @@ protected:
 
 private:
 	BTextControl* _Target() const; // of the class that UseView() has tested
-	void _ApplyMessageCode();
 
 	BMenu* fLabelAlignMenu;
 	BMenu* fTextAlignMenu;

@@ -7,6 +7,7 @@
 #include "archive/TypedText.h"
 #include "archive/ViewTree.h"
 #include "editors/LiveColorControl.h"
+#include "editors/PanelRows.h"
 #include "editors/TargetLock.h"
 
 namespace {
@@ -100,6 +101,14 @@ BRect
 EditorInterface::RowArea() const
 {
 	return Bounds().InsetByCopy(kRowInsetX, kRowInsetY);
+}
+
+
+void
+EditorInterface::AddOnlySentence(const char* text)
+{
+	const BRect area = RowArea();
+	AddSentence(this, FrameAt(area.left, area.top, area.Width(), kRowHeight), text);
 }
 
 

@@ -41,6 +41,9 @@ protected:
 	// The place of the rows: margins at the left and right, the top of the first row.
 	BRect RowArea() const;
 
+	// The one row of a panel whose class adds nothing.
+	void AddOnlySentence(const char* text);
+
 	// The two halves of a row that has a text at the left and a menu at the right.
 	BRect TextBesideMenuFrame() const;
 	BRect MenuBesideTextFrame() const;

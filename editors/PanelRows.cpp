@@ -280,16 +280,17 @@ ShowBarColor(const BarColorGroup& group, rgb_color color)
 
 
 bool
-TakeBarColor(const BarColorGroup& group, uint32 code, rgb_color defaultColor, rgb_color present)
+TakeBarColor(const BarColorGroup& group, uint32 code, rgb_color defaultColor, rgb_color* color)
 {
 	if (code == kDefaultColorPressed)
 		group.control->SetValue(defaultColor);
 	else if (code == kColorComponentTyped)
 		group.control->SetValueFromComponents();
 
-	const rgb_color color = group.control->ValueAsColor();
-	ShowSwatch(group.swatch, color);
-	return !SameRGB(color, present);
+	const rgb_color present = *color;
+	*color = group.control->ValueAsColor();
+	ShowSwatch(group.swatch, *color);
+	return !SameRGB(*color, present);
 }
 
 

@@ -4,6 +4,7 @@
 #include <initializer_list>
 
 #include <Box.h>
+#include <Message.h>
 #include <Rect.h>
 #include <SupportDefs.h>
 #include <View.h>
@@ -12,7 +13,6 @@ class BButton;
 class BCheckBox;
 class BMenu;
 class BMenuField;
-class BMessage;
 class BRadioButton;
 class BTextControl;
 class FloatControl;
@@ -61,14 +61,24 @@ int32 NumberFromText(const char* text);
 // A number without its fraction, or the type's limit where it is beyond that.
 int32 WholeNumber(float number);
 
-// The code of a message that is made because a code was typed: four question marks.
-constexpr uint32 kNewMessage = 0x3f3f3f3f;
-
 // Four-character codes as text, the most significant byte first. What is typed is shown as the code
 // that it was taken for.
 uint32 TakeCode(BTextControl* control);
 void ShowCode(BTextControl* control, uint32 code);
 void ShowMessageCode(BTextControl* control, const BMessage* message); // "----" for NULL
+
+// Gives the message the code that was typed, and leaves its fields alone. Without a message, hands a
+// new one over.
+template<class Give>
+void
+TakeMessageCode(BTextControl* control, BMessage* message, const Give& give)
+{
+	const uint32 code = TakeCode(control);
+	if (message != NULL)
+		message->what = code;
+	else
+		give(new BMessage(code));
+}
 
 bool SameRGB(rgb_color a, rgb_color b);
 
@@ -83,9 +93,20 @@ struct BarColorGroup {
 BarColorGroup AddBarColorGroup(BView* panel, BRect frame, BPoint origin);
 // Loads both parts. The control's message comes to nothing while the panel is not shown.
 void ShowBarColor(const BarColorGroup& group, rgb_color color);
-// Carries out one of the codes. Returns whether the control's colour is now another than the bar's:
-// loading the control reports the present colour too, which is not set again.
+// Carries out one of the codes. Gives the control's colour in place of the present one, and returns
+// whether it is another: loading the control reports the present colour too.
 bool TakeBarColor(
-	const BarColorGroup& group, uint32 code, rgb_color defaultColor, rgb_color present);
+	const BarColorGroup& group, uint32 code, rgb_color defaultColor, rgb_color* color);
+// The same for the view that has the bar.
+template<class View>
+void
+ApplyBarColor(const BarColorGroup& group, uint32 code, rgb_color defaultColor, View* bar)
+{
+	rgb_color color = bar->BarColor();
+	if (!TakeBarColor(group, code, defaultColor, &color))
+		return;
+	bar->SetBarColor(color);
+	bar->Invalidate();
+}
 void ShowSwatch(BBox* swatch, rgb_color color);
 BBox* AddSwatch(BView* panel, BRect frame);
