@@ -1,7 +1,7 @@
 // Every kind of view of the palette: dragged in, changed in every property by mouse and keys, closed,
 // saved and opened again.
 
-#include "EditorFixture.h"
+#include "CatalogueFixture.h"
 
 #include <algorithm>
 #include <map>
@@ -10,20 +10,14 @@
 #include <Box.h>
 #include <Button.h>
 #include <CheckBox.h>
-#include <File.h>
 #include <MenuField.h>
 #include <MenuItem.h>
 #include <OutlineListView.h>
 #include <RadioButton.h>
-#include <Resources.h>
-#include <ScrollView.h>
 
-#include "archive/ViewArchive.h"
 #include "editors/FloatControl.h"
 #include "editors/IntControl.h"
 #include "editors/LiveColorControl.h"
-#include "palette/WidgetWindow.h"
-#include "scenarios/ScratchFolder.h"
 
 namespace {
 
@@ -64,28 +58,12 @@ constexpr const char* kComponents[] = { "Red:", "Green:", "Blue:" };
 typedef std::map<std::string, std::string> State;
 
 
-class CatalogueTest : public EditorFixture, public testing::WithParamInterface<const char*> {
+class CatalogueTest : public CatalogueFixture, public testing::WithParamInterface<const char*> {
 protected:
-	CatalogueTest() : EditorFixture(BRect(10, 10, 1509, 909))
-	{
-		item = Add(
-			1, new BView(BRect(0, 0, 699, 699), "root", B_FOLLOW_LEFT | B_FOLLOW_TOP, B_WILL_DRAW));
-		Open(item);
-	}
-
-	void DragIn()
-	{
-		BOutlineListView* list = dynamic_cast<BOutlineListView*>(
-			dynamic_cast<BScrollView*>(widgetWindow->ChildAt(0))->Target());
-		const BPoint entry = person.PlaceOfEntry(list, GetParam());
-		driver.Drag(entry, Driver::PointIn(Root(), BPoint(150, 150)));
-		ASSERT_EQ(1, Root()->CountChildren());
-	}
-
 	// The view, and in a menu bar its first item.
 	void SelectSample()
 	{
-		Select(Root()->ChildAt(0));
+		Select(Sample());
 		if (BView* panel = Panel("EditMenuBar"))
 			driver.Click(ControlUser::All<BOutlineListView>(panel)[0], BPoint(100, 6));
 	}
@@ -191,27 +169,6 @@ protected:
 			}
 		}
 	}
-
-	// Through a file.
-	BResEditor::BResourceHandle Saved()
-	{
-		const ScratchFolder folder;
-		const std::string path = folder.Path("design.rsrc");
-		const std::string bytes = Bytes(item);
-		{
-			BFile file(path.c_str(), B_READ_WRITE | B_CREATE_FILE);
-			BResources resources(&file, true);
-			EXPECT_EQ(B_OK, resources.AddResource('ARCV', 1, bytes.data(), bytes.size(), "design"));
-		}
-		BFile file(path.c_str(), B_READ_ONLY);
-		BResources resources(&file);
-		size_t size = 0;
-		const char* data =
-			static_cast<const char*>(resources.LoadResource('ARCV', int32(1), &size));
-		return Add(2, std::vector<char>(data, data + size));
-	}
-
-	BResEditor::BResourceHandle item;
 };
 
 
@@ -220,7 +177,7 @@ protected:
 
 TEST_P(CatalogueTest, EveryChangeIsSavedAndShownAgain)
 {
-	DragIn();
+	DragIn(GetParam());
 	SelectSample();
 	const State before = Shown();
 	ChangeEverything();
