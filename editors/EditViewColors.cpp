@@ -23,7 +23,6 @@ constexpr uint32 kLowChosen = 'low ';
 
 constexpr float kSectionHeight = 100;
 constexpr float kInset = 6;
-constexpr float kControlTop = 9; // right below the label, for the buttons come close
 constexpr float kFirstRow = 10;
 constexpr float kSwatchHeight = 24;
 constexpr float kSwatchStep = 29;
@@ -82,7 +81,7 @@ EditView::_AddColorSection(BRect area)
 	AddChild(section);
 
 	fColorControl = new LiveColorControl(
-		BPoint(kInset, kControlTop), B_CELLS_32x8, 1, "", new BMessage(kLiveColorChanged), true);
+		BPoint(kInset, kFirstRow), B_CELLS_32x8, 1, "", new BMessage(kLiveColorChanged), true);
 	section->AddChild(fColorControl);
 
 	const float radioLeft = section->Bounds().right - kInset - kRadioWidth;

@@ -14,7 +14,7 @@ constexpr int kMeshBits[] = { 5, 7, 10, 30 };
 constexpr int kGrids = sizeof(kMeshBits) / sizeof(kMeshBits[0]);
 constexpr int kGridShift = 62;
 constexpr int kRowShift = 31;
-constexpr int64 kCostOfACell = 8; // in children
+constexpr int64 kCostOfACell = 2; // in children
 constexpr int64 kMiddle = 1 << 30; // makes column and row numbers positive
 
 // Frames round to whole pixels outwards, and sums of fractions to the nearest number.

@@ -98,10 +98,10 @@ _BMCMenuBar_::Draw(BRect)
 	font.GetHeight(&height);
 	float left;
 	GetItemMargins(&left, NULL, NULL, NULL);
-	// A long label may come as close to the mark as a pixel.
+	// A long label comes as close as a pixel to the arrow, which does not fill its place.
 	BString label(item->Label());
 	font.TruncateString(
-		&label, B_TRUNCATE_END, Bounds().Width() - left - Look::kPopUpMarkWidth - 1);
+		&label, B_TRUNCATE_END, Bounds().Width() - left - Look::kPopUpMarkWidth + 1);
 	const float text = std::ceil(height.ascent) + std::ceil(height.descent);
 	const float baseline =
 		std::floor((Bounds().Height() + 1 - text) / 2) + std::ceil(height.ascent);
