@@ -35,7 +35,7 @@ EditButton::UseView(BView* view)
 	if (!TakeTarget(dynamic_cast<BButton*>(view)))
 		return false;
 
-	fDefaultBox->SetValue(_Target()->IsDefault() ? B_CONTROL_ON : B_CONTROL_OFF);
+	SetOn(fDefaultBox, _Target()->IsDefault());
 	return true;
 }
 

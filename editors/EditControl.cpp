@@ -52,7 +52,7 @@ EditControl::UseView(BView* view)
 	ShowMessageCode(fMessageControl, _Target()->Message());
 	fLabelControl->SetText(_Target()->Label());
 	_ShowValue();
-	fEnabledBox->SetValue(_Target()->IsEnabled() ? B_CONTROL_ON : B_CONTROL_OFF);
+	SetOn(fEnabledBox, _Target()->IsEnabled());
 	return true;
 }
 

@@ -46,7 +46,7 @@ EditListView::UseView(BView* view)
 		return false;
 
 	const bool isMultiple = _Target()->ListType() != B_SINGLE_SELECTION_LIST;
-	multipleSelectionCheckBox->SetValue(isMultiple ? B_CONTROL_ON : B_CONTROL_OFF);
+	SetOn(multipleSelectionCheckBox, isMultiple);
 	ShowMessageCode(selectMessageControl, _Target()->SelectionMessage());
 	ShowMessageCode(invokeMessageControl, _Target()->InvocationMessage());
 	return true;

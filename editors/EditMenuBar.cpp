@@ -257,7 +257,7 @@ EditMenuBar::_EntrySelected(const BMessage* message)
 	labelControl->SetText(item->Label());
 	labelControl->TextView()->SelectAll();
 	labelControl->MakeFocus(true);
-	enabledCheckBox->SetValue(item->IsEnabled() ? B_CONTROL_ON : B_CONTROL_OFF);
+	SetOn(enabledCheckBox, item->IsEnabled());
 	ShowCode(messageControl, item->Message() != NULL ? item->Message()->what : kNoMessage);
 	SetSelectKind(item->Submenu());
 	_EnableButtons(true);

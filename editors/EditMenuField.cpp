@@ -53,7 +53,7 @@ EditMenuField::UseView(BView* view)
 
 	labelControl->SetText(_Target()->Label());
 	MarkChoice(alignmentMenu, _Target()->Alignment());
-	enabledCheckBox->SetValue(_Target()->IsEnabled() ? B_CONTROL_ON : B_CONTROL_OFF);
+	SetOn(enabledCheckBox, _Target()->IsEnabled());
 	dividerControl->SetFloatValue(_Target()->Divider());
 	return true;
 }

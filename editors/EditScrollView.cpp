@@ -205,7 +205,7 @@ void
 EditScrollView::_LoadBar(Bar& bar)
 {
 	const bool exists = _Target()->ScrollBar(bar.direction) != nullptr;
-	bar.use->SetValue(exists ? B_CONTROL_ON : B_CONTROL_OFF);
+	SetOn(bar.use, exists);
 	bar.total->SetEnabled(exists);
 	bar.smallStep->SetEnabled(exists);
 	bar.bigStep->SetEnabled(exists);

@@ -36,13 +36,6 @@ constexpr float kHintStep = 15;
 constexpr float kTextInset = 2;
 
 
-int32
-AsValue(bool on)
-{
-	return on ? B_CONTROL_ON : B_CONTROL_OFF;
-}
-
-
 } // namespace
 
 
@@ -91,13 +84,13 @@ EditTextView::UseView(BView* view)
 	MarkChoice(colorSpaceMenu, text->ColorSpace());
 	MarkChoice(alignmentMenu, text->Alignment());
 	tabWidthControl->SetFloatValue(text->TabWidth());
-	selectableCheckBox->SetValue(AsValue(text->IsSelectable()));
-	autoIndentCheckBox->SetValue(AsValue(text->DoesAutoindent()));
+	SetOn(selectableCheckBox, text->IsSelectable());
+	SetOn(autoIndentCheckBox, text->DoesAutoindent());
 	maxBytesControl->SetValue(text->MaxBytes());
-	editableCheckBox->SetValue(AsValue(text->IsEditable()));
-	stylableCheckBox->SetValue(AsValue(text->IsStylable()));
-	wordWrapCheckBox->SetValue(AsValue(text->DoesWordWrap()));
-	resizableCheckBox->SetValue(AsValue(text->IsResizable()));
+	SetOn(editableCheckBox, text->IsEditable());
+	SetOn(stylableCheckBox, text->IsStylable());
+	SetOn(wordWrapCheckBox, text->DoesWordWrap());
+	SetOn(resizableCheckBox, text->IsResizable());
 	return true;
 }
 
@@ -225,5 +218,5 @@ EditTextView::_ApplyResizable()
 	const bool isOn = IsOn(resizableCheckBox);
 	_Target()->MakeResizable(isOn, NULL);
 	if (isOn)
-		wordWrapCheckBox->SetValue(B_CONTROL_OFF);
+		SetOn(wordWrapCheckBox, false);
 }

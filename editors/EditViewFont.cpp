@@ -80,8 +80,7 @@ EditView::_AddFontRows(BRect area)
 	fFontMenu = MakeFontMenu();
 	AddMenuField(this, FrameAt(area.left, area.top, 200, kFieldHeight), "Font:", fFontMenu, 40,
 		kFollowLeftTop);
-	fStyleMenu = new BMenu("", B_ITEMS_IN_COLUMN);
-	fStyleMenu->SetLabelFromMarked(true);
+	fStyleMenu = MakeChoiceMenu({}, kStyleChosen);
 	AddMenuField(this, BRect(area.left + 220, area.top, area.right, area.top + kFieldHeight),
 		"Font style:", fStyleMenu, 60, kFollowLeftTop);
 

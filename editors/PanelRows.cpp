@@ -190,6 +190,13 @@ IsOn(const BCheckBox* box)
 }
 
 
+void
+SetOn(BCheckBox* box, bool on)
+{
+	box->SetValue(on ? B_CONTROL_ON : B_CONTROL_OFF);
+}
+
+
 int32
 NumberFromText(const char* text)
 {

@@ -52,8 +52,9 @@ BMenu* MakeBorderMenu(uint32 code);
 void MarkChoice(BMenu* menu, int32 index); // nothing is marked for an index that no item has
 int32 Choice(const BMenu* menu); // -1 when nothing is marked
 
-// A check box's value as a switch.
+// A check box's value as a switch. Setting it sends nothing.
 bool IsOn(const BCheckBox* box);
+void SetOn(BCheckBox* box, bool on);
 
 // What the text begins with; a number beyond the type counts as the type's own limit.
 int32 NumberFromText(const char* text);

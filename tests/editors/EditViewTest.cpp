@@ -224,6 +224,17 @@ TEST_F(EditViewTest, PreferredKeepsTheCentre)
 }
 
 
+// Half of the growth goes to each of the two edges.
+TEST_F(EditViewTest, PreferredMovesAViewThatFollowsBothEdgesByHalf)
+{
+	BView* view = Use(new BButton(BRect(100, 150, 250, 190), "b", "x", NULL, B_FOLLOW_ALL_SIDES));
+	window.driver.Click(Find<BButton>("preferred"));
+	EXPECT_NE(150, view->Bounds().Width());
+	EXPECT_NEAR(175, (view->Frame().left + view->Frame().right) / 2, 1);
+	EXPECT_NEAR(170, (view->Frame().top + view->Frame().bottom) / 2, 1);
+}
+
+
 TEST_F(EditViewTest, ZoomFillsWhatTheParentCanScrollTo)
 {
 	BView* target = new BView(BRect(0, 0, 99, 99), "target", B_FOLLOW_ALL_SIDES, B_WILL_DRAW);

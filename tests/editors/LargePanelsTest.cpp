@@ -89,6 +89,8 @@ TEST_F(EditSliderTest, UsesTheDefaultColor)
 	BSlider* slider = Use(new BSlider(kFrame, "s", "Toast:", NULL, 0, 99));
 	Press("Use Default");
 	EXPECT_TRUE(IsColor(slider->BarColor(), 80, 80, 80));
+	EXPECT_TRUE(IsColor(Swatch(), 80, 80, 80));
+	EXPECT_EQ("80", Shown("Green:"));
 }
 
 
@@ -220,6 +222,8 @@ TEST_F(EditStatusBarTest, ChangesHeightAndColor)
 	EXPECT_EQ(20, bar->BarHeight());
 	Press("Use Default");
 	EXPECT_TRUE(IsColor(bar->BarColor(), 50, 150, 255));
+	EXPECT_TRUE(IsColor(Swatch(), 50, 150, 255));
+	EXPECT_EQ("150", Shown("Green:"));
 }
 
 
@@ -340,6 +344,7 @@ TEST_F(EditScrollViewTest, TogglingABarKeepsTheOther)
 	window.Locked([&] {
 		scroll->ScrollBar(B_HORIZONTAL)->SetRange(0, 70);
 		scroll->ScrollBar(B_HORIZONTAL)->SetSteps(4, 40);
+		scroll->ScrollBar(B_HORIZONTAL)->SetValue(25);
 	});
 	Tick("Vertical");
 	ASSERT_EQ(1, ground->CountChildren());
@@ -352,6 +357,7 @@ TEST_F(EditScrollViewTest, TogglingABarKeepsTheOther)
 	rebuilt->ScrollBar(B_HORIZONTAL)->GetRange(&minimum, &maximum);
 	rebuilt->ScrollBar(B_HORIZONTAL)->GetSteps(&small, &big);
 	EXPECT_EQ(70, maximum);
+	EXPECT_EQ(25, rebuilt->ScrollBar(B_HORIZONTAL)->Value());
 	EXPECT_EQ(4, small);
 	EXPECT_EQ(40, big);
 

@@ -140,7 +140,7 @@ constexpr const char* kPanels[] = {
 	"B_OP_ALPHA\n"
 	"field \"Pen size: \" psiz 246,194,346 1212 50\n"
 	"box \"View (background), High, and Low Color\" 6,224,394 1234\n"
-	"\tcolors colr 6,9,279 1212\n"
+	"\tcolors colr 6,10,279 1212\n"
 	"\tbox \"\" 285,10,322 0204\n"
 	"\tbox \"\" 285,39,322 0204\n"
 	"\tbox \"\" 285,68,322 0204\n"
