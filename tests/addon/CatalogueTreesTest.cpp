@@ -220,8 +220,10 @@ TEST_F(CatalogueTrees, TheOrderOfTabs)
 TEST_F(CatalogueTrees, ColorsThatWereDraggedAndHandedDown)
 {
 	DragIn("BBox");
-	const BRect box = Sample()->Frame();
-	DragTo("BTextView", box.LeftTop() + BPoint(20, 20));
+	Select(Sample());
+	person.TypeOver(Field("EditView", "R:"), "600");
+	person.TypeOver(Field("EditView", "B:"), "500");
+	DragTo("BTextView", Sample()->Frame().LeftTop() + BPoint(20, 20));
 	ASSERT_EQ(1, Sample()->CountChildren());
 	Select(Sample());
 	int ramp = 1;

@@ -39,15 +39,16 @@ DesignOf(int32 count, bool inGroups)
 }
 
 
-// What is painted and asked does not depend on when the display shows it; how often it shows
-// something, and how much of it twice, does.
+// What is painted does not depend on when the display shows it; how often it shows something, and
+// how much of it twice, does. Among many views fewer are asked for a point than among a few, and
+// children are looked at one by one up to some dozens.
 struct Counts {
-	int64 drawn, clippings, hitTested;
+	int64 drawn, clippings, hitTested, visited;
 	int64 flushes, pixels;
 
 	bool operator==(const Counts& other) const
 	{
-		return drawn == other.drawn && clippings == other.clippings && hitTested == other.hitTested;
+		return drawn == other.drawn && clippings == other.clippings;
 	}
 };
 
@@ -56,8 +57,8 @@ std::ostream&
 operator<<(std::ostream& stream, const Counts& counts)
 {
 	return stream << counts.drawn << " drawn, " << counts.clippings << " clippings, "
-				  << counts.hitTested << " hit-tested, " << counts.flushes << " flushes, "
-				  << counts.pixels << " pixels";
+				  << counts.hitTested << " hit-tested, " << counts.visited << " visited, "
+				  << counts.flushes << " flushes, " << counts.pixels << " pixels";
 }
 
 
@@ -79,7 +80,7 @@ CountsOf(int32 views, bool inGroups)
 	PaintCounter counter(scene.Window());
 	const auto note = [&] {
 		counts.push_back({ counter.Drawn(), counter.Clippings(), counter.HitTested(),
-			counter.Flushes(), counter.FlushedPixels() });
+			counter.Visited(), counter.Flushes(), counter.FlushedPixels() });
 		counter.Reset();
 	};
 	input.Press();
@@ -107,12 +108,18 @@ class LargeDesign : public testing::TestWithParam<bool> {};
 TEST_P(LargeDesign, TakesNoMoreForOneViewThanASmallOne)
 {
 	constexpr int64 kMostFlushes = 10;
+	constexpr int64 kSomeDozens = 160; // of children that are looked at one by one
+	constexpr size_t kDragStart = 2;
 	const std::vector<Counts> small = CountsOf(100, GetParam());
 	ASSERT_EQ(3u, small.size());
 	for (const int32 views : { 1000, 10000 }) {
 		const std::vector<Counts> large = CountsOf(views, GetParam());
 		EXPECT_EQ(small, large) << views;
 		for (size_t i = 0; i < small.size(); i++) {
+			EXPECT_LE(large[i].hitTested, small[i].hitTested);
+			// At the start of a drag the root is selected, and so all of it is clipped.
+			if (i < kDragStart)
+				EXPECT_LE(large[i].visited, small[i].visited + kSomeDozens);
 			EXPECT_LE(large[i].flushes, kMostFlushes);
 			EXPECT_LE(large[i].pixels, 2 * small[i].pixels + 10000);
 		}
