@@ -22,7 +22,7 @@ namespace fs = std::filesystem;
 
 // Not of the platform's own interface, or the base of something.
 const std::set<std::string> kApart = { "MessageForm.h", "ResourceForm.h", "MarkedControl.h",
-	"fs_attr.h" };
+	"PressControl.h", "fs_attr.h" };
 
 
 std::string
