@@ -368,26 +368,33 @@ private:
 		fNewToken[0] = 0;
 	}
 
-	// Whether an object was read that no view had as its child or tab.
+	// Whether an object was read that is not in the tree below the root.
 	bool _IsForeign(int32 token)
 	{
 		if (fIsPlaced.empty()) {
 			fIsPlaced.resize(fNewToken.size());
-			_NotePlaced(fOrigin->root);
-			BMessage object;
-			for (int32 i = 0; fOrigin->root.FindMessage(kObjects, i, &object) == B_OK; i++)
-				_NotePlaced(object);
+			std::vector<int32> found;
+			_NotePlaced(fOrigin->root, &found);
+			while (!found.empty()) {
+				const int32 next = found.back();
+				found.pop_back();
+				BMessage object;
+				if (fOrigin->root.FindMessage(kObjects, next - 1, &object) == B_OK)
+					_NotePlaced(object, &found);
+			}
 		}
 		return !fIsPlaced[size_t(token)];
 	}
 
-	void _NotePlaced(const BMessage& object)
+	void _NotePlaced(const BMessage& object, std::vector<int32>* _found)
 	{
 		for (const char* name : kObjectFields) {
 			int32 token;
 			for (int32 i = 0; object.FindInt32(name, i, &token) == B_OK; i++) {
-				if (token > 0 && token <= fOrigin->objectCount)
+				if (token > 0 && token <= fOrigin->objectCount && !fIsPlaced[size_t(token)]) {
 					fIsPlaced[size_t(token)] = true;
+					_found->push_back(token);
+				}
 			}
 		}
 	}
@@ -450,6 +457,21 @@ private:
 		return status;
 	}
 
+	// An object that is kept as it was read names others by numbers alone.
+	status_t _RenumberForeign(BMessage* object)
+	{
+		status_t status = B_OK;
+		for (const char* name : kObjectFields) {
+			if (status == B_OK)
+				status = _Renumber(object, name, true);
+		}
+		for (const char* name : kTokenFields) {
+			if (status == B_OK)
+				status = _Renumber(object, name, true);
+		}
+		return status;
+	}
+
 	// The managed form shows the view of the tab in front inside the tab view's container too.
 	status_t _RestoreFrontTab(const BMessage& tabView, const Children& children)
 	{
@@ -478,10 +500,8 @@ private:
 				object = fObjects[size_t(index)].message;
 			else {
 				status = fOrigin->root.FindMessage(kObjects, -index - 1, &object);
-				for (const char* name : kTokenFields) {
-					if (status == B_OK)
-						status = _Renumber(&object, name, true);
-				}
+				if (status == B_OK)
+					status = _RenumberForeign(&object);
 			}
 			if (status == B_OK)
 				status = list.AddMessage(kObjects, &object);

@@ -58,7 +58,8 @@ hash_name(const char* name, size_t length)
 		length -= 8;
 	}
 	uint64 word = 0;
-	memcpy(&word, name, length);
+	if (length > 0)
+		memcpy(&word, name, length);
 	hash = mix(hash ^ word, sSeed ^ 0xe7037ed1a0b428dbull);
 	return uint32(hash ^ hash >> 32);
 }

@@ -128,6 +128,30 @@ TEST(ManagedArchive, ARemovedViewGoesAndTheOthersAreRenumbered)
 }
 
 
+TEST(ManagedArchive, ObjectsOutsideTheTreeStayTogether)
+{
+	BMessage root = object("BView", { 1 });
+	BMessage objects[] = { object("BBox"), object("MyOwner", { 3 }), object("MyPart") };
+	for (const BMessage& child : objects)
+		root.AddMessage("_managed_archivable", &child);
+	root.AddBool("_managed_archive", true);
+	BMessage archive(root);
+	ASSERT_EQ(B_OK, unmanage_archive(&archive));
+	ASSERT_EQ(B_OK, archive.RemoveName("_views"));
+	ASSERT_EQ(B_OK, manage_archive(&archive));
+
+	// The box is gone; the owner is the first now, and its part the second.
+	BMessage owner;
+	ASSERT_EQ(B_OK, archive.FindMessage("_managed_archivable", 0, &owner));
+	EXPECT_STREQ("MyOwner", owner.FindString("class"));
+	EXPECT_EQ(2, owner.FindInt32("_views"));
+	BMessage part;
+	ASSERT_EQ(B_OK, archive.FindMessage("_managed_archivable", 1, &part));
+	EXPECT_STREQ("MyPart", part.FindString("class"));
+	EXPECT_FALSE(archive.HasMessage("_managed_archivable", 2));
+}
+
+
 TEST(ManagedArchive, NewAndCopiedAndMovedViewsFindTheirNumbers)
 {
 	BMessage archive = managed_tree();
