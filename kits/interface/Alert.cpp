@@ -17,6 +17,7 @@
 #include "interface/private/AlertView.h"
 #include "interface/private/ControlArchive.h"
 #include "interface/private/Look.h"
+#include "interface/private/MenuTracker.h"
 #include "interface/private/ViewArchive.h"
 #include "kernel/private/Activity.h"
 
@@ -317,6 +318,9 @@ BAlert::Go()
 	const BMessenger self(this);
 	fWait = wait;
 
+	// An open menu of the caller would wait for its lock, and the user for the menu.
+	if (caller != NULL && caller->LockingThread() == find_thread(NULL))
+		BPrivate::MenuTracker::EndMenusOf(caller);
 	MoveTo(AlertPosition(Frame().Width(), Frame().Height()));
 	Show();
 	while (!wait->WaitForEnd(caller != NULL ? kRedrawInterval : B_INFINITE_TIMEOUT)) {

@@ -148,7 +148,7 @@ BWindow::Quit()
 	}
 	const bool quitsApplication =
 		(Flags() & B_QUIT_ON_WINDOW_CLOSE) != 0 && be_app != nullptr && fInternals->shownOnce;
-	MenuTracker::WindowCloses(this);
+	MenuTracker::EndMenusOf(this);
 	while (fInternals->server != nullptr && !IsHidden())
 		Hide();
 	// Quit by another thread, the window still handles what waits in its queue, with its views.

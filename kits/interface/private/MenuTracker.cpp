@@ -136,7 +136,7 @@ MenuTracker::Start(const Request& request)
 
 
 void
-MenuTracker::WindowCloses(BWindow* window)
+MenuTracker::EndMenusOf(BWindow* window)
 {
 	for (const std::shared_ptr<MenuTracker>& tracker : living_trackers()) {
 		if (tracker->fOwner == window && tracker->fSharing == Sharing::kOwner)

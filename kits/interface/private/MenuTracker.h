@@ -48,8 +48,9 @@ public:
 	static BMenuItem* Track(const Request& request);
 	// Returns at once. The caller holds the lock of the window that owns the menus, if there is one.
 	static void Start(const Request& request);
-	// Ends what the window's menus are doing; it holds its lock, and is about to go.
-	static void WindowCloses(BWindow* window);
+	// Ends what the window's menus are doing, since the window is about to go or waits for something
+	// else. The caller holds its lock.
+	static void EndMenusOf(BWindow* window);
 
 	~MenuTracker();
 

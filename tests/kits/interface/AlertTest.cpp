@@ -2,6 +2,8 @@
 
 #include <Button.h>
 #include <Invoker.h>
+#include <MenuBar.h>
+#include <MenuItem.h>
 #include <Screen.h>
 #include <TextView.h>
 
@@ -230,6 +232,29 @@ TEST(Alert, TheAskingWindowGetsNothingElseMeanwhile)
 	Driver::WaitUntilIdle();
 	EXPECT_EQ(1, view->fAnswer);
 	EXPECT_TRUE(view->fLate);
+}
+
+
+TEST(Alert, AnOpenMenuOfTheAskingWindowCloses)
+{
+	ControlFixture fixture;
+	AskingView* view = fixture.Add(new AskingView);
+	BMenu* menu = new BMenu("Menu");
+	menu->AddItem(new BMenuItem("Item", new BMessage('item')));
+	BMenuBar* bar = new BMenuBar(BRect(0, 120, 99, 139), "bar");
+	bar->AddItem(menu);
+	fixture.Add(bar);
+	fixture.driver.Click(bar, BPoint(15, 8));
+	ASSERT_NE(nullptr, menu->Window());
+
+	BMessenger(view).SendMessage('ask!');
+	while (view->fAlert == nullptr)
+		std::this_thread::yield();
+	WaitUntilShown(view->fAlert);
+	EXPECT_EQ(nullptr, menu->Window());
+	fixture.driver.MoveTo(BPoint(20, 20));
+	fixture.driver.Click(view->fAlert.load()->ButtonAt(2));
+	EXPECT_EQ(2, view->fAnswer);
 }
 
 
