@@ -11,44 +11,18 @@
 #include <TextView.h>
 #include <Window.h>
 
+#include "interface/private/ColorControlParts.h"
 #include "interface/private/Label.h"
 #include "interface/private/Look.h"
 #include "interface/private/ViewArchive.h"
 
-namespace Look = BPrivate::Look;
-
-using BPrivate::label_width;
+using namespace BPrivate;
 
 namespace {
 
 constexpr uint32 kFieldInvoked = 'ccol';
-constexpr float kMinimumCellSize = 6;
-constexpr float kBevel = 2; // round the palette
-constexpr float kFieldGap = 6; // between the palette and the fields, a label and its text
-constexpr float kFieldHeight = 16; // three of them are as high as a palette of the smallest cells
-constexpr int32 kRampCount = 4; // grey, red, green, blue
-constexpr int32 kGreyRamp = 0;
-constexpr int32 kRepeatsBeforeFast = 4;
-constexpr int32 kFastStep = 5;
-
 constexpr const char* kFieldNames[] = { "_red", "_green", "_blue" };
 constexpr const char* kFieldLabels[] = { "Red:", "Green:", "Blue:" };
-
-// What an archive may say; anything else would leave no palette.
-color_control_layout
-CheckedLayout(int32 layout)
-{
-	switch (layout) {
-		case B_CELLS_8x32:
-		case B_CELLS_16x16:
-		case B_CELLS_32x8:
-		case B_CELLS_64x4:
-			return static_cast<color_control_layout>(layout);
-		default:
-			return B_CELLS_4x64;
-	}
-}
-
 
 color_control_layout
 ReadLayout(const BMessage* archive)
@@ -73,22 +47,6 @@ ValueOf(rgb_color color)
 {
 	return static_cast<int32>(static_cast<uint32>(color.red) << 24
 		| static_cast<uint32>(color.green) << 16 | static_cast<uint32>(color.blue) << 8);
-}
-
-
-int32
-ComponentOf(int32 value, int32 component)
-{
-	return static_cast<uint32>(value) >> (24 - 8 * component) & 0xff;
-}
-
-
-int32
-WithComponent(int32 value, int32 component, int32 amount)
-{
-	const int shift = 24 - 8 * component;
-	const uint32 word = static_cast<uint32>(value);
-	return static_cast<int32>((word & ~(0xffu << shift)) | static_cast<uint32>(amount) << shift);
 }
 
 } // namespace
@@ -326,250 +284,6 @@ BColorControl::_ChangeRamp(int32 ramp, int32 amount)
 	}
 	SetValue(value);
 	Invoke();
-}
-
-
-// #pragma mark - geometry
-
-
-int32
-BColorControl::_Rows() const
-{
-	return 256 / fLayout;
-}
-
-
-// Inside the bevel.
-BRect
-BColorControl::_PaletteFrame() const
-{
-	return BRect(kBevel, kBevel, kBevel + static_cast<int32>(fLayout) * fCellSize,
-		kBevel + _Rows() * fCellSize - 1);
-}
-
-
-BRect
-BColorControl::_RampFrame(int32 ramp) const
-{
-	const BRect palette = _PaletteFrame();
-	const float height = (palette.Height() + 1) / kRampCount;
-	return BRect(palette.left, std::floor(palette.top + ramp * height), palette.right,
-		std::floor(palette.top + (ramp + 1) * height) - 1);
-}
-
-
-int32
-BColorControl::_RampAt(BPoint where) const
-{
-	for (int32 ramp = 0; ramp < kRampCount; ramp++) {
-		if (_RampFrame(ramp).Contains(where))
-			return ramp;
-	}
-	return -1;
-}
-
-
-void
-BColorControl::SetCellSize(float size)
-{
-	fCellSize = std::max(size, kMinimumCellSize);
-	_PlaceFields();
-	ResizeToPreferred();
-	Invalidate();
-}
-
-
-float
-BColorControl::CellSize() const
-{
-	return fCellSize;
-}
-
-
-void
-BColorControl::SetLayout(color_control_layout layout)
-{
-	fLayout = CheckedLayout(layout);
-	_PlaceFields();
-	ResizeToPreferred();
-	Invalidate();
-}
-
-
-color_control_layout
-BColorControl::Layout() const
-{
-	return fLayout;
-}
-
-
-void
-BColorControl::GetPreferredSize(float* _width, float* _height)
-{
-	const BRect palette = _PaletteFrame();
-	if (_width != NULL)
-		*_width = palette.right + kBevel;
-	if (_height != NULL)
-		*_height = palette.bottom + kBevel;
-	if (const BTextControl* field = _Field(0); field != NULL && _width != NULL)
-		*_width += kFieldGap + field->Bounds().Width();
-	if (const BTextControl* field = _Field(2); field != NULL && _height != NULL)
-		*_height = std::max(*_height, field->Frame().bottom);
-}
-
-
-void
-BColorControl::ResizeToPreferred()
-{
-	BControl::ResizeToPreferred();
-}
-
-
-// #pragma mark - drawing
-
-
-void
-BColorControl::Draw(BRect updateRect)
-{
-	const rgb_color base = Look::BaseColor(this);
-	BRect frame = _PaletteFrame();
-	frame.InsetBy(-kBevel, -kBevel);
-	Look::DrawFieldFrame(this, frame, base, IsEnabled() ? Look::kNormal : Look::kDisabled);
-	for (int32 ramp = 0; ramp < kRampCount; ramp++) {
-		if (_RampFrame(ramp).Intersects(updateRect & Bounds()))
-			_DrawRamp(ramp, updateRect & Bounds());
-	}
-
-	if (IsFocus() && IsEnabled() && Window()->IsActive()) {
-		const rgb_color color = Look::NavigationColor();
-		Look::DrawRing(this, _RampFrame(fFocusedRamp), color, color);
-	}
-}
-
-
-// Only the columns that are asked for: the cells, and with them the ramp, may be of any size.
-void
-BColorControl::_DrawRamp(int32 ramp, BRect updateRect)
-{
-	const BRect frame = _RampFrame(ramp);
-	const BRect visible = frame & updateRect;
-	const rgb_color base = Look::BaseColor(this);
-	const float first = std::floor(visible.left);
-	const int32 columns = static_cast<int32>(visible.right - first) + 1;
-
-	BeginLineArray(columns);
-	for (int32 i = 0; i < columns; i++) {
-		const float x = first + i;
-		const float part = std::clamp((x - frame.left) / frame.Width(), 0.0f, 1.0f);
-		const uint8 amount = static_cast<uint8>(part * 255);
-		rgb_color color = { 0, 0, 0, 255 };
-		if (ramp == kGreyRamp || ramp == 1)
-			color.red = amount;
-		if (ramp == kGreyRamp || ramp == 2)
-			color.green = amount;
-		if (ramp == kGreyRamp || ramp == 3)
-			color.blue = amount;
-		if (!IsEnabled())
-			color = mix_color(color, base, 128);
-		AddLine(BPoint(x, visible.top), BPoint(x, visible.bottom), color);
-	}
-	EndLineArray();
-
-	const int32 amount = _RampValue(ramp);
-	if (amount < 0)
-		return;
-	const float x = std::floor(frame.left + amount * frame.Width() / 255 + 0.5f);
-	Look::DrawColorMarker(this, frame, x, IsEnabled() ? Look::kNormal : Look::kDisabled);
-}
-
-
-// #pragma mark - mouse and keys
-
-
-void
-BColorControl::MouseDown(BPoint where)
-{
-	const int32 ramp = _RampAt(where);
-	if (!IsEnabled() || ramp < 0) {
-		BControl::MouseDown(where);
-		return;
-	}
-
-	fTrackedRamp = ramp;
-	if (fFocusedRamp != ramp) {
-		fFocusedRamp = ramp;
-		Invalidate(_PaletteFrame());
-	}
-	SetTracking(true);
-	SetMouseEventMask(B_POINTER_EVENTS, B_LOCK_WINDOW_FOCUS | B_NO_POINTER_HISTORY);
-	_TrackTo(where);
-}
-
-
-void
-BColorControl::MouseMoved(BPoint where, uint32 transit, const BMessage* dragMessage)
-{
-	if (IsTracking())
-		_TrackTo(where);
-}
-
-
-void
-BColorControl::MouseUp(BPoint where)
-{
-	SetTracking(false);
-	fTrackedRamp = -1;
-}
-
-
-void
-BColorControl::_TrackTo(BPoint where)
-{
-	const BRect frame = _RampFrame(fTrackedRamp);
-	const float part = std::clamp((where.x - frame.left) / frame.Width(), 0.0f, 1.0f);
-	_ChangeRamp(fTrackedRamp, static_cast<int32>(part * 255));
-}
-
-
-void
-BColorControl::KeyDown(const char* bytes, int32 numBytes)
-{
-	if (!IsEnabled() || numBytes != 1) {
-		BControl::KeyDown(bytes, numBytes);
-		return;
-	}
-
-	int32 repeats = 0;
-	if (const BMessage* message = Window()->CurrentMessage()) {
-		if (message->FindInt32("be:key_repeat", &repeats) != B_OK)
-			repeats = 0;
-	}
-	const int32 step = repeats > kRepeatsBeforeFast ? kFastStep : 1;
-	// From a colour that is no grey, the grey ramp starts at its red.
-	int32 amount = _RampValue(fFocusedRamp);
-	if (amount < 0)
-		amount = ComponentOf(Value(), 0);
-
-	switch (bytes[0]) {
-		case B_UP_ARROW:
-		case B_DOWN_ARROW: {
-			const int32 direction = bytes[0] == B_UP_ARROW ? -1 : 1;
-			fFocusedRamp = std::clamp<int32>(fFocusedRamp + direction, 0, kRampCount - 1);
-			Invalidate(_PaletteFrame());
-			break;
-		}
-
-		case B_LEFT_ARROW:
-			_ChangeRamp(fFocusedRamp, amount - step);
-			break;
-		case B_RIGHT_ARROW:
-			_ChangeRamp(fFocusedRamp, amount + step);
-			break;
-		default:
-			// Not BControl's: Space and Enter have no other value to switch to.
-			BView::KeyDown(bytes, numBytes);
-			break;
-	}
 }
 
 
