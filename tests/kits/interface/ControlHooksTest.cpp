@@ -267,3 +267,33 @@ TEST(ControlHooks, ABMenuFieldHidesAndShowsItsMark)
 	fixture.Locked([&] { field->ShowPopUpMarker(); });
 	EXPECT_EQ(shown, dark());
 }
+
+
+TEST(ControlHooks, ABPictureButtonIsChosenByAClickAndAKey)
+{
+	class Noting : public BPictureButton {
+	public:
+		using BPictureButton::BPictureButton;
+		void Choose() override
+		{
+			chosen++;
+			if (!refuse)
+				BPictureButton::Choose();
+		}
+		int chosen = 0;
+		bool refuse = false;
+	};
+	ControlFixture fixture;
+	Noting* button = fixture.Add(new Noting(kFrame, "picture", new BMessage(kInvoked)));
+	fixture.driver.Click(button);
+	EXPECT_EQ(1, button->chosen) << "Choose()";
+	EXPECT_EQ(1, fixture.CountReceived(kInvoked));
+	fixture.Focus(button);
+	fixture.driver.Key("Space");
+	EXPECT_EQ(2, button->chosen);
+	EXPECT_EQ(2, fixture.CountReceived(kInvoked));
+	fixture.Locked([&] { button->refuse = true; });
+	fixture.driver.Click(button);
+	EXPECT_EQ(3, button->chosen);
+	EXPECT_EQ(2, fixture.CountReceived(kInvoked));
+}
