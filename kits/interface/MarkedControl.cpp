@@ -20,6 +20,15 @@ constexpr float kClosestLabelLeft = 16; // where the label would be cut otherwis
 constexpr float kHorizontalPadding = 22;
 constexpr float kVerticalPadding = 6;
 
+
+// In the middle of the mark.
+float
+LabelBaseline(const LabelMetrics& metrics)
+{
+	return BPrivate::centered_baseline(
+		metrics, kMarkPlace.y, kMarkPlace.y + Look::kCheckBoxSize - 1);
+}
+
 } // namespace
 
 
@@ -28,8 +37,9 @@ _BMarkedControl_::_BMarkedControl_(BRect frame, const char* name, const char* la
 	_BPressControl_(frame, name, label, message, resizingMode, flags)
 {
 	// Never less high than its mark and its label.
-	float height;
-	_BMarkedControl_::GetPreferredSize(NULL, &height);
+	const LabelMetrics metrics(this);
+	const float height =
+		std::max(kMarkPlace.y + Look::kCheckBoxSize, LabelBaseline(metrics) + metrics.descent);
 	if (Bounds().Height() < height)
 		ResizeTo(Bounds().Width(), height);
 }
@@ -59,8 +69,7 @@ _BMarkedControl_::Draw(BRect updateRect)
 	if (Label() == NULL)
 		return;
 
-	const float baseline = BPrivate::centered_baseline(
-		LabelMetrics(this), kMarkPlace.y, kMarkPlace.y + Look::kCheckBoxSize - 1);
+	const float baseline = LabelBaseline(LabelMetrics(this));
 	const float width = BPrivate::label_width(this, Label());
 	const float left = std::clamp(Bounds().right + 1 - width, kClosestLabelLeft, kLabelLeft);
 	BPrivate::draw_label(this, Label(), BPoint(left, baseline), IsEnabled());

@@ -1,5 +1,6 @@
 #include <CheckBox.h>
 
+#include <algorithm>
 #include <cmath>
 
 #include <Font.h>
@@ -40,6 +41,38 @@ TEST(CheckBox, PrefersRoomForBoxAndLabel)
 	box.GetPreferredSize(&preferredWidth, &preferredHeight);
 	EXPECT_EQ(22 + std::ceil(be_plain_font->StringWidth("Label")), preferredWidth);
 	EXPECT_EQ(std::ceil(height.ascent + height.descent + height.leading) + 6, preferredHeight);
+}
+
+
+TEST(CheckBox, IsAsHighAsItsMarkAtLeast)
+{
+	constexpr float kMarkBottom = 16;
+	BApplication app("application/x-vnd.Archway-test");
+	for (const float height : { -10.f, 12.f, kMarkBottom, 30.f }) {
+		BCheckBox box(BRect(7, 9, 107, 9 + height), "b", "Multiply", NULL);
+		EXPECT_EQ(BPoint(7, 9), box.Frame().LeftTop());
+		EXPECT_EQ(100, box.Bounds().Width());
+		EXPECT_EQ(std::max(height, kMarkBottom), box.Bounds().Height());
+	}
+}
+
+
+// A label that has no room at its usual place stands closer to the mark.
+TEST(CheckBox, ALongLabelMovesTowardsTheMark)
+{
+	ControlFixture fixture;
+	const float label = std::ceil(be_plain_font->StringWidth("Horizontal"));
+	BCheckBox* box = fixture.Add(new BCheckBox(
+		BRect(20, 20, 20 + 16 + label - 1, 39), "check", "Horizontal", new BMessage(kInvoked)));
+	const auto isInked = [&](float x) {
+		for (float y = 0; y <= box->Bounds().bottom; y++) {
+			if (fixture.driver.PixelAt(box, BPoint(x, y)).red < 100)
+				return true;
+		}
+		return false;
+	};
+	EXPECT_TRUE(isInked(17) || isInked(18));
+	EXPECT_TRUE(isInked(box->Bounds().right - 1) || isInked(box->Bounds().right - 2));
 }
 
 
