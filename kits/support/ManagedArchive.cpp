@@ -214,10 +214,12 @@ private:
 	// what looks like tokens in them must be some.
 	status_t _ConvertNested(BMessage* object, const char* name, int32 depth)
 	{
+		const int32 count = count_of(*object, name, B_MESSAGE_TYPE);
 		BMessage child;
-		for (int32 i = 0; object->FindMessage(name, i, &child) == B_OK; i++) {
-			if (note_of(child) != nullptr)
-				continue; // has been a token, and is done
+		for (int32 i = 0; i < count; i++) {
+			// What cannot be read names nothing; what has been a token is done.
+			if (object->FindMessage(name, i, &child) != B_OK || note_of(child) != nullptr)
+				continue;
 			status_t status = _ConvertFields(&child, depth + 1);
 			if (status == B_OK)
 				status = object->ReplaceMessage(name, i, &child);
