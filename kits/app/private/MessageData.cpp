@@ -762,7 +762,7 @@ MessageData::HasSameField(uint32 number, const MessageData& other) const
 	const MessageField& a = fFields[number];
 	const MessageField& b = other.fFields[number];
 	if (a.type != b.type || a.count != b.count || a.nameLength != b.nameLength
-		|| memcmp(NameBytes(a), other.NameBytes(b), a.nameLength) != 0)
+		|| (a.nameLength > 0 && memcmp(NameBytes(a), other.NameBytes(b), a.nameLength) != 0))
 		return false;
 	const bool inPlace = !a.Has(MessageField::kScattered) && !b.Has(MessageField::kScattered);
 	if (inPlace && Base(a) + a.data == other.Base(b) + b.data && a.size == b.size)
@@ -1073,7 +1073,7 @@ inline bool
 MessageData::_IsNamed(const MessageField& field, const char* name, size_t length, uint32 key) const
 {
 	return field.key == key && field.nameLength == length
-		&& memcmp(NameBytes(field), name, length) == 0;
+		&& (length == 0 || memcmp(NameBytes(field), name, length) == 0);
 }
 
 
