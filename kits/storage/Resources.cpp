@@ -78,6 +78,7 @@ struct BResources::State {
 	std::string path; // as far as it is known, to find a file that was replaced
 	bool readOnly = false;
 	bool changed = false;
+	bool failed = false; // at the last Sync(), and somebody was told
 
 	ResourceItem* Load(ResourceItem* item, int fd)
 	{
@@ -221,7 +222,7 @@ BResources::SetTo(const entry_ref* ref, bool clobber)
 void
 BResources::Unset()
 {
-	if (fState->changed && fFile.InitCheck() == B_OK)
+	if (fState->changed && !fState->failed && fFile.InitCheck() == B_OK)
 		Sync();
 	fFile.Unset();
 	fState = std::make_unique<State>();
@@ -311,7 +312,9 @@ BResources::Sync()
 		return B_NO_INIT;
 	if (fState->readOnly)
 		return B_NOT_ALLOWED;
-	return _Save();
+	const status_t status = _Save();
+	fState->failed = status != B_OK;
+	return status;
 }
 
 

@@ -12,8 +12,9 @@ struct entry_ref;
 
 // SetTo() reads the table, not the data: an item's bytes are read when they are first asked for.
 // Sync() and the destructor write everything back; the file is replaced as a whole, so it is at
-// every moment either what it was or what was last saved. The key of a resource is its type and id;
-// names need not be unique. Not thread-safe: one owner, one thread.
+// every moment either what it was or what was last saved. The destructor does not try again what
+// Sync() failed to do. The key of a resource is its type and id; names need not be unique. Not
+// thread-safe: one owner, one thread.
 class BResources {
 public:
 	BResources();

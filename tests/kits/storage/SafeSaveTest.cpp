@@ -1,5 +1,7 @@
 // Saves over files of other people and of other kinds: all or nothing, and told in time.
 #include <grp.h>
+#include <signal.h>
+#include <sys/resource.h>
 #include <sys/stat.h>
 #include <sys/types.h>
 #include <sys/wait.h>
@@ -172,6 +174,36 @@ TEST(SafeSave, AProgramKeepsItsOwnPart)
 	BFile cut((folder / "cut").c_str(), B_READ_WRITE);
 	EXPECT_NE(B_OK, write_resources_over(&resources, &cut));
 	EXPECT_EQ(elf.substr(0, 20), ReadFile(folder / "cut"));
+}
+
+
+TEST(SafeSave, AFailedSyncIsNotTriedAgainAtTheEnd)
+{
+	TemporaryFolder folder;
+	const std::string path = folder / "file";
+	const std::string before = MakeFile(path);
+	struct rlimit limit;
+	ASSERT_EQ(0, getrlimit(RLIMIT_FSIZE, &limit));
+	const struct rlimit none = { 0, limit.rlim_max };
+	const auto handler = signal(SIGXFSZ, SIG_IGN);
+	{
+		BResources resources(path.c_str());
+		resources.AddResource('TEXT', 2, "new", 3);
+		ASSERT_EQ(0, setrlimit(RLIMIT_FSIZE, &none));
+		EXPECT_NE(B_OK, resources.Sync());
+		ASSERT_EQ(0, setrlimit(RLIMIT_FSIZE, &limit));
+	}
+	EXPECT_TRUE(before == ReadFile(path));
+	{
+		BResources resources(path.c_str());
+		resources.AddResource('TEXT', 2, "new", 3);
+		ASSERT_EQ(0, setrlimit(RLIMIT_FSIZE, &none));
+		EXPECT_NE(B_OK, resources.Sync());
+		ASSERT_EQ(0, setrlimit(RLIMIT_FSIZE, &limit));
+		EXPECT_EQ(B_OK, resources.Sync()) << "but may be tried again by hand";
+	}
+	EXPECT_FALSE(before == ReadFile(path));
+	signal(SIGXFSZ, handler);
 }
 
 
