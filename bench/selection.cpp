@@ -139,13 +139,20 @@ private:
 
 
 void
-CompareSizes()
+PutPaletteAside()
 {
-	User few(kUpperHalf, kFew);
-	User many(kLowerHalf, kMany);
 	widgetWindow->Lock();
 	widgetWindow->MoveTo(kBesideThem);
 	widgetWindow->Unlock();
+}
+
+
+void
+CompareClicksAndKeys()
+{
+	User few(kUpperHalf, kFew);
+	User many(kLowerHalf, kMany);
+	PutPaletteAside();
 	bench::compare(
 		"click to highlight and panels, 10,000 / 100 views", 1.15, [&] { many.Click(); },
 		[&] { few.Click(); });
@@ -158,14 +165,25 @@ CompareSizes()
 	};
 	bench::compare(
 		"twenty arrow keys, 10,000 / 100 views", 1.15, [&] { nudge(many); }, [&] { nudge(few); });
+}
+
+
+// The ground is marked as what would take the view, behind all others that are in sight. So it is
+// compared with a design that has as many of them in sight.
+void
+CompareDrags()
+{
+	User some(kUpperHalf, kInSight);
+	User many(kLowerHalf, kMany);
+	PutPaletteAside();
 	const auto drag = [](User& user) {
 		user.Activate();
 		user.Click();
 		user.StartDrag();
 	};
 	bench::compare(
-		"click and start of a drag, 10,000 / 100 views", 1.15, [&] { drag(many); },
-		[&] { drag(few); });
+		"click and start of a drag, 10,000 / 1,000 views", 1.15, [&] { drag(many); },
+		[&] { drag(some); });
 }
 
 
@@ -177,7 +195,8 @@ main(int argc, char** argv)
 {
 	setenv("ARCHWAY_BACKEND", "headless", 1);
 	BApplication application("application/x-vnd.Archway-bench");
-	CompareSizes();
+	CompareClicksAndKeys();
+	CompareDrags();
 	benchmark::Initialize(&argc, argv);
 	benchmark::RunSpecifiedBenchmarks();
 	return 0;
