@@ -51,9 +51,9 @@ struct CellRange {
 
 ChildIndex::ChildIndex(const ServerView& parent)
 {
-	uint32 order = 0;
+	uint64 order = 0;
 	for (ServerView* child = parent.FirstChild(); child != nullptr; child = child->Next()) {
-		child->SetOrder(order++);
+		child->SetOrder(order += kOrderGap);
 		Add(*child);
 	}
 }

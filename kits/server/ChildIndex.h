@@ -19,11 +19,12 @@ class ServerView;
 class ChildIndex {
 public:
 	static constexpr int32 kFewestChildren = 32; // fewer are looked at one after the other
+	static constexpr uint64 kOrderGap = 1 << 20; // between the numbers of neighbours at first
 
-	// Numbers the children by their order.
+	// Numbers the children by their order, from kOrderGap.
 	explicit ChildIndex(const ServerView& parent);
 
-	// The child is the last one, with a number of its own.
+	// The child has a number of its own.
 	void Add(ServerView& child);
 	// The frame is the one with which the child was added.
 	void Remove(ServerView& child, BRect frame);

@@ -122,13 +122,13 @@ ServerView::InsertChild(ServerView* child, ServerView* before)
 	sLinkVersion.fetch_add(1, std::memory_order_relaxed);
 	if (fIndex == nullptr)
 		return;
-	// Between two numbers there is no other one: the children are numbered again when asked for.
-	if (before != nullptr) {
-		fIndex.reset();
-		return;
-	}
-	child->fOrder = child->fPrevious != nullptr ? child->fPrevious->fOrder + 1 : 0;
-	fIndex->Add(*child);
+	const uint64 low = child->fPrevious != nullptr ? child->fPrevious->fOrder : 0;
+	const uint64 high = before != nullptr ? before->fOrder : low + 2 * ChildIndex::kOrderGap;
+	child->fOrder = low + (high - low) / 2;
+	if (child->fOrder > low)
+		fIndex->Add(*child);
+	else
+		fIndex.reset(); // no number is left between: all get new ones when it is asked for again
 }
 
 

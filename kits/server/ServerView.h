@@ -111,8 +111,8 @@ public:
 	void SetMarks(uint16 marks) { fMarks = marks; }
 
 	// For the parent's index of its children.
-	uint32 Order() const { return fOrder; }
-	void SetOrder(uint32 order) { fOrder = order; }
+	uint64 Order() const { return fOrder; }
+	void SetOrder(uint64 order) { fOrder = order; }
 	uint32 PlaceInCell() const { return fPlaceInCell; }
 	void SetPlaceInCell(uint32 place) { fPlaceInCell = place; }
 
@@ -135,7 +135,7 @@ private:
 	int32 fChildCount = 0;
 	int16 fHideCount = 0;
 	uint16 fMarks = 0;
-	uint32 fOrder = 0; // among its siblings, while the parent has an index
+	uint64 fOrder = 0; // among its siblings, while the parent has an index
 	uint32 fPlaceInCell = 0; // of that index
 	mutable std::unique_ptr<ChildIndex> fIndex; // NULL until it is asked for
 	std::unique_ptr<ViewBackground> fBackground;
