@@ -366,8 +366,8 @@ FileWindow::_TakeItemCommand(uint32 what)
 			return true;
 		case B_CUT:
 			_ApplyItemsThen([this] {
-				_CopySelection();
-				_DeleteSelection("Cut");
+				if (_CopySelection())
+					_DeleteSelection("Cut");
 			});
 			return true;
 		case B_PASTE:

@@ -62,7 +62,7 @@ private:
 	void _OpenSelection();
 	void _DeleteSelection(const char* operation);
 	void _DuplicateSelection();
-	void _CopySelection();
+	bool _CopySelection();
 	void _Paste();
 	void _AskForAttributes();
 	void _SetAttributes(const BMessage* message);

@@ -93,12 +93,13 @@ FileWindow::_DuplicateSelection()
 }
 
 
-void
+// False when nothing was copied, of which the user is told.
+bool
 FileWindow::_CopySelection()
 {
 	const std::vector<BResourceHandle> handles = fList->SelectedItems();
 	if (handles.empty())
-		return;
+		return false;
 	status_t status = B_ERROR;
 	if (const BResourceCollection* collection = fAccess.ReadLock()) {
 		std::vector<const BResourceItem*> items;
@@ -111,6 +112,7 @@ FileWindow::_CopySelection()
 	}
 	if (status != B_OK)
 		_Tell(std::string("The resources could not be copied: ") + StatusText(status) + ".");
+	return status == B_OK;
 }
 
 

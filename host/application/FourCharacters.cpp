@@ -24,7 +24,8 @@ FourCharacters(type_code code)
 bool
 ParseFourCharacters(const std::string& text, type_code* _code)
 {
-	if (text.size() > 4 && text.compare(0, 2, "0x") == 0) {
+	constexpr size_t kLongestNumber = 10; // of 32 bits
+	if (text.size() > 4 && text.size() <= kLongestNumber && text.compare(0, 2, "0x") == 0) {
 		char* end;
 		*_code = static_cast<type_code>(strtoul(text.c_str(), &end, 16));
 		return *end == '\0';

@@ -131,6 +131,8 @@ TEST(Items, KeepTheirIDWhenTheNewOneIsTaken)
 	scene.Play("click item \"ARCV:2\"\nkey r with Command\nwait window \"Attributes\"\n"
 			   "click \"ID:\"\nkey a with Command\ntype \"3\\n\"\nanswer \"OK\"\nwindows 2\n"
 			   "activate \"Attributes\"\nclick \"ID:\"\nkey a with Command\ntype \"x\\n\"\n"
+			   "answer \"OK\"\nactivate \"Attributes\"\nclick \"ID:\"\nkey a with Command\n"
+			   "type \"7\"\nclick \"Type:\"\nkey a with Command\ntype \"0x141524356\\n\"\n"
 			   "answer \"OK\"\nactivate \"Attributes\"\nclick \"Cancel\"\nwindows 1\n"
 			   "expect window \"design.rsrc\" label design.rsrc\n");
 	EXPECT_EQ(BytesOf(kDesign), BytesOf(scene.file));
