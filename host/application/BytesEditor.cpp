@@ -64,7 +64,7 @@ HexTable(std::string_view bytes)
 	std::string table;
 	const std::string_view shown = bytes.substr(0, kMaxShownBytes);
 	for (size_t start = 0; start < shown.size(); start += kBytesPerLine) {
-		char field[16];
+		char field[24];
 		snprintf(field, sizeof(field), "%06zx  ", start);
 		table += field;
 		std::string characters;

@@ -100,16 +100,15 @@ FileWindow::_CopySelection()
 	const std::vector<BResourceHandle> handles = fList->SelectedItems();
 	if (handles.empty())
 		return false;
-	status_t status = B_ERROR;
+	std::vector<BResourceItem> items; // which share their bytes with the document's
 	if (const BResourceCollection* collection = fAccess.ReadLock()) {
-		std::vector<const BResourceItem*> items;
 		for (const BResourceHandle& handle : handles) {
 			if (const BResourceItem* item = collection->Item(handle))
-				items.push_back(item);
+				items.push_back(*item);
 		}
-		status = CopyToClipboard(items);
 		fAccess.ReadUnlock(collection);
 	}
+	const status_t status = CopyToClipboard(items);
 	if (status != B_OK)
 		_Tell(std::string("The resources could not be copied: ") + StatusText(status) + ".");
 	return status == B_OK;

@@ -6,8 +6,6 @@
 #include <MessageForm.h>
 #include <TypeConstants.h>
 
-#include "host/library/ResourceItem.h"
-
 using namespace BResEditor;
 
 namespace {
@@ -22,15 +20,15 @@ constexpr const char* kItemsType = "application/x-vnd.Archway-items";
 
 
 status_t
-CopyToClipboard(const std::vector<const BResourceItem*>& items)
+CopyToClipboard(const std::vector<BResourceItem>& items)
 {
 	BMessage message('Itms');
-	for (const BResourceItem* item : items) {
-		message.AddInt32("type", static_cast<int32>(item->Type()));
-		message.AddInt32("id", item->ID());
-		message.AddString("name", item->Name());
-		message.AddData("data", B_RAW_TYPE, item->Size() > 0 ? item->Data() : "",
-			static_cast<ssize_t>(item->Size()), false);
+	for (const BResourceItem& item : items) {
+		message.AddInt32("type", static_cast<int32>(item.Type()));
+		message.AddInt32("id", item.ID());
+		message.AddString("name", item.Name());
+		message.AddData("data", B_RAW_TYPE, item.Size() > 0 ? item.Data() : "",
+			static_cast<ssize_t>(item.Size()), false);
 	}
 	std::vector<char> bytes(static_cast<size_t>(message.FlattenedSize()));
 	status_t status = message.Flatten(bytes.data(), static_cast<ssize_t>(bytes.size()));

@@ -6,9 +6,7 @@
 
 #include <SupportDefs.h>
 
-namespace BResEditor {
-class BResourceItem;
-}
+#include "host/library/ResourceItem.h"
 
 
 struct ClipboardItem {
@@ -18,8 +16,8 @@ struct ClipboardItem {
 	std::string data;
 };
 
-// Replaces what the clipboard holds. Under the read lock of the items.
-status_t CopyToClipboard(const std::vector<const BResEditor::BResourceItem*>& items);
+// Replaces what the clipboard holds. The items are copies, so that no lock of theirs is needed.
+status_t CopyToClipboard(const std::vector<BResEditor::BResourceItem>& items);
 
 // What is there; empty when the clipboard holds something else.
 std::vector<ClipboardItem> ItemsOnClipboard();
