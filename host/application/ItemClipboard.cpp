@@ -11,9 +11,25 @@ using namespace BResEditor;
 namespace {
 
 
-// A flattened message: for each item an int32 "type", an int32 "id", a string "name" and its bytes
-// as raw "data".
+// A flattened message: for each item a message "item" with int32 "type", int32 "id", string "name"
+// and, unless it has no bytes, raw "data".
 constexpr const char* kItemsType = "application/x-vnd.Archway-items";
+
+
+status_t
+AddItem(BMessage& message, const BResourceItem& item)
+{
+	BMessage fields;
+	status_t status = fields.AddInt32("type", static_cast<int32>(item.Type()));
+	if (status == B_OK)
+		status = fields.AddInt32("id", item.ID());
+	if (status == B_OK)
+		status = fields.AddString("name", item.Name());
+	if (status == B_OK && item.Size() > 0) {
+		status = fields.AddData("data", B_RAW_TYPE, item.Data(), static_cast<ssize_t>(item.Size()));
+	}
+	return status == B_OK ? message.AddMessage("item", &fields) : status;
+}
 
 
 } // namespace
@@ -23,15 +39,13 @@ status_t
 CopyToClipboard(const std::vector<BResourceItem>& items)
 {
 	BMessage message('Itms');
-	for (const BResourceItem& item : items) {
-		message.AddInt32("type", static_cast<int32>(item.Type()));
-		message.AddInt32("id", item.ID());
-		message.AddString("name", item.Name());
-		message.AddData("data", B_RAW_TYPE, item.Size() > 0 ? item.Data() : "",
-			static_cast<ssize_t>(item.Size()), false);
-	}
+	status_t status = B_OK;
+	for (size_t i = 0; i < items.size() && status == B_OK; i++)
+		status = AddItem(message, items[i]);
+	if (status != B_OK)
+		return status;
 	std::vector<char> bytes(static_cast<size_t>(message.FlattenedSize()));
-	status_t status = message.Flatten(bytes.data(), static_cast<ssize_t>(bytes.size()));
+	status = message.Flatten(bytes.data(), static_cast<ssize_t>(bytes.size()));
 	if (status != B_OK)
 		return status;
 
@@ -61,14 +75,17 @@ ItemsOnClipboard()
 	be_clipboard->Unlock();
 
 	std::vector<ClipboardItem> items;
-	int32 type, id;
-	const char* name;
-	for (int32 i = 0; isThere && message.FindInt32("type", i, &type) == B_OK
-		 && message.FindInt32("id", i, &id) == B_OK && message.FindString("name", i, &name) == B_OK
-		 && message.FindData("data", B_RAW_TYPE, i, &bytes, &size) == B_OK;
-		 i++) {
-		items.push_back({ static_cast<type_code>(type), id, name,
-			std::string(static_cast<const char*>(bytes), static_cast<size_t>(size)) });
+	BMessage fields;
+	for (int32 i = 0; isThere && message.FindMessage("item", i, &fields) == B_OK; i++) {
+		int32 type, id;
+		const char* name;
+		if (fields.FindInt32("type", &type) != B_OK || fields.FindInt32("id", &id) != B_OK
+			|| fields.FindString("name", &name) != B_OK)
+			continue;
+		ClipboardItem item = { static_cast<type_code>(type), id, name, "" };
+		if (fields.FindData("data", B_RAW_TYPE, &bytes, &size) == B_OK)
+			item.data.assign(static_cast<const char*>(bytes), static_cast<size_t>(size));
+		items.push_back(std::move(item));
 	}
 	return items;
 }

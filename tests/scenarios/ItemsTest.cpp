@@ -92,6 +92,22 @@ TEST(Items, ArePastedIntoAnotherFile)
 }
 
 
+TEST(Items, WithoutBytesAreCutAndPasted)
+{
+	Scene scene;
+	{
+		BResources resources(scene.file.c_str());
+		ASSERT_EQ(B_OK, resources.AddResource('NULL', 1, "", 0, "empty"));
+	}
+	scene.Play("click item \"ARCV:3\"\nclick item \"NULL:1\" with Shift\nkey x with Command\n"
+			   "expect ItemList count 2\nkey v with Command\n"
+		+ kSave);
+	EXPECT_EQ(
+		(Names { "ARCV:1 r5", "ARCV:2 haiku nested", "ARCV:3 haiku managed", "NULL:1 empty" }),
+		ItemsOf(scene.file));
+}
+
+
 TEST(Items, ThatWereRemovedComeBackToTheirPlaces)
 {
 	Scene scene;
