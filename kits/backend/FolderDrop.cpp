@@ -1,8 +1,12 @@
 #include "backend/FolderDrop.h"
 
+#include <algorithm>
 #include <cctype>
+#include <cstring>
 #include <filesystem>
 #include <system_error>
+
+#include <sys/xattr.h>
 
 namespace BPrivate {
 
@@ -35,6 +39,24 @@ Unescape(const std::string& text)
 		}
 	}
 	return result;
+}
+
+
+// As file managers do; the type of a file is such an attribute. Folders need not support any.
+void
+CopyUserAttributes(const std::string& from, const std::string& to)
+{
+	std::string names(std::max<ssize_t>(listxattr(from.c_str(), nullptr, 0), 0), '\0');
+	names.resize(std::max<ssize_t>(listxattr(from.c_str(), names.data(), names.size()), 0));
+	for (size_t start = 0; start < names.size(); start += std::strlen(&names[start]) + 1) {
+		const char* name = &names[start];
+		if (std::strncmp(name, "user.", 5) != 0)
+			continue;
+		std::string value(std::max<ssize_t>(getxattr(from.c_str(), name, nullptr, 0), 0), '\0');
+		const ssize_t size = getxattr(from.c_str(), name, value.data(), value.size());
+		if (size >= 0)
+			setxattr(to.c_str(), name, value.data(), static_cast<size_t>(size), 0);
+	}
 }
 
 } // namespace
@@ -96,6 +118,7 @@ drop_on_folder(const DataOffer& offer, const std::string& folder)
 		std::error_code error;
 		if (!std::filesystem::copy_file(path, target, error) || error)
 			return false;
+		CopyUserAttributes(path, target);
 	}
 	return !paths.empty();
 }

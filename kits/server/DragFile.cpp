@@ -93,7 +93,7 @@ DragFile::_MakeFile()
 	fFolder = folder;
 
 	fPath = fFolder + "/" + FileName(fMessage);
-	const int file = open(fPath.c_str(), O_CREAT | O_EXCL | O_WRONLY | O_CLOEXEC, 0600);
+	const int file = open(fPath.c_str(), O_CREAT | O_EXCL | O_WRONLY | O_CLOEXEC, 0666);
 	if (file < 0)
 		return false;
 	close(file);

@@ -118,8 +118,9 @@ TEST_P(LargeDesign, TakesNoMoreForOneViewThanASmallOne)
 		for (size_t i = 0; i < small.size(); i++) {
 			EXPECT_LE(large[i].hitTested, small[i].hitTested);
 			// At the start of a drag the root is selected, and so all of it is clipped.
-			if (i < kDragStart)
+			if (i < kDragStart) {
 				EXPECT_LE(large[i].visited, small[i].visited + kSomeDozens);
+			}
 			EXPECT_LE(large[i].flushes, kMostFlushes);
 			EXPECT_LE(large[i].pixels, 2 * small[i].pixels + 10000);
 		}

@@ -29,6 +29,7 @@ public:
 
 	// The press may be over. A NULL window means that it has gone meanwhile.
 	void StartDrag(const WindowReference& source, int32 press, const DragReference& session);
+	bool IsDragging() const { return fSession != nullptr; }
 
 	void WindowHidden(const WindowReference& window);
 	void WindowGone(const WindowReference& window);

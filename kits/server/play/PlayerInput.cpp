@@ -9,6 +9,7 @@
 #include "backend/FolderDrop.h"
 #include "server/Desktop.h"
 #include "server/DesktopThread.h"
+#include "server/input/PointerInput.h"
 
 namespace BPrivate {
 
@@ -135,6 +136,13 @@ Player::_DragToFolder(const Gesture& gesture, const std::string& folder)
 	fInput.Press(gesture.button);
 	WaitUntilIdle();
 	_MoveInSteps(gesture.where + BPoint(20, 20), gesture.steps);
+	bool dragging = false;
+	fDesktop.RunOnDisplay([&] { dragging = fDesktop.Pointer().IsDragging(); });
+	if (!dragging) {
+		fInput.Release(gesture.button);
+		fInput.SetModifiers(0);
+		throw PlayError { "a drag", "nothing is dragged" };
+	}
 	fInput.Leave();
 	WaitUntilIdle();
 	fInput.DropOnFolder(folder.c_str());

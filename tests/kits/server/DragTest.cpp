@@ -11,6 +11,9 @@
 #include <filesystem>
 #include <fstream>
 
+#include <sys/stat.h>
+#include <sys/xattr.h>
+
 #include "app/private/Delivery.h"
 #include "kernel/private/Activity.h"
 #include "server/ServerWindow.h"
@@ -318,6 +321,7 @@ TEST_F(Drag, FileCanBeDroppedOnAFolder)
 	ASSERT_NE(nullptr, file);
 	std::fputs("contents", file);
 	std::fclose(file);
+	ASSERT_EQ(0, setxattr(path.c_str(), "user.BEOS:TYPE", "text/x-a", 8, 0));
 
 	PressSource();
 	auto message = std::make_unique<BMessage>(B_SIMPLE_DATA);
@@ -328,7 +332,11 @@ TEST_F(Drag, FileCanBeDroppedOnAFolder)
 	input.Leave();
 	input.DropOnFolder(folder);
 	Settle();
-	EXPECT_TRUE(std::filesystem::exists(std::string(folder) + "/a file"));
+	const std::string copy = std::string(folder) + "/a file";
+	EXPECT_TRUE(std::filesystem::exists(copy));
+	char type[9] = "";
+	EXPECT_EQ(8, getxattr(copy.c_str(), "user.BEOS:TYPE", type, 8));
+	EXPECT_STREQ("text/x-a", type);
 	EXPECT_EQ(1u, source->Take(B_MOUSE_UP).size());
 	std::filesystem::remove_all(folder);
 	std::filesystem::remove_all(from);
@@ -360,6 +368,11 @@ TEST_F(Drag, FileIsWrittenOnceWhenTheFolderAsks)
 	std::string contents;
 	std::getline(file, contents);
 	EXPECT_EQ("written", contents);
+	const mode_t mask = umask(0);
+	umask(mask);
+	struct stat written;
+	ASSERT_EQ(0, stat((std::string(folder) + "/a-widget").c_str(), &written));
+	EXPECT_EQ(0666 & ~mask, written.st_mode & 0777);
 	EXPECT_EQ(1, writer.asked);
 	EXPECT_TRUE(writer.isReply);
 

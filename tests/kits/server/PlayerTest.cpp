@@ -290,6 +290,13 @@ TEST_F(PlayerTest, FileIsDroppedOnAView)
 }
 
 
+TEST_F(PlayerTest, DragToAFolderNeedsSomethingDragged)
+{
+	EXPECT_EQ("a drag, nothing is dragged", Play("drag Target to folder '" + fFolder + "'"));
+	EXPECT_EQ("", Play("click Target"));
+}
+
+
 TEST_F(PlayerTest, WheelTurnsOverAView)
 {
 	EXPECT_EQ("", Play("wheel \"target\" 0,1"));
