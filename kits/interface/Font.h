@@ -121,8 +121,11 @@ public:
 	void SetSize(float size);
 	void SetShear(float shear); // 45 to 135 degrees, 90 is upright
 	void SetRotation(float rotation); // degrees against the clock
-	// B_FIXED_SPACING gives all characters the width of a "W"; B_STRING_SPACING puts each on a whole
-	// pixel without changing the text's width; the other two take the outlines' own widths.
+	// B_CHAR_SPACING gives each character its own width, whatever stands beside it: pairs are not
+	// kerned. B_STRING_SPACING keeps the text as wide, but puts each character on the whole pixel
+	// next to its place. B_BITMAP_SPACING gives each the width of its image on the screen; images
+	// are made for places between pixels and for every scale, so it is that of the outline, too.
+	// B_FIXED_SPACING gives all characters the width of a "W".
 	void SetSpacing(uint8 spacing);
 	void SetEncoding(uint8 encoding);
 	void SetFace(uint16 face); // chooses the family's style that fits best
@@ -162,7 +165,11 @@ public:
 	void GetStringWidths(const char* stringArray[], const int32 lengthArray[], int32 numStrings,
 		float widthArray[]) const;
 
-	// Escapements are in ems: multiply them by Size(). numChars counts characters, not bytes.
+	// Escapements are in ems: multiply them by Size(). numChars counts characters, not bytes, and
+	// the arrays are in the text's order, also where letters run from the right. They are those of
+	// the characters beside each other as given: together they are the width of that text as it is
+	// measured and drawn, with the delta as it is drawn with that. Arabic letters that join differ
+	// from lone ones; accents of such scripts take no room.
 	void GetEscapements(const char charArray[], int32 numChars, float escapementArray[]) const;
 	void GetEscapements(const char charArray[], int32 numChars, escapement_delta* delta,
 		float escapementArray[]) const;

@@ -3,6 +3,7 @@
 
 #include <math.h>
 #include <string.h>
+#include <vector>
 
 #include <Shape.h>
 
@@ -30,20 +31,60 @@ public:
 		size_t at = 0;
 		*_character = NextCharacter(std::string_view(fText, length), &at);
 		fText += at;
+		fBytes += at;
 		fLeft--;
 		return true;
 	}
+	size_t Bytes() const { return fBytes; } // read so far
 
 private:
 	const char* fText;
 	int32 fLeft;
+	size_t fBytes = 0;
 };
 
 
-bool
-IsWhite(uint32 character)
+// The glyphs of an array's characters as drawing would place them, in the order of the text.
+class GlyphsOfText {
+public:
+	GlyphsOfText(const BFont& font, const char* text, int32 count, const escapement_delta* delta);
+
+	size_t Count() const { return fGlyphs.size(); }
+	const PlacedGlyph& operator[](size_t index) const { return *fGlyphs[index]; }
+	// In pixels, with the delta.
+	float Advance(size_t index) const { return fGlyphs[index]->advance + _Extra(*fGlyphs[index]); }
+	float PenAt(size_t index) const { return fPens[index]; }
+
+private:
+	float _Extra(const PlacedGlyph& glyph) const
+	{
+		return fDelta == NULL ? 0 : (glyph.isSpace ? fDelta->space : fDelta->nonspace);
+	}
+
+	std::shared_ptr<const GlyphRun> fRun;
+	std::vector<const PlacedGlyph*> fGlyphs; // the run's
+	std::vector<float> fPens;
+	const escapement_delta* fDelta; // borrowed
+};
+
+
+GlyphsOfText::GlyphsOfText(
+	const BFont& font, const char* text, int32 count, const escapement_delta* delta) :
+	fDelta(delta)
 {
-	return character == ' ' || character == '\t' || character == '\n' || character == 0xa0;
+	CharacterReader reader(text, count);
+	uint32 character;
+	while (reader.Next(&character))
+		continue;
+	fRun = FontEngine::Get().Run(ToFontSpec(font), std::string_view(text, reader.Bytes()));
+	fGlyphs.resize(fRun->glyphs.size());
+	fPens.resize(fRun->glyphs.size());
+	float extra = 0;
+	for (const PlacedGlyph& glyph : fRun->glyphs) {
+		fGlyphs[glyph.index] = &glyph;
+		fPens[glyph.index] = glyph.x + extra;
+		extra += _Extra(glyph);
+	}
 }
 
 } // namespace
@@ -91,17 +132,11 @@ void
 BFont::GetEscapements(
 	const char charArray[], int32 numChars, escapement_delta* delta, float escapementArray[]) const
 {
-	if (escapementArray == NULL)
+	if (escapementArray == NULL || !(fSize > 0))
 		return;
-	const FontSpec spec = ToFontSpec(*this);
-	CharacterReader reader(charArray, numChars);
-	uint32 character;
-	for (int32 i = 0; reader.Next(&character); i++) {
-		escapementArray[i] = FontEngine::Get().Escapement(spec, character);
-		if (delta != NULL && fSize > 0) {
-			escapementArray[i] += (IsWhite(character) ? delta->space : delta->nonspace) / fSize;
-		}
-	}
+	const GlyphsOfText glyphs(*this, charArray, numChars, delta);
+	for (size_t i = 0; i < glyphs.Count(); i++)
+		escapementArray[i] = glyphs.Advance(i) / fSize;
 }
 
 
@@ -117,16 +152,12 @@ void
 BFont::GetEscapements(const char charArray[], int32 numChars, escapement_delta* delta,
 	BPoint escapementArray[], BPoint offsetArray[]) const
 {
-	if (escapementArray == NULL)
+	if (escapementArray == NULL || !(fSize > 0))
 		return;
-	const FontSpec spec = ToFontSpec(*this);
+	const GlyphsOfText glyphs(*this, charArray, numChars, delta);
 	const float angle = fRotation * (float)M_PI / 180;
-	CharacterReader reader(charArray, numChars);
-	uint32 character;
-	for (int32 i = 0; reader.Next(&character); i++) {
-		float width = FontEngine::Get().Escapement(spec, character);
-		if (delta != NULL && fSize > 0)
-			width += (IsWhite(character) ? delta->space : delta->nonspace) / fSize;
+	for (size_t i = 0; i < glyphs.Count(); i++) {
+		const float width = glyphs.Advance(i) / fSize;
 		escapementArray[i].Set(width * cosf(angle), -width * sinf(angle));
 		if (offsetArray != NULL)
 			offsetArray[i].Set(0, 0);
@@ -137,16 +168,13 @@ BFont::GetEscapements(const char charArray[], int32 numChars, escapement_delta* 
 void
 BFont::GetEdges(const char charArray[], int32 numChars, edge_info edgeArray[]) const
 {
-	if (edgeArray == NULL)
+	if (edgeArray == NULL || !(fSize > 0))
 		return;
-	const FontSpec spec = ToFontSpec(*this);
-	CharacterReader reader(charArray, numChars);
-	uint32 character;
-	for (int32 i = 0; reader.Next(&character); i++) {
-		const BRect box = BoundsOf(FontEngine::Get().Outline(spec, character));
-		const float advance = FontEngine::Get().Escapement(spec, character);
+	const GlyphsOfText glyphs(*this, charArray, numChars, NULL);
+	for (size_t i = 0; i < glyphs.Count(); i++) {
+		const BRect box = BoundsOf(FontEngine::Get().Outline(glyphs[i]));
 		edgeArray[i].left = box.IsValid() ? box.left : 0;
-		edgeArray[i].right = box.IsValid() ? advance - box.right : 0;
+		edgeArray[i].right = box.IsValid() ? glyphs[i].advance / fSize - box.right : 0;
 	}
 }
 
@@ -239,12 +267,10 @@ BFont::_GetBoxes(const char charArray[], int32 numChars, font_metric_mode mode,
 {
 	if (boxes == NULL)
 		return;
-	const FontSpec spec = ToFontSpec(*this);
-	CharacterReader reader(charArray, numChars);
-	float pen = 0;
-	uint32 character;
-	for (int32 i = 0; reader.Next(&character); i++) {
-		BRect box = BoundsOf(FontEngine::Get().Outline(spec, character));
+	const GlyphsOfText glyphs(*this, charArray, numChars, delta);
+	for (size_t i = 0; i < glyphs.Count(); i++) {
+		BRect box = BoundsOf(FontEngine::Get().Outline(glyphs[i]));
+		const float pen = asString ? glyphs.PenAt(i) : 0;
 		if (box.IsValid()) {
 			box = BRect(box.left * fSize + pen, box.top * fSize, box.right * fSize + pen,
 				box.bottom * fSize);
@@ -254,10 +280,5 @@ BFont::_GetBoxes(const char charArray[], int32 numChars, font_metric_mode mode,
 			}
 		}
 		boxes[i] = box;
-		if (!asString)
-			continue;
-		pen += FontEngine::Get().Escapement(spec, character) * fSize;
-		if (delta != NULL)
-			pen += IsWhite(character) ? delta->space : delta->nonspace;
 	}
 }

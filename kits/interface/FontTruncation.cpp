@@ -2,6 +2,7 @@
 #include <Font.h>
 
 #include <algorithm>
+#include <numeric>
 #include <string.h>
 #include <string>
 #include <string_view>
@@ -37,14 +38,15 @@ private:
 TextCutter::TextCutter(const BFont& font, std::string_view text) :
 	fText(text), fEllipsis(font.StringWidth(B_UTF8_ELLIPSIS))
 {
-	const FontSpec spec = ToFontSpec(font);
-	fEnds.push_back(0);
-	for (size_t at = 0; at < text.size();) {
+	for (size_t at = 0; at < text.size(); NextCharacter(text, &at))
 		fStarts.push_back(at);
-		const uint32 character = NextCharacter(text, &at);
-		fEnds.push_back(fEnds.back() + FontEngine::Get().Escapement(spec, character) * font.Size());
-	}
 	fStarts.push_back(text.size());
+
+	const auto run = FontEngine::Get().Run(ToFontSpec(font), text);
+	fEnds.resize(fStarts.size());
+	for (const PlacedGlyph& glyph : run->glyphs)
+		fEnds[glyph.index + 1] = glyph.advance;
+	std::partial_sum(fEnds.begin(), fEnds.end(), fEnds.begin());
 }
 
 

@@ -29,7 +29,7 @@ SpacingOf(const FontSpec& spec)
 {
 	if (spec.spacing == B_FIXED_SPACING)
 		return Spacing::Fixed;
-	return spec.spacing == B_STRING_SPACING ? Spacing::WholePixels : Spacing::Outlines;
+	return spec.spacing == B_STRING_SPACING ? Spacing::Adjusted : Spacing::Outlines;
 }
 
 } // namespace
@@ -253,16 +253,6 @@ FontEngine::Run(const FontSpec& spec, std::string_view text)
 	const RunKey key = { spec.familyAndStyle, spec.size, SpacingOf(spec), text };
 	std::lock_guard locker(fTables->lock);
 	return text.size() > kMaxKeptText ? fTables->MakeRun(key) : fTables->FindRun(key);
-}
-
-
-float
-FontEngine::Escapement(const FontSpec& spec, uint32 character)
-{
-	std::lock_guard locker(fTables->lock);
-	const GlyphFace& face = fTables->list.FaceAt(spec.familyAndStyle);
-	const FaceCharacter found = fTables->Character(face, character);
-	return fTables->Advance(face, found, SpacingOf(spec));
 }
 
 

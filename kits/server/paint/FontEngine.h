@@ -28,11 +28,13 @@ struct PlacedGlyph {
 	const GlyphFace* face; // the engine's
 	uint32 glyph;
 	float x; // logical pixels
+	float advance; // how far it takes the pen on, logical pixels
+	uint32 index; // of its character in the text
 	bool isSpace;
 };
 
 struct GlyphRun {
-	std::vector<PlacedGlyph> glyphs; // one per character, from left to right
+	std::vector<PlacedGlyph> glyphs; // one per character of the text, from left to right
 	float width = 0; // logical pixels
 };
 
@@ -74,8 +76,7 @@ public:
 	float StringWidth(const FontSpec& spec, std::string_view text);
 	std::shared_ptr<const GlyphRun> Run(const FontSpec& spec, std::string_view text);
 
-	// Of one character, in ems, upright; y grows downwards.
-	float Escapement(const FontSpec& spec, uint32 character);
+	// In ems, upright; y grows downwards.
 	PathData Outline(const FontSpec& spec, uint32 character);
 	PathData Outline(const PlacedGlyph& glyph);
 

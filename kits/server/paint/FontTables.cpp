@@ -28,6 +28,7 @@ IsInvisible(uint32 character)
 {
 	return character < 0x20 || (character >= 0x7f && character < 0xa0)
 		|| (character >= 0x200b && character <= 0x200f) || character == 0xfeff
+		|| (character >= 0x202a && character <= 0x202e)
 		|| (character >= 0xfe00 && character <= 0xfe0f);
 }
 
@@ -74,13 +75,14 @@ FontEngine::Tables::Character(const GlyphFace& face, uint32 character)
 }
 
 
-// In ems. With fixed spacing all that has a width has that of the widest Latin letter.
+// In pixels. With fixed spacing all that has a width has that of the widest Latin letter.
 float
-FontEngine::Tables::Advance(const GlyphFace& face, const FaceCharacter& character, Spacing spacing)
+FontEngine::Tables::Advance(
+	const GlyphFace& face, const FaceCharacter& character, const RunKey& key)
 {
-	if (spacing != Spacing::Fixed || character.advance == 0)
-		return character.advance;
-	return Character(face, 'W').advance;
+	if (key.spacing == Spacing::Fixed && character.advance != 0)
+		return Character(face, 'W').advance * key.size;
+	return character.advance * key.size;
 }
 
 
@@ -89,20 +91,21 @@ void
 FontEngine::Tables::ForEach(const GlyphFace& face, std::string_view text, const Use& use)
 {
 	if (!RunsFromTheRight(text)) {
+		uint32 index = 0;
 		for (size_t at = 0; at < text.size();)
-			use(Character(face, NextCharacter(text, &at)), false);
+			use(Character(face, NextCharacter(text, &at)), index++, false);
 		return;
 	}
 	std::vector<uint32> characters;
 	for (size_t at = 0; at < text.size();)
 		characters.push_back(NextCharacter(text, &at));
 	const auto hasForm = [&](uint32 form) { return Character(face, form).glyph != 0; };
-	for (const uint32 character : InDrawingOrder(characters, hasForm)) {
-		FaceCharacter found = Character(face, character);
-		const bool isMark = IsMarkFromTheRight(character);
+	for (const OrderedCharacter& ordered : InDrawingOrder(characters, hasForm)) {
+		FaceCharacter found = Character(face, ordered.character);
+		const bool isMark = IsMarkFromTheRight(ordered.character);
 		if (isMark)
 			found.advance = 0;
-		use(found, isMark);
+		use(found, ordered.index, isMark);
 	}
 }
 
@@ -114,17 +117,17 @@ FontEngine::Tables::MakeRun(const RunKey& key)
 	run->glyphs.reserve(key.text.size());
 	const GlyphFace& face = list.FaceAt(key.code);
 	float letterX = 0, letterWidth = 0; // of the one that marks belong to
-	ForEach(face, key.text, [&](const FaceCharacter& character, bool isMark) {
+	ForEach(face, key.text, [&](const FaceCharacter& character, uint32 index, bool isMark) {
 		const FaceCharacter found = character;
-		const float advance = Advance(face, found, key.spacing) * key.size;
-		float x = key.spacing == Spacing::WholePixels ? floorf(run->width + 0.5f) : run->width;
+		const float advance = Advance(face, found, key);
+		float x = key.spacing == Spacing::Adjusted ? floorf(run->width + 0.5f) : run->width;
 		if (isMark) {
 			x = letterX + letterWidth / 2 - InkMiddle(found) * key.size;
 		} else {
 			letterX = x;
 			letterWidth = advance;
 		}
-		run->glyphs.push_back({ found.face, found.glyph, x, found.isSpace });
+		run->glyphs.push_back({ found.face, found.glyph, x, advance, index, found.isSpace });
 		run->width += advance;
 	});
 	return run;
@@ -136,8 +139,8 @@ FontEngine::Tables::Measure(const RunKey& key)
 {
 	float width = 0;
 	const GlyphFace& face = list.FaceAt(key.code);
-	ForEach(face, key.text, [&](const FaceCharacter& character, bool) {
-		width += Advance(face, FaceCharacter(character), key.spacing) * key.size;
+	ForEach(face, key.text, [&](const FaceCharacter& character, uint32, bool) {
+		width += Advance(face, FaceCharacter(character), key);
 	});
 	return width;
 }

@@ -18,8 +18,12 @@ namespace BPrivate {
 struct FaceCharacter;
 
 
-// How far a glyph takes the pen on. Most spacings take the outline's own measure.
-enum class Spacing : uint8 { Outlines, WholePixels, Fixed };
+// How far a glyph takes the pen on, and where it stands.
+enum class Spacing : uint8 {
+	Outlines, // by the outline's own measure
+	Adjusted, // so, but each glyph stands on the whole pixel next to its place
+	Fixed // all by one measure
+};
 
 struct RunKey {
 	uint32 code;
@@ -102,9 +106,9 @@ struct FontEngine::Tables {
 	std::atomic<size_t> imageBytes = 0;
 
 	const FaceCharacter& Character(const GlyphFace& face, uint32 character);
-	float Advance(const GlyphFace& face, const FaceCharacter& character, Spacing spacing);
-	// Calls with every character in the order of drawing, and whether it is a mark that stands
-	// above or below the letter before it.
+	float Advance(const GlyphFace& face, const FaceCharacter& character, const RunKey& key);
+	// Calls with every character in the order of drawing, its index in the text, and whether it is
+	// a mark that stands above or below the letter before it.
 	template<typename Use>
 	void ForEach(const GlyphFace& face, std::string_view text, const Use& use);
 	std::shared_ptr<GlyphRun> MakeRun(const RunKey& key);

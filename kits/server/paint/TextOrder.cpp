@@ -125,12 +125,13 @@ Mirrored(uint32 c)
 // One line: its characters with their kinds, as the rules change them, and the levels they get.
 class Line {
 public:
-	explicit Line(std::vector<uint32> characters);
+	Line(const std::vector<uint32>& characters, std::vector<uint32> forms, LineStart start);
 
-	std::vector<uint32> Ordered();
+	std::vector<OrderedCharacter> Ordered();
 
 private:
 	Kind _Before(size_t index) const { return index > 0 ? fKinds[index - 1] : fBase; }
+	void _FollowOverride();
 	void _ResolveMarks();
 	void _ResolveNumbers();
 	void _ResolveSeparators();
@@ -140,26 +141,32 @@ private:
 	void _ResolveNeutrals();
 	void _SetLevels();
 	void _Reverse(uint8 level);
+	void _MirrorAndMoveMarks(size_t from, size_t to);
 
-	std::vector<uint32> fCharacters;
+	const std::vector<uint32>& fText; // borrowed
+	std::vector<OrderedCharacter> fCharacters;
 	std::vector<Kind> fKinds;
 	std::vector<uint8> fLevels;
 	Kind fBase = Kind::Left; // what the line starts and ends with
 };
 
 
-Line::Line(std::vector<uint32> characters) :
-	fCharacters(std::move(characters)), fKinds(fCharacters.size()), fLevels(fCharacters.size())
+Line::Line(const std::vector<uint32>& characters, std::vector<uint32> forms, LineStart start) :
+	fText(characters), fKinds(characters.size()), fLevels(characters.size())
 {
-	std::transform(fCharacters.begin(), fCharacters.end(), fKinds.begin(), KindOf);
-	const auto first = std::find_if(fKinds.begin(), fKinds.end(),
-		[](Kind kind) { return kind == Kind::Left || IsRightward(kind); });
-	if (first != fKinds.end() && IsRightward(*first))
+	fCharacters.reserve(forms.size());
+	for (uint32 i = 0; i < forms.size(); i++)
+		fCharacters.push_back({ forms[i], i, false });
+	std::transform(characters.begin(), characters.end(), fKinds.begin(), KindOf);
+	_FollowOverride();
+	if (start == LineStart::OfItself)
+		start = StartOf(characters);
+	if (start == LineStart::Right)
 		fBase = Kind::Right;
 }
 
 
-std::vector<uint32>
+std::vector<OrderedCharacter>
 Line::Ordered()
 {
 	_ResolveMarks();
@@ -169,10 +176,22 @@ Line::Ordered()
 	_ResolveBrackets();
 	_ResolveNeutrals();
 	_SetLevels();
+	for (size_t i = 0; i < fLevels.size(); i++)
+		fCharacters[i].fromRight = fLevels[i] == 1;
 	const uint8 highest = *std::max_element(fLevels.begin(), fLevels.end());
 	for (uint8 level = highest; level > 0; level--)
 		_Reverse(level);
 	return std::move(fCharacters);
+}
+
+
+void
+Line::_FollowOverride()
+{
+	if (fText[0] == kAllFromTheLeft)
+		std::fill(fKinds.begin(), fKinds.end(), Kind::Left);
+	else if (fText[0] == kAllFromTheRight)
+		std::fill(fKinds.begin(), fKinds.end(), Kind::Right);
 }
 
 
@@ -255,17 +274,17 @@ Line::_ResolveBrackets()
 	static constexpr std::string_view kOpen = "([{", kClose = ")]}";
 	std::vector<size_t> open;
 	std::vector<std::pair<size_t, size_t>> pairs;
-	for (size_t i = 0; i < fCharacters.size(); i++) {
-		if (fKinds[i] != Kind::Neutral || fCharacters[i] >= 0x80)
+	for (size_t i = 0; i < fText.size(); i++) {
+		if (fKinds[i] != Kind::Neutral || fText[i] >= 0x80)
 			continue;
-		const char bracket = static_cast<char>(fCharacters[i]);
+		const char bracket = static_cast<char>(fText[i]);
 		if (kOpen.find(bracket) != kOpen.npos)
 			open.push_back(i);
 		const size_t kind = kClose.find(bracket);
 		if (kind == kClose.npos)
 			continue;
 		for (size_t at = open.size(); at-- > 0;) {
-			if (fCharacters[open[at]] == static_cast<uint32>(kOpen[kind])) {
+			if (fText[open[at]] == static_cast<uint32>(kOpen[kind])) {
 				pairs.emplace_back(open[at], i);
 				open.resize(at);
 				break;
@@ -342,13 +361,13 @@ Line::_SetLevels()
 		}
 	}
 	// Space at the line's end is on the side where the line ends.
-	for (size_t i = fKinds.size(); i-- > 0 && KindOf(fCharacters[i]) == Kind::Space;)
+	const bool isForced = fText[0] == kAllFromTheLeft || fText[0] == kAllFromTheRight;
+	for (size_t i = fKinds.size(); !isForced && i-- > 0 && KindOf(fText[i]) == Kind::Space;)
 		fLevels[i] = base;
 }
 
 
-// Turns round every part of at least that level. Brackets are mirrored and marks are put behind
-// their letters again where that ends at level 1.
+// Turns round every part of at least that level.
 void
 Line::_Reverse(uint8 level)
 {
@@ -362,21 +381,28 @@ Line::_Reverse(uint8 level)
 			end++;
 		std::reverse(fCharacters.begin() + i, fCharacters.begin() + end);
 		std::reverse(fLevels.begin() + i, fLevels.begin() + end);
-		if (level == 1) {
-			for (size_t at = i; at < end; at++) {
-				if (fLevels[at] == 1)
-					fCharacters[at] = Mirrored(fCharacters[at]);
-			}
-			for (size_t at = i; at < end; at++) {
-				size_t letter = at;
-				while (letter < end && fLevels[letter] == 1 && IsMark(fCharacters[letter]))
-					letter++;
-				if (letter > at && letter < end)
-					std::reverse(fCharacters.begin() + at, fCharacters.begin() + letter + 1);
-				at = letter;
-			}
-		}
+		if (level == 1)
+			_MirrorAndMoveMarks(i, end);
 		i = end;
+	}
+}
+
+
+// Of a part that was turned round: marks are put behind their letters again.
+void
+Line::_MirrorAndMoveMarks(size_t from, size_t to)
+{
+	for (size_t at = from; at < to; at++) {
+		if (fLevels[at] == 1)
+			fCharacters[at].character = Mirrored(fCharacters[at].character);
+	}
+	for (size_t at = from; at < to; at++) {
+		size_t letter = at;
+		while (letter < to && fLevels[letter] == 1 && IsMark(fCharacters[letter].character))
+			letter++;
+		if (letter > at && letter < to)
+			std::reverse(fCharacters.begin() + at, fCharacters.begin() + letter + 1);
+		at = letter;
 	}
 }
 
@@ -386,6 +412,8 @@ Line::_Reverse(uint8 level)
 bool
 RunsFromTheRight(std::string_view text)
 {
+	if (text.starts_with("\xe2\x80\xae")) // kAllFromTheRight
+		return true;
 	for (size_t at = 0; at < text.size();) {
 		const uint8 first = text[at];
 		// Nothing from the right is below U+0590 in UTF-8.
@@ -408,12 +436,29 @@ IsMarkFromTheRight(uint32 character)
 }
 
 
-std::vector<uint32>
-InDrawingOrder(const std::vector<uint32>& characters, const std::function<bool(uint32)>& hasForm)
+LineStart
+StartOf(const std::vector<uint32>& characters)
+{
+	if (!characters.empty() && characters[0] == kAllFromTheLeft)
+		return LineStart::Left;
+	if (!characters.empty() && characters[0] == kAllFromTheRight)
+		return LineStart::Right;
+	for (const uint32 character : characters) {
+		const Kind kind = KindOf(character);
+		if (kind == Kind::Left || IsRightward(kind))
+			return kind == Kind::Left ? LineStart::Left : LineStart::Right;
+	}
+	return LineStart::OfItself;
+}
+
+
+std::vector<OrderedCharacter>
+InDrawingOrder(const std::vector<uint32>& characters, const std::function<bool(uint32)>& hasForm,
+	LineStart start)
 {
 	if (characters.empty())
-		return characters;
-	return Line(JoinedForms(characters, hasForm)).Ordered();
+		return {};
+	return Line(characters, JoinedForms(characters, hasForm), start).Ordered();
 }
 
 

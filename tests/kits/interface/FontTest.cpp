@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 #include <string.h>
 #include <string>
+#include <vector>
 
 #include <Shape.h>
 #include <String.h>
@@ -119,6 +120,88 @@ TEST(Font, EscapementsAddUpToTheWidth)
 	for (float escapement : escapements)
 		sum += escapement * be_plain_font->Size();
 	EXPECT_NEAR(be_plain_font->StringWidth(text), sum, 0.001);
+}
+
+
+TEST(Font, WhatIsMeasuredAgreesInEverySpacing)
+{
+	// Latin, Greek, Hebrew with a vowel sign, Arabic with a ligature, mixed.
+	const char* const texts[] = { "AVATAR To 12", "Γειά", "שָׁלוֹם", "سلام", "لا", "a (שלום) 3.5, ب" };
+	for (const uint8 spacing :
+		{ B_CHAR_SPACING, B_STRING_SPACING, B_BITMAP_SPACING, B_FIXED_SPACING }) {
+		BFont font(be_plain_font);
+		font.SetSpacing(spacing);
+		font.SetSize(13);
+		for (const char* text : texts) {
+			const int32 count = BString(text).CountChars();
+			std::vector<float> escapements(count);
+			font.GetEscapements(text, count, escapements.data());
+			std::vector<BPoint> points(count);
+			font.GetEscapements(text, count, NULL, points.data());
+			float sum = 0;
+			for (int32 i = 0; i < count; i++) {
+				EXPECT_GE(escapements[i], 0);
+				EXPECT_FLOAT_EQ(escapements[i], points[i].x);
+				sum += escapements[i] * font.Size();
+			}
+			const float width = font.StringWidth(text);
+			EXPECT_NEAR(width, sum, 0.001f) << text << ' ' << int(spacing);
+			const char* strings[] = { text };
+			const int32 lengths[] = { int32(strlen(text)) };
+			float widths[1];
+			font.GetStringWidths(strings, lengths, 1, widths);
+			EXPECT_EQ(width, widths[0]);
+			BString cut(text);
+			font.TruncateString(&cut, B_TRUNCATE_END, width + 0.01f);
+			EXPECT_STREQ(text, cut.String());
+		}
+	}
+}
+
+
+TEST(Font, EdgesAreWithinTheEscapement)
+{
+	const char* text = "Hiש";
+	float escapements[3];
+	edge_info edges[3];
+	BRect boxes[3];
+	BFont font;
+	font.SetSize(100);
+	font.GetEscapements(text, 3, escapements);
+	font.GetEdges(text, 3, edges);
+	font.GetBoundingBoxesAsGlyphs(text, 3, B_PRINTING_METRIC, boxes);
+	for (int i = 0; i < 3; i++) {
+		EXPECT_NEAR(edges[i].left * 100, boxes[i].left, 0.01f) << i;
+		EXPECT_NEAR((escapements[i] - edges[i].right) * 100, boxes[i].right, 0.01f) << i;
+	}
+}
+
+
+TEST(Font, DeltasAreAddedToEachEscapement)
+{
+	const char* text = "a b";
+	escapement_delta delta = { 3, 7 };
+	float plain[3], wide[3];
+	be_plain_font->GetEscapements(text, 3, plain);
+	be_plain_font->GetEscapements(text, 3, &delta, wide);
+	const float size = be_plain_font->Size();
+	EXPECT_FLOAT_EQ(plain[0] * size + 3, wide[0] * size);
+	EXPECT_FLOAT_EQ(plain[1] * size + 7, wide[1] * size);
+	EXPECT_FLOAT_EQ(plain[2] * size + 3, wide[2] * size);
+	BRect boxes[3];
+	be_plain_font->GetBoundingBoxesAsString(text, 3, B_PRINTING_METRIC, &delta, boxes);
+	BRect alone;
+	be_plain_font->GetBoundingBoxesAsGlyphs("b", 1, B_PRINTING_METRIC, &alone);
+	EXPECT_NEAR((wide[0] + wide[1]) * size, boxes[2].left - alone.left, 0.001f);
+}
+
+
+TEST(Font, BoxesOfTextFromTheRightAreWhereItIsDrawn)
+{
+	BRect boxes[3];
+	be_plain_font->GetBoundingBoxesAsString("שלם", 3, B_PRINTING_METRIC, NULL, boxes);
+	EXPECT_GT(boxes[0].left, boxes[1].right);
+	EXPECT_GT(boxes[1].left, boxes[2].right);
 }
 
 

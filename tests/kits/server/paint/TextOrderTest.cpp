@@ -35,9 +35,19 @@ HasNone(uint32)
 
 
 std::vector<uint32>
+Ordered(const std::vector<uint32>& text, bool (*hasForm)(uint32))
+{
+	std::vector<uint32> drawn;
+	for (const OrderedCharacter& ordered : InDrawingOrder(text, hasForm))
+		drawn.push_back(ordered.character);
+	return drawn;
+}
+
+
+std::vector<uint32>
 Ordered(std::string_view text)
 {
-	return InDrawingOrder(CharactersOf(text), HasNone);
+	return Ordered(CharactersOf(text), HasNone);
 }
 
 } // namespace
@@ -97,7 +107,7 @@ TEST(TextOrder, SpaceAtTheEndStaysAtTheEndOfTheLine)
 TEST(TextOrder, MarksFollowTheirLetter)
 {
 	const std::vector<uint32> text = { 0x5d0, 0x5b8, 0x5d1 };
-	EXPECT_EQ((std::vector<uint32> { 0x5d1, 0x5d0, 0x5b8 }), InDrawingOrder(text, HasNone));
+	EXPECT_EQ((std::vector<uint32> { 0x5d1, 0x5d0, 0x5b8 }), Ordered(text, HasNone));
 }
 
 
@@ -105,27 +115,70 @@ TEST(TextOrder, ArabicLettersJoin)
 {
 	// Beh joins on both sides, reh to what is before it alone.
 	const std::vector<uint32> text = { 0x628, 0x628, 0x631, 0x628 };
-	EXPECT_EQ(
-		(std::vector<uint32> { 0xfe8f, 0xfeae, 0xfe92, 0xfe91 }), InDrawingOrder(text, HasAll));
-	EXPECT_EQ((std::vector<uint32> { 0x628, 0x631, 0x628, 0x628 }), InDrawingOrder(text, HasNone));
+	EXPECT_EQ((std::vector<uint32> { 0xfe8f, 0xfeae, 0xfe92, 0xfe91 }), Ordered(text, HasAll));
+	EXPECT_EQ((std::vector<uint32> { 0x628, 0x631, 0x628, 0x628 }), Ordered(text, HasNone));
 	const std::vector<uint32> apart = { 0x628, ' ', 0x628 };
-	EXPECT_EQ((std::vector<uint32> { 0xfe8f, ' ', 0xfe8f }), InDrawingOrder(apart, HasAll));
+	EXPECT_EQ((std::vector<uint32> { 0xfe8f, ' ', 0xfe8f }), Ordered(apart, HasAll));
 }
 
 
 TEST(TextOrder, MarksDoNotPartArabicLetters)
 {
 	const std::vector<uint32> text = { 0x628, 0x64e, 0x628 };
-	EXPECT_EQ((std::vector<uint32> { 0xfe90, 0xfe91, 0x64e }), InDrawingOrder(text, HasAll));
+	EXPECT_EQ((std::vector<uint32> { 0xfe90, 0xfe91, 0x64e }), Ordered(text, HasAll));
 }
 
 
 TEST(TextOrder, LamAndAlefAreOneSign)
 {
 	const std::vector<uint32> text = { 0x644, 0x627 };
-	EXPECT_EQ((std::vector<uint32> { 0x200b, 0xfefb }), InDrawingOrder(text, HasAll));
-	EXPECT_EQ((std::vector<uint32> { 0x627, 0x644 }), InDrawingOrder(text, HasNone))
+	EXPECT_EQ((std::vector<uint32> { 0x200b, 0xfefb }), Ordered(text, HasAll));
+	EXPECT_EQ((std::vector<uint32> { 0x627, 0x644 }), Ordered(text, HasNone))
 		<< "both stay where the font has no such sign";
+}
+
+
+TEST(TextOrder, SaysWhereEachCharacterComesFrom)
+{
+	const std::vector<OrderedCharacter> drawn = InDrawingOrder(CharactersOf("a שלם 12"), HasNone);
+	const uint32 indexes[] = { 0, 1, 6, 7, 5, 4, 3, 2 };
+	ASSERT_EQ(std::size(indexes), drawn.size());
+	for (size_t i = 0; i < drawn.size(); i++) {
+		EXPECT_EQ(indexes[i], drawn[i].index) << i;
+		EXPECT_EQ(i >= 4, drawn[i].fromRight) << i;
+	}
+}
+
+
+TEST(TextOrder, TheStartOfTheLineCanBeGiven)
+{
+	const auto drawn = [](std::string_view text, LineStart start) {
+		std::vector<uint32> characters;
+		for (const OrderedCharacter& ordered : InDrawingOrder(CharactersOf(text), HasNone, start))
+			characters.push_back(ordered.character);
+		return characters;
+	};
+	EXPECT_EQ(CharactersOf("def abc"), drawn("def abc", LineStart::Right));
+	EXPECT_EQ(CharactersOf(". def"), drawn("def .", LineStart::Right));
+	EXPECT_EQ(CharactersOf("םולש ."), drawn("שלום .", LineStart::Left));
+	EXPECT_EQ(LineStart::OfItself, StartOf(CharactersOf(" 12 .")));
+	EXPECT_EQ(LineStart::Right, StartOf(CharactersOf("12 ש a")));
+	EXPECT_EQ(LineStart::Left, StartOf(CharactersOf("12 a ש")));
+}
+
+
+TEST(TextOrder, AnOverrideTurnsAllOrNothing)
+{
+	EXPECT_EQ(CharactersOf("(cba 21"
+						   "\u202e"),
+		Ordered("\u202e"
+				"12 abc)"));
+	EXPECT_EQ(CharactersOf("\u202d"
+						   "שלום (1"),
+		Ordered("\u202d"
+				"שלום (1"));
+	EXPECT_TRUE(RunsFromTheRight("\u202e"
+								 "12"));
 }
 
 
@@ -139,8 +192,7 @@ TEST(TextOrder, KeepsAsManyCharacters)
 			random = random * 1664525 + 1013904223;
 			text += pieces[(random >> 16) % std::size(pieces)];
 		}
-		EXPECT_EQ(CharactersOf(text).size(), InDrawingOrder(CharactersOf(text), HasAll).size())
-			<< text;
+		EXPECT_EQ(CharactersOf(text).size(), Ordered(CharactersOf(text), HasAll).size()) << text;
 	}
 }
 

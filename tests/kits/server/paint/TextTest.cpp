@@ -180,6 +180,34 @@ TEST(Text, DeltaMovesTheFollowingGlyphs)
 }
 
 
+TEST(Text, IsDrawnAsWideAsItIsMeasuredInEverySpacing)
+{
+	for (uint8 spacing = B_CHAR_SPACING; spacing <= B_FIXED_SPACING; spacing++) {
+		for (const char* text : { "AVATAR To", "Γειά, שלום", "سلام لا" }) {
+			PaintFixture fixture(200, 30);
+			fixture.state.font.spacing = spacing;
+			const auto run = FontEngine::Get().Run(fixture.state.font, text);
+			float sum = 0;
+			for (const PlacedGlyph& glyph : run->glyphs)
+				sum += glyph.advance;
+			EXPECT_NEAR(run->width, sum, 0.001f);
+			EXPECT_EQ(run->width, FontEngine::Get().StringWidth(fixture.state.font, text));
+			EXPECT_FLOAT_EQ(5 + run->width, fixture.painter.DrawString(text, BPoint(5, 20)).x);
+		}
+	}
+}
+
+
+TEST(Text, GlyphsKnowTheirCharacters)
+{
+	const auto run = FontEngine::Get().Run(FontSpec(), "a שב");
+	ASSERT_EQ(4u, run->glyphs.size());
+	const uint32 indexes[] = { 0, 1, 3, 2 };
+	for (size_t i = 0; i < 4; i++)
+		EXPECT_EQ(indexes[i], run->glyphs[i].index);
+}
+
+
 TEST(Text, WithoutSmoothingPixelsAreAllOrNothing)
 {
 	PaintFixture fixture(200, 30);
