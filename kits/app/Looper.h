@@ -89,7 +89,7 @@ private:
 	friend class BPrivate::LooperPrivate;
 
 	// The step between the choice of the target and the filters. Takes ownership of the message
-	// and hands it, or several copies of it, to _Deliver().
+	// and hands it, or several copies of it, to _Deliver(). No target: it is gone.
 	virtual void _RouteMessage(BMessage* message, BHandler* target);
 	// Filters, dispatches and deletes one message, which is the current one meanwhile. May be
 	// nested. Needs the lock.

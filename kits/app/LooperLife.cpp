@@ -93,10 +93,7 @@ BLooper::_HandleNext()
 		BHandler* target = _TargetOf(message);
 		if (target != nullptr)
 			target = _ResolveScripting(message, target);
-		if (target != nullptr)
-			_RouteMessage(message, target);
-		else
-			delete message;
+		_RouteMessage(message, target);
 	}
 	fCore->Unlock();
 	fCore->WorkDone();
@@ -151,7 +148,10 @@ BLooper::_ResolveScripting(BMessage* message, BHandler* target)
 void
 BLooper::_RouteMessage(BMessage* message, BHandler* target)
 {
-	_Deliver(message, target);
+	if (target != nullptr)
+		_Deliver(message, target);
+	else
+		delete message;
 }
 
 

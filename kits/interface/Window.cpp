@@ -367,11 +367,14 @@ BWindow::UpdateIfNeeded()
 {
 	if (fInternals->server == nullptr || Thread() != find_thread(nullptr) || !IsLocked())
 		return;
-	if (!fInternals->tree.IsDirty() || fInternals->tree.IsUpdating())
+	if (fInternals->tree.IsUpdating())
 		return;
-	LooperPrivate looper(this);
-	looper.CancelUpdate();
-	looper.Deliver(new BMessage(_UPDATE_), this);
+	if (fInternals->tree.IsDirty()) {
+		LooperPrivate looper(this);
+		looper.CancelUpdate();
+		looper.Deliver(new BMessage(_UPDATE_), this);
+	}
+	fInternals->Present();
 }
 
 
@@ -379,14 +382,15 @@ void
 BWindow::Flush() const
 {
 	if (IsLocked())
-		fInternals->Present();
+		fInternals->Flush();
 }
 
 
 void
 BWindow::Sync() const
 {
-	Flush();
+	if (IsLocked())
+		fInternals->Present();
 }
 
 

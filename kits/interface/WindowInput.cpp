@@ -76,7 +76,10 @@ has_mask(const BView* view, uint32 bit)
 void
 BWindow::_RouteMessage(BMessage* message, BHandler* target)
 {
-	fInternals->Route(message, target);
+	if (target != nullptr)
+		fInternals->Route(message, target);
+	else
+		delete message;
 	fInternals->MessageHandled();
 }
 

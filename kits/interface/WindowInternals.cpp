@@ -227,9 +227,9 @@ WindowInternals::Update()
 {
 	if (server == nullptr || hideCount > 0 || updatesDisabled > 0)
 		return;
+	presentPosted = false;
 	PrepareSurface();
 	tree.Update();
-	Present();
 }
 
 
@@ -263,6 +263,7 @@ void
 WindowInternals::Present()
 {
 	presentPosted = false;
+	presentDue = 0;
 	if (bitmap != nullptr) {
 		BitmapAccess::Finish(*bitmap);
 		return;
@@ -277,8 +278,19 @@ WindowInternals::Present()
 }
 
 
+// What the window's own thread has drawn is shown together with the update that is about to come.
+void
+WindowInternals::Flush()
+{
+	const bool updateFollows = server != nullptr && tree.IsDirty() && updatesDisabled == 0
+		&& window.Thread() == find_thread(nullptr) && LooperPrivate(&window).UpdateWaits();
+	if (!updateFollows)
+		Present();
+}
+
+
 // A message of the window's own thread has been handled: what it has drawn becomes visible, together
-// with the update that it has caused, if there is one.
+// with what the messages that wait draw, and with the update that they have caused, if there is one.
 void
 WindowInternals::MessageHandled()
 {
@@ -286,7 +298,12 @@ WindowInternals::MessageHandled()
 		return;
 	if (tree.IsDirty() && updatesDisabled == 0)
 		return;
-	Present();
+	if (!window.IsMessageWaiting())
+		Present();
+	else if (presentDue == 0)
+		presentDue = system_time() + LooperPrivate::UpdateDelay();
+	else if (system_time() >= presentDue)
+		Present();
 }
 
 

@@ -58,10 +58,11 @@ public:
 	void UpdatePulse();
 	void Pulse();
 
-	// Drawing outside of an update: shown when the present message has been handled, or by a
-	// message of its own when another thread draws.
+	// What was painted is shown when no message waits any more, or soon: by a message of its own
+	// when another thread draws outside of an update.
 	void NoteDrawing();
 	void Present();
+	void Flush();
 	void Update();
 	void PrepareSurface();
 	void MessageHandled();
@@ -111,6 +112,7 @@ public:
 	int32 updatesDisabled = 0;
 	int32 transactions = 0;
 	bool presentPosted = false;
+	bigtime_t presentDue = 0; // when what is painted is shown though messages wait; 0 for nothing
 	float surfaceScale = 0; // of what the tree paints on
 	BRegion toPresent; // painted and not yet shown
 
