@@ -1,9 +1,13 @@
 #include "archive/ViewArchive.h"
 
+#include <algorithm>
 #include <cstdio>
 #include <cstring>
+#include <map>
 #include <memory>
+#include <set>
 #include <string>
+#include <string_view>
 #include <vector>
 
 #include <Application.h>
@@ -33,6 +37,21 @@ ViewFromArchive(BMessage* archive)
 	if (view == nullptr)
 		delete object;
 	return view;
+}
+
+
+// Whether several fields have one name. No program writes such a message, but a file can hold one.
+bool
+HasTwinFields(const BMessage* message)
+{
+	std::vector<std::string_view> names;
+	names.reserve(static_cast<size_t>(message->CountNames(B_ANY_TYPE)));
+	char* name;
+	type_code type;
+	for (int32 i = 0; message->GetInfo(B_ANY_TYPE, i, &name, &type) == B_OK; i++)
+		names.emplace_back(name);
+	std::sort(names.begin(), names.end());
+	return std::adjacent_find(names.begin(), names.end()) != names.end();
 }
 
 
@@ -128,12 +147,13 @@ SwapTree(BMessage* archive)
 {
 	bool changed = RotateClassNames(archive);
 
-	std::vector<std::pair<std::string, int32>> nested;
+	// Of fields with one name only the first is an archive's; swapping it twice would undo it.
+	std::map<std::string, int32> nested;
 	char* name;
 	type_code type;
 	int32 count;
 	for (int32 i = 0; archive->GetInfo(B_MESSAGE_TYPE, i, &name, &type, &count) == B_OK; i++)
-		nested.emplace_back(name, count);
+		nested.emplace(name, count);
 
 	for (const auto& [field, entries] : nested) {
 		for (int32 i = 0; i < entries; i++) {
@@ -209,6 +229,9 @@ Equal(const BMessage* a, const BMessage* b)
 	if (a == nullptr || b == nullptr || a->what != b->what
 		|| a->CountNames(B_ANY_TYPE) != b->CountNames(B_ANY_TYPE))
 		return false;
+	// Of fields with one name only the first can be asked for; the messages know them all.
+	if (HasTwinFields(a))
+		return a->HasSameData(*b, true, true);
 
 	char* name;
 	type_code type, typeB;
@@ -235,6 +258,7 @@ DumpMessage(const BMessage* message, int depth)
 	PrintCode(message->what);
 	printf("\n");
 
+	std::set<std::string> names;
 	char* name;
 	type_code type;
 	int32 count;
@@ -242,6 +266,11 @@ DumpMessage(const BMessage* message, int depth)
 		printf("%s% 5ld ", indent.c_str(), static_cast<long>(count));
 		PrintCode(type);
 		printf(" \"%s\"", name);
+		// Values are asked for by name, which finds the first field of that name.
+		if (!names.insert(name).second) {
+			printf(" (again)\n");
+			continue;
+		}
 		DumpValues(message, name, type, count);
 		printf("\n");
 

@@ -22,7 +22,8 @@ BArchivable* InstantiateAsChild(BMessage* archive);
 // False when either is NULL.
 bool Equal(const BMessage* a, const BMessage* b);
 
-// Prints an archive on standard output, indented by that many tabs.
+// Prints an archive on standard output, indented by that many tabs. Of fields with one name the
+// values of the first are shown.
 void DumpMessage(const BMessage* message, int depth);
 
 // Converts an archive and every archive nested in it between the resource form, where the class

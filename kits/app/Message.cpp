@@ -4,6 +4,7 @@
 #include <cstdlib>
 #include <cstring>
 #include <utility>
+#include <vector>
 
 #include <DataIO.h>
 #include <Flattenable.h>
@@ -13,6 +14,7 @@
 #include "app/private/MessagePrivate.h"
 #include "app/private/MessageReader.h"
 #include "app/private/MessageWriter.h"
+#include "app/private/TwinFields.h"
 #include "app/private/WriteBack.h"
 
 using BPrivate::MessageData;
@@ -322,7 +324,7 @@ BMessage::AddData(
 	const size_t length = strlen(name);
 	int32 number = owned->Find(name, length);
 	if (number >= 0 && fWriteBack != nullptr)
-		number = fWriteBack->MakeRoom(*owned, number);
+		number = fWriteBack->MakeRoom(*owned, name, length);
 	if (number < 0) {
 		if (length > B_FIELD_NAME_LENGTH)
 			return B_BAD_VALUE;
@@ -645,12 +647,12 @@ BMessage::HasSameData(const BMessage& other, bool ignoreFieldOrder, bool deep) c
 		return false;
 	if (fData == other.fData)
 		return true;
+	std::vector<uint32> pairs;
+	if (ignoreFieldOrder && !BPrivate::pair_fields(*fData, *other.fData, &pairs))
+		return false;
 	for (uint32 i = 0; i < count; i++) {
-		const MessageField& field = fData->FieldAt(i);
-		int32 twin = int32(i);
-		if (ignoreFieldOrder)
-			twin = other.fData->Find(fData->NameBytes(field), field.nameLength);
-		if (twin < 0 || !_SameField(i, *other.fData, uint32(twin), ignoreFieldOrder, deep))
+		const uint32 otherField = pairs.empty() ? i : pairs[i];
+		if (!_SameField(i, *other.fData, otherField, ignoreFieldOrder, deep))
 			return false;
 	}
 	return true;
@@ -665,7 +667,9 @@ BMessage::_Find(const char* name) const
 {
 	if (fData == nullptr)
 		return -1;
-	const int32 number = fData->Find(name);
+	const int32 number = fWriteBack == nullptr
+		? fData->Find(name)
+		: BPrivate::WriteBack::Find(*fData, name, strlen(name));
 	if (fLookUps != nullptr)
 		fLookUps->Mark(fData, number, name);
 	return number;
@@ -760,7 +764,7 @@ BMessage::_AddNested(const char* name, MessageData* nested)
 	const size_t length = strlen(name);
 	int32 number = fData->Find(name, length);
 	if (number >= 0 && fWriteBack != nullptr)
-		number = fWriteBack->MakeRoom(*fData, number);
+		number = fWriteBack->MakeRoom(*fData, name, length);
 	const bool fixed = number >= 0 && fData->FieldAt(uint32(number)).Has(MessageField::kFixed);
 	// Messages that lie deep in each other are kept as bytes from some depth on, so that no walk
 	// over them has to go deeper than that.

@@ -2,11 +2,13 @@
 
 #include <cstdlib>
 #include <cstring>
+#include <utility>
 
 #include "app/private/MessageData.h"
 #include "app/private/MessagePrivate.h"
 #include "app/private/MessageReader.h"
 #include "app/private/MessageWriter.h"
+#include "app/private/TwinFields.h"
 
 using BPrivate::MessageData;
 using BPrivate::MessagePrivate;
@@ -114,5 +116,62 @@ flatten_message(const BMessage& message, message_form form, void* buffer, ssize_
 	if (size < writer.Size())
 		return B_BUFFER_OVERFLOW;
 	writer.Write(static_cast<uint8*>(buffer));
+	return B_OK;
+}
+
+
+// #pragma mark - fields by number
+
+
+static bool
+has_item(const MessageData* data, int32 field, int32 index)
+{
+	return data != nullptr && field >= 0 && uint32(field) < data->CountFields() && index >= 0
+		&& uint32(index) < data->FieldAt(uint32(field)).count;
+}
+
+
+bool
+is_first_of_its_name(const BMessage& message, int32 field)
+{
+	const MessageData* data = MessagePrivate(&message).Data();
+	return has_item(data, field, 0) && !BPrivate::is_twin(*data, uint32(field));
+}
+
+
+status_t
+find_field_data(
+	const BMessage& message, int32 field, int32 index, const void** _data, ssize_t* _size)
+{
+	const MessageData* data = MessagePrivate(&message).Data();
+	if (_data == nullptr || _size == nullptr)
+		return B_BAD_VALUE;
+	if (!has_item(data, field, index))
+		return B_BAD_INDEX;
+	size_t size = 0;
+	const status_t status = data->GetItem(uint32(field), uint32(index), _data, &size);
+	*_size = ssize_t(size);
+	return status;
+}
+
+
+status_t
+find_field_message(const BMessage& message, int32 field, int32 index, BMessage* _nested)
+{
+	const MessageData* data = MessagePrivate(&message).Data();
+	if (_nested == nullptr)
+		return B_BAD_VALUE;
+	if (!has_item(data, field, index))
+		return B_BAD_INDEX;
+	if (data->FieldAt(uint32(field)).type != B_MESSAGE_TYPE)
+		return B_BAD_TYPE;
+	status_t status;
+	MessageData* nested = data->GetMessage(uint32(field), uint32(index), &status);
+	if (nested == nullptr)
+		return status;
+	BMessage found(nested->What());
+	MessagePrivate(&found).SetData(nested);
+	nested->Release();
+	*_nested = std::move(found);
 	return B_OK;
 }

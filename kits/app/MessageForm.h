@@ -40,8 +40,8 @@ status_t unflatten_message(BMessage* message, const void* data, size_t size,
 // of it and, where the form tells their places, behind it; of messages inside it the same. An error
 // when nothing can be read. *_damages gets all that was left out; it may be NULL. A message inside
 // that was put together from its remains may have its fields in part.
-status_t salvage_message(BMessage* message, const void* data, size_t size,
-	std::vector<message_damage>* _damages = NULL);
+status_t salvage_message(
+	BMessage* message, const void* data, size_t size, std::vector<message_damage>* _damages = NULL);
 
 // Keeps the buffer instead of copying it: free it with the message's last copy only. The keeper is
 // called once, from any thread, when nothing refers to the bytes any more.
@@ -51,6 +51,14 @@ status_t unflatten_message_shared(BMessage* message, const void* data, size_t si
 // Nested messages are written in the same form. B_BAD_VALUE for a form that is only read.
 ssize_t flattened_message_size(const BMessage& message, message_form form);
 status_t flatten_message(const BMessage& message, message_form form, void* buffer, ssize_t size);
+
+// A message that was read can hold several fields of one name. GetInfo() counts them all; whatever
+// takes a name finds the first only. These take a field's number, as GetInfo(B_ANY_TYPE) has it.
+// B_BAD_INDEX for a field or an item that is not there; B_BAD_TYPE for a field of no messages.
+bool is_first_of_its_name(const BMessage& message, int32 field);
+status_t find_field_data(
+	const BMessage& message, int32 field, int32 index, const void** _data, ssize_t* _size);
+status_t find_field_message(const BMessage& message, int32 field, int32 index, BMessage* _nested);
 
 // Levels of messages inside messages that are read; a deeper one stays raw bytes, which
 // FindMessage() answers with B_BAD_DATA.

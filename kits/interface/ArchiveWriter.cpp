@@ -5,6 +5,7 @@
 
 #include "app/private/MessageData.h"
 #include "app/private/MessagePrivate.h"
+#include "app/private/TwinFields.h"
 #include "app/private/WriteBack.h"
 #include "interface/private/ViewArchive.h"
 #include "support/private/ManagedArchive.h"
@@ -13,10 +14,11 @@ namespace BPrivate {
 
 namespace {
 
+// The archive's field, which none of its twins in the source is.
 int32
-find_field(const MessageData& data, const char* name)
+find_own(const MessageData& archive, const char* name)
 {
-	return data.Find(name);
+	return WriteBack::Find(archive, name, std::strlen(name));
 }
 
 
@@ -64,9 +66,12 @@ begin_archive(const ArchiveSource* source, BMessage* archive)
 
 	auto writeBack = std::make_unique<WriteBack>(data);
 	for (uint32 i = 0; i < data->CountFields(); i++) {
+		if (source->IsKnownField(i))
+			continue;
 		const MessageField& field = data->FieldAt(i);
-		const bool present = own->Find(data->NameBytes(field), field.nameLength) >= 0;
-		if (!source->IsKnownField(i) && !present)
+		if (is_twin(*data, i))
+			writeBack->RestoreTwin(*own, i);
+		else if (WriteBack::Find(*own, data->NameBytes(field), field.nameLength) < 0)
 			writeBack->Restore(*own, i, true);
 	}
 	access.SetWriteBack(std::move(writeBack));
@@ -107,14 +112,14 @@ ArchiveWriter::Keep(const char* name, bool unchanged)
 		_Note(B_NO_MEMORY);
 		return true;
 	}
-	const int32 present = find_field(*own, name);
+	const int32 present = find_own(*own, name);
 	if (!unchanged) {
 		// It was known after all, so it is not carried along.
 		if (present >= 0 && own->FieldAt(present).Has(MessageField::kCarried))
 			own->RemoveField(present);
 		return false;
 	}
-	const int32 read = find_field(*writeBack->Source(), name);
+	const int32 read = writeBack->Source()->Find(name);
 	if (read >= 0)
 		_Note(writeBack->Restore(*own, read, false));
 	else if (present >= 0)
@@ -137,8 +142,8 @@ ArchiveWriter::KeepClass(bool always)
 	if (!Keep("class", always || same) || always)
 		return;
 	// Further names are carried along until somebody adds names of his own.
-	const int32 field = find_field(*access.GetWriteBack()->Source(), "class");
-	const int32 own = find_field(*access.OwnData(), "class");
+	const int32 field = access.GetWriteBack()->Source()->Find("class");
+	const int32 own = find_own(*access.OwnData(), "class");
 	if (field >= 0 && own >= 0) {
 		access.GetWriteBack()->SetFirstItemOwn(field);
 		access.OwnData()->SetCarried(own, true);

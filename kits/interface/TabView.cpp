@@ -50,9 +50,7 @@ BTabView::BTabView(BMessage* archive) :
 	if (archive->FindFloat("_high", &height) == B_OK)
 		fTabHeight = height;
 
-	fContainer = ChildAt(0);
-	if (fContainer == NULL)
-		_InitContainer();
+	_FindContainer(*archive);
 	_ReadTabs(archive);
 
 	int32 selection;

@@ -137,9 +137,13 @@ private:
 	enum class PagePlace { kList, kBesideContainer, kInContainer };
 
 	void _InitContainer();
+	void _FindContainer(const BMessage& archive);
 	void _ReadTabs(BMessage* archive);
 	status_t _ArchiveTabs(BMessage* archive, const BMessage& source) const;
-	void _RestoreContainer(BMessage* container, const BMessage& source) const;
+	bool _LeaveOutMadeContainer(BMessage* archive) const;
+	status_t _ArchiveContainer(
+		BMessage* archive, const BMessage& source, const std::vector<BMessage>& pages) const;
+	status_t _LeaveOutShownPage(BMessage* container) const;
 	void _Show(int32 index);
 	int32 _TabAt(BPoint where) const;
 	float _UsualTabHeight() const;
@@ -148,6 +152,7 @@ private:
 
 	std::vector<BTab*> fTabs; // owned
 	BView* fContainer; // child
+	bool fMadeContainer = false; // since the archive had none
 	button_width fWidthSetting;
 	float fTabHeight;
 	int32 fSelection; // -1: none

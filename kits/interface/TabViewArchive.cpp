@@ -55,6 +55,57 @@ ReviveTab(const BMessage* archive, int32 index)
 }
 
 
+bool
+IsPlain(const BView* view)
+{
+	return typeid(*view) == typeid(BView);
+}
+
+
+// The first child that the archive has: its place, or -1.
+int32
+FirstView(const BMessage& archive, BMessage* _view)
+{
+	int32 count = 0;
+	archive.GetInfo("_views", NULL, &count);
+	for (int32 i = 0; i < count; i++) {
+		if (archive.FindMessage("_views", i, _view) == B_OK)
+			return i;
+	}
+	_view->MakeEmpty();
+	return -1;
+}
+
+
+bool
+SameMessage(const BMessage& a, const BMessage& b)
+{
+	return a.what == b.what
+		&& (MessagePrivate(&a).SharesDataWith(b) || a.HasSameData(b, false, true));
+}
+
+
+// Children that are the same as in the source become the source's again, together with entries
+// among them that nobody can read.
+void
+KeepSameViews(BMessage* archive, const BMessage& source)
+{
+	int32 count = 0;
+	source.GetInfo("_views", NULL, &count);
+	BMessage given;
+	BMessage read;
+	int32 next = 0;
+	for (int32 i = 0; i < count; i++) {
+		if (source.FindMessage("_views", i, &read) != B_OK)
+			continue;
+		if (archive->FindMessage("_views", next++, &given) != B_OK || !SameMessage(given, read))
+			return;
+	}
+	if (!archive->HasMessage("_views", next))
+		ArchiveWriter(archive).Keep("_views", true);
+}
+
+
 // The archives of the pages go into the field, in the places of those that it has already.
 status_t
 PutPages(BMessage* archive, const char* field, int32 first, const std::vector<BMessage>& pages)
@@ -82,7 +133,7 @@ BTabView::_ReadTabs(BMessage* archive)
 
 	// Old archives have no list but the pages beside, or inside of, the container, in tab order. The
 	// children of a container that is more than a view are its own parts.
-	const bool plain = typeid(*fContainer) == typeid(BView);
+	const bool plain = IsPlain(fContainer);
 	if (listed == 0 && CountChildren() > 1)
 		fPagePlace = PagePlace::kBesideContainer;
 	else if (listed == 0 && plain && fContainer->CountChildren() > 0)
@@ -156,33 +207,100 @@ BTabView::_ArchiveTabs(BMessage* archive, const BMessage& source) const
 			status = archive->AddMessage("_view_list", &pages[i]);
 	}
 
-	BMessage container;
-	if (status != B_OK || archive->FindMessage("_views", 0, &container) != B_OK)
-		return status;
-	if (fPagePlace == PagePlace::kInContainer)
-		status = PutPages(&container, "_views", 0, pages);
-	else
-		_RestoreContainer(&container, source);
-	if (status == B_OK)
-		status = archive->ReplaceMessage("_views", 0, &container);
-	if (status == B_OK && fPagePlace == PagePlace::kBesideContainer)
-		status = PutPages(archive, "_views", 1, pages);
+	if (status == B_OK && !_LeaveOutMadeContainer(archive))
+		status = _ArchiveContainer(archive, source, pages);
 	return status;
 }
 
 
-// What an archive had in the container besides its list stays there, and in its place.
-void
-BTabView::_RestoreContainer(BMessage* container, const BMessage& source) const
+// A container that the archive had not is made again when the archive is read.
+bool
+BTabView::_LeaveOutMadeContainer(BMessage* archive) const
 {
-	container->RemoveName("_views");
+	return fMadeContainer && BPrivate::is_revived(this) && CountChildren() == 1
+		&& ArchiveWriter(archive).Keep("_views", true);
+}
+
+
+status_t
+BTabView::_ArchiveContainer(
+	BMessage* archive, const BMessage& source, const std::vector<BMessage>& pages) const
+{
+	BMessage container;
+	const int32 place = FirstView(*archive, &container);
+	if (place < 0)
+		return B_OK;
 	BMessage read;
-	if (source.FindMessage("_views", 0, &read) != B_OK || read.IsEmpty())
+	FirstView(source, &read);
+	MessagePrivate access(&container);
+	if (!read.IsEmpty() && access.OwnData() != NULL) {
+		auto writeBack = std::make_unique<WriteBack>(MessagePrivate(&read).Data());
+		writeBack->MarkTwins(*access.OwnData(), "_views");
+		access.SetWriteBack(std::move(writeBack));
+	}
+
+	status_t status = B_OK;
+	if (fPagePlace == PagePlace::kInContainer)
+		status = PutPages(&container, "_views", 0, pages);
+	else
+		status = _LeaveOutShownPage(&container);
+	KeepSameViews(&container, read);
+	access.SetWriteBack(NULL);
+	if (status == B_OK)
+		status = archive->ReplaceMessage("_views", place, &container);
+	if (status == B_OK && fPagePlace == PagePlace::kBesideContainer)
+		status = PutPages(archive, "_views", place + 1, pages);
+	if (status == B_OK)
+		KeepSameViews(archive, source);
+	return status;
+}
+
+
+// Each page is stored once, so the container's archive has only what else is in the container. Copies
+// of pages that came with a list are not revived and stay in the archive.
+status_t
+BTabView::_LeaveOutShownPage(BMessage* container) const
+{
+	const BView* page = ViewForTab(fSelection);
+	std::vector<BMessage> others;
+	BMessage child;
+	if (page != NULL && page->Parent() == fContainer) {
+		for (int32 i = 0; container->FindMessage("_views", i, &child) == B_OK; i++) {
+			if (fContainer->ChildAt(i) != page)
+				others.push_back(child);
+		}
+		container->RemoveName("_views");
+	}
+	status_t status = B_OK;
+	for (const BMessage& other : others) {
+		if (status == B_OK)
+			status = container->AddMessage("_views", &other);
+	}
+	if (IsPlain(fContainer) && fPagePlace == PagePlace::kList && !container->HasMessage("_views"))
+		ArchiveWriter(container).Keep("_views", true);
+	return status;
+}
+
+
+// Pages come and go in a container, so a class that does things of its own with its children is no
+// use; no program archives such a container. What stands for it writes back what it was.
+void
+BTabView::_FindContainer(const BMessage& archive)
+{
+	fContainer = ChildAt(0);
+	if (fContainer == NULL) {
+		_InitContainer();
+		fMadeContainer = true;
 		return;
-	MessagePrivate(container).SetWriteBack(
-		std::make_unique<WriteBack>(MessagePrivate(&read).Data()));
-	BMessage copy;
-	for (int32 i = 0; read.FindMessage("_views", i, &copy) == B_OK; i++)
-		container->AddMessage("_views", &copy);
-	MessagePrivate(container).SetWriteBack(nullptr);
+	}
+	if (IsPlain(fContainer) || typeid(*fContainer) == typeid(BPrivate::StandInView))
+		return;
+	BMessage read;
+	if (FirstView(archive, &read) < 0)
+		return;
+	BView* const strange = fContainer;
+	fContainer = new BPrivate::StandInView(&read);
+	AddChild(fContainer, strange);
+	strange->RemoveSelf();
+	delete strange;
 }

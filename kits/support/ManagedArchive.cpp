@@ -6,6 +6,7 @@
 #include "app/private/ManagedNote.h"
 #include "app/private/MessageData.h"
 #include "app/private/MessagePrivate.h"
+#include "app/private/TwinFields.h"
 
 namespace BPrivate {
 
@@ -73,7 +74,7 @@ put_field_like(BMessage* message, const BMessage& model, const char* name, const
 
 	int32 before = -1;
 	for (int32 i = place - 1; i >= 0 && before < 0; i--)
-		before = data->Find(order->NameAt(uint32(i)));
+		before = corresponding_field(*data, *order, uint32(i));
 	MessageData* arranged = MessageData::Create();
 	if (arranged == nullptr)
 		return B_NO_MEMORY;
@@ -91,6 +92,16 @@ put_field_like(BMessage* message, const BMessage& model, const char* name, const
 	}
 	arranged->Release();
 	return status;
+}
+
+
+// Whether several fields have that name, so that nobody could say which holds the objects.
+bool
+is_ambiguous(const BMessage& message, const char* name)
+{
+	const MessageData* data = MessagePrivate(&message).Data();
+	const int32 field = data != nullptr ? data->Find(name) : -1;
+	return field >= 0 && next_of_name(*data, uint32(field)) >= 0;
 }
 
 
@@ -127,6 +138,8 @@ public:
 
 	status_t Convert(BMessage* archive)
 	{
+		if (is_ambiguous(*archive, kMark) || is_ambiguous(*archive, kObjects))
+			return B_BAD_DATA;
 		status_t status = _FindTabViews(*archive);
 		if (status != B_OK)
 			return status;
@@ -199,6 +212,10 @@ private:
 	status_t _ConvertFields(BMessage* object, int32 depth)
 	{
 		status_t status = B_OK;
+		for (const char* name : kObjectFields) {
+			if (is_ambiguous(*object, name))
+				return B_BAD_DATA;
+		}
 		for (const char* name : kObjectFields) {
 			if (status == B_OK)
 				status = _ConvertField(object, name, depth);

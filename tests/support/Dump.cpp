@@ -9,6 +9,8 @@
 #include <sstream>
 #include <stdexcept>
 
+#include <MessageForm.h>
+
 namespace test {
 
 namespace {
@@ -211,20 +213,20 @@ private:
 
 
 std::string
-item_difference(const BMessage& message, const DumpField& field, int32 index)
+item_difference(const BMessage& message, int32 number, const DumpField& field, int32 index)
 {
 	const DumpItem& item = field.items[size_t(index)];
 	const std::string where = field.name + "[" + std::to_string(index) + "]";
 	if (item.message != nullptr) {
 		BMessage nested;
-		if (message.FindMessage(field.name.c_str(), index, &nested) != B_OK)
+		if (find_field_message(message, number, index, &nested) != B_OK)
 			return where + ": no message";
 		const std::string inside = difference(nested, *item.message);
 		return inside.empty() ? inside : where + "/" + inside;
 	}
 	const void* data;
 	ssize_t size;
-	if (message.FindData(field.name.c_str(), field.type, index, &data, &size) != B_OK)
+	if (find_field_data(message, number, index, &data, &size) != B_OK)
 		return where + ": not found";
 	const bool same = size_t(size) == item.bytes.size()
 		&& memcmp(data, item.bytes.data(), item.bytes.size()) == 0;
@@ -258,7 +260,7 @@ difference(const BMessage& message, const DumpMessage& dump)
 		if (field.name != name || field.type != type || field.items.size() != size_t(count))
 			return field.name + ": other name, type or count";
 		for (int32 k = 0; k < count; k++) {
-			const std::string text = item_difference(message, field, k);
+			const std::string text = item_difference(message, int32(i), field, k);
 			if (!text.empty())
 				return text;
 		}
@@ -288,8 +290,8 @@ first_difference(const BMessage& read, const BMessage& written)
 		for (int32 k = 0; k < count; k++) {
 			const std::string path = std::string(".") + name + "[" + std::to_string(k) + "]";
 			BMessage a, b;
-			if (type == B_MESSAGE_TYPE && read.FindMessage(name, k, &a) == B_OK
-				&& written.FindMessage(name, k, &b) == B_OK) {
+			if (type == B_MESSAGE_TYPE && find_field_message(read, i, k, &a) == B_OK
+				&& find_field_message(written, i, k, &b) == B_OK) {
 				const std::string nested = first_difference(a, b);
 				if (!nested.empty())
 					return path + nested;
@@ -299,11 +301,9 @@ first_difference(const BMessage& read, const BMessage& written)
 			const void* otherData = nullptr;
 			ssize_t size = 0;
 			ssize_t otherSize = 0;
-			const status_t status = read.FindData(name, type, k, &data, &size);
-			if (written.FindData(name, type, k, &otherData, &otherSize) != status)
-				return path + ": there in one only";
-			// Of two fields with one name the second cannot be asked for.
-			if (status == B_OK && (size != otherSize || memcmp(data, otherData, size) != 0))
+			find_field_data(read, i, k, &data, &size);
+			find_field_data(written, i, k, &otherData, &otherSize);
+			if (size != otherSize || memcmp(data, otherData, size) != 0)
 				return path + ": bytes";
 		}
 	}

@@ -83,6 +83,26 @@ CheckRemains(const char* data, size_t size, off_t start, const std::string& pref
 }
 
 
+// Programs find the first of several fields with one name, and lose the others when they save.
+void
+CheckNames(const BMessage& message, off_t start, const std::string& prefix, Report& report)
+{
+	char* name;
+	type_code type;
+	int32 count;
+	for (int32 i = 0; message.GetInfo(B_ANY_TYPE, i, &name, &type, &count) == B_OK; i++) {
+		if (!is_first_of_its_name(message, i))
+			report.findings.push_back(
+				{ start, prefix + "several fields have the name \"" + name + "\"" });
+		BMessage nested;
+		for (int32 k = 0; type == B_MESSAGE_TYPE && k < count; k++) {
+			if (find_field_message(message, i, k, &nested) == B_OK)
+				CheckNames(nested, start, prefix, report);
+		}
+	}
+}
+
+
 // A message inside the file has its own damages.
 void
 CheckMessage(const char* data, size_t size, off_t start, const std::string& prefix,
@@ -102,6 +122,7 @@ CheckMessage(const char* data, size_t size, off_t start, const std::string& pref
 	}
 	if (!info.checksum_matches)
 		report.findings.push_back({ start, prefix + "the message's checksum does not match" });
+	CheckNames(message, start, prefix, report);
 	if (used < size)
 		report.findings.push_back({ start + static_cast<off_t>(used),
 			prefix + std::to_string(size - used) + " bytes follow the message" });

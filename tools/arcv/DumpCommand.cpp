@@ -4,7 +4,7 @@
 
 #include <memory>
 
-#include <TypeConstants.h>
+#include <MessageForm.h>
 
 #include "tools/arcv/Command.h"
 #include "tools/arcv/Input.h"
@@ -33,11 +33,11 @@ Indent(int32 depth)
 
 
 std::string
-ValueText(const BMessage& message, const char* name, type_code type, int32 index)
+ValueText(const BMessage& message, int32 field, type_code type, int32 index)
 {
 	JsonWriter json;
 	json.OpenArray(true);
-	WriteFieldValue(json, message, name, type, index);
+	WriteFieldValue(json, message, field, type, index);
 	json.CloseArray();
 	const std::string text = json.Finish();
 	return text.substr(1, text.size() - 3);
@@ -57,11 +57,11 @@ PrintMessage(const BMessage& message, int32 depth)
 			const std::string index = count > 1 ? "[" + std::to_string(j) + "]" : "";
 			const std::string start = Indent(depth) + TypeText(type) + " " + name + index;
 			BMessage nested;
-			if (type == B_MESSAGE_TYPE && message.FindMessage(name, j, &nested) == B_OK) {
+			if (find_field_message(message, i, j, &nested) == B_OK) {
 				Print(start + "\n");
 				PrintMessage(nested, depth + 1);
 			} else
-				Print(start + " = " + ValueText(message, name, type, j) + "\n");
+				Print(start + " = " + ValueText(message, i, type, j) + "\n");
 		}
 	}
 }

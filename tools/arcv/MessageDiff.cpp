@@ -5,6 +5,7 @@
 #include <algorithm>
 #include <map>
 
+#include <MessageForm.h>
 #include <TypeConstants.h>
 
 #include "tools/arcv/MessageJson.h"
@@ -17,22 +18,36 @@ namespace {
 // Above this, matching takes more memory than it is worth.
 constexpr size_t kMostPairs = 4 * 1024 * 1024;
 
+// Of several fields with one name each has a place among them: the second of one message is compared
+// with the second of the other.
 struct Field {
 	std::string name;
 	type_code type;
 	int32 count;
+	int32 number; // in its message
+	int32 place; // among those of its name
 };
+
+using FieldKey = std::pair<std::string, int32>;
+
+
+FieldKey
+KeyOf(const Field& field)
+{
+	return { field.name, field.place };
+}
 
 
 std::vector<Field>
 FieldsOf(const BMessage& message)
 {
 	std::vector<Field> fields;
+	std::map<std::string, int32> places;
 	char* name;
 	type_code type;
 	int32 count;
 	for (int32 i = 0; message.GetInfo(B_ANY_TYPE, i, &name, &type, &count) == B_OK; i++)
-		fields.push_back({ name, type, count });
+		fields.push_back({ name, type, count, i, places[name]++ });
 	return fields;
 }
 
@@ -53,27 +68,27 @@ public:
 				"\"" + TypeText(fNew.what) + "\"");
 		const std::vector<Field> oldFields = FieldsOf(fOld);
 		const std::vector<Field> newFields = FieldsOf(fNew);
-		std::map<std::string, const Field*> byName;
+		std::map<FieldKey, const Field*> newByKey;
 		for (const Field& field : newFields)
-			byName[field.name] = &field;
+			newByKey[KeyOf(field)] = &field;
 
-		std::vector<std::string> common;
+		std::vector<FieldKey> common;
 		for (const Field& field : oldFields) {
-			const auto found = byName.find(field.name);
-			if (found == byName.end()) {
+			const auto found = newByKey.find(KeyOf(field));
+			if (found == newByKey.end()) {
 				_AddAll(fOld, field, "removed");
 				continue;
 			}
-			common.push_back(field.name);
+			common.push_back(KeyOf(field));
 			_CompareField(field, *found->second);
-			byName.erase(found);
+			newByKey.erase(found);
 		}
-		std::vector<std::string> newCommon;
+		std::vector<FieldKey> newCommon;
 		for (const Field& field : newFields) {
-			if (byName.count(field.name) != 0)
+			if (newByKey.count(KeyOf(field)) != 0)
 				_AddAll(fNew, field, "added");
 			else
-				newCommon.push_back(field.name);
+				newCommon.push_back(KeyOf(field));
 		}
 		if (common != newCommon)
 			_Add(fPath, "moved", "", "");
@@ -87,7 +102,9 @@ private:
 
 	std::string _Join(const Field& field, int32 index) const
 	{
-		return _Join(field.name) + (field.count > 1 ? "[" + std::to_string(index) + "]" : "");
+		const std::string place = field.place > 0 ? "#" + std::to_string(field.place + 1) : "";
+		return _Join(field.name) + place
+			+ (field.count > 1 ? "[" + std::to_string(index) + "]" : "");
 	}
 
 	void _Add(const std::string& path, const char* what, const std::string& oldValue,
@@ -100,7 +117,7 @@ private:
 	{
 		JsonWriter json;
 		json.OpenArray(true);
-		WriteFieldValue(json, message, field.name.c_str(), field.type, index);
+		WriteFieldValue(json, message, field.number, field.type, index);
 		json.CloseArray();
 		const std::string text = json.Finish();
 		return text.substr(1, text.size() - 3);
@@ -143,11 +160,10 @@ private:
 
 	void _CompareItem(const Field& oldField, int32 oldIndex, const Field& newField, int32 newIndex)
 	{
-		const char* name = oldField.name.c_str();
 		BMessage oldNested;
 		BMessage newNested;
-		if (oldField.type == B_MESSAGE_TYPE && fOld.FindMessage(name, oldIndex, &oldNested) == B_OK
-			&& fNew.FindMessage(name, newIndex, &newNested) == B_OK) {
+		if (find_field_message(fOld, oldField.number, oldIndex, &oldNested) == B_OK
+			&& find_field_message(fNew, newField.number, newIndex, &newNested) == B_OK) {
 			CompareMessages(oldNested, newNested, _Join(newField, newIndex), fDifferences);
 			return;
 		}
@@ -155,8 +171,8 @@ private:
 		const void* newData = NULL;
 		ssize_t oldSize = 0;
 		ssize_t newSize = 0;
-		fOld.FindData(name, oldField.type, oldIndex, &oldData, &oldSize);
-		fNew.FindData(name, newField.type, newIndex, &newData, &newSize);
+		find_field_data(fOld, oldField.number, oldIndex, &oldData, &oldSize);
+		find_field_data(fNew, newField.number, newIndex, &newData, &newSize);
 		if (oldSize != newSize || memcmp(oldData, newData, oldSize) != 0)
 			_Add(_Join(newField, newIndex), "changed", _Value(fOld, oldField, oldIndex),
 				_Value(fNew, newField, newIndex));
@@ -167,7 +183,7 @@ private:
 		std::vector<std::string> identities;
 		for (int32 i = 0; i < field.count; i++) {
 			BMessage nested;
-			message.FindMessage(field.name.c_str(), i, &nested);
+			find_field_message(message, field.number, i, &nested);
 			const char* className = nested.FindString("class");
 			const char* name = nested.FindString("_name");
 			identities.push_back(std::string(className != NULL ? className : "") + "\n"

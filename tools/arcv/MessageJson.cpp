@@ -141,8 +141,13 @@ WriteTyped(JsonWriter& json, type_code type, const void* data, size_t size)
 
 
 void
-WriteField(JsonWriter& json, const BMessage& message, const char* name, type_code type, int32 count)
+WriteField(JsonWriter& json, const BMessage& message, int32 field)
 {
+	char* name;
+	type_code type;
+	int32 count;
+	if (message.GetInfo(B_ANY_TYPE, field, &name, &type, &count) != B_OK)
+		return;
 	json.OpenObject();
 	json.Name("name");
 	json.Text(name);
@@ -151,7 +156,7 @@ WriteField(JsonWriter& json, const BMessage& message, const char* name, type_cod
 	json.Name("values");
 	json.OpenArray(type != B_MESSAGE_TYPE);
 	for (int32 i = 0; i < count; i++)
-		WriteFieldValue(json, message, name, type, i);
+		WriteFieldValue(json, message, field, type, i);
 	json.CloseArray();
 	json.CloseObject();
 }
@@ -171,28 +176,24 @@ WriteMessage(JsonWriter& json, const BMessage& message)
 	}
 	json.Name("fields");
 	json.OpenArray();
-	char* name;
-	type_code type;
-	int32 count;
-	for (int32 i = 0; message.GetInfo(B_ANY_TYPE, i, &name, &type, &count) == B_OK; i++)
-		WriteField(json, message, name, type, count);
+	for (int32 i = 0; i < message.CountNames(B_ANY_TYPE); i++)
+		WriteField(json, message, i);
 	json.CloseArray();
 	json.CloseObject();
 }
 
 
 void
-WriteFieldValue(
-	JsonWriter& json, const BMessage& message, const char* name, type_code type, int32 index)
+WriteFieldValue(JsonWriter& json, const BMessage& message, int32 field, type_code type, int32 index)
 {
 	BMessage nested;
-	if (type == B_MESSAGE_TYPE && message.FindMessage(name, index, &nested) == B_OK) {
+	if (find_field_message(message, field, index, &nested) == B_OK) {
 		WriteMessage(json, nested);
 		return;
 	}
 	const void* data = NULL;
 	ssize_t size = 0;
-	if (message.FindData(name, type, index, &data, &size) != B_OK)
+	if (find_field_data(message, field, index, &data, &size) != B_OK)
 		size = 0;
 	if (!WriteTyped(json, type, data, size))
 		json.Hex(data, size);

@@ -10,9 +10,9 @@ namespace Arcv {
 // {"what": ..., "code": ..., "fields": [...]}
 void WriteMessage(JsonWriter& json, const BMessage& message);
 
-// One item of a field; nested messages are looked up by their place in `message`.
+// One item of the field of that number, as GetInfo() counts.
 void WriteFieldValue(
-	JsonWriter& json, const BMessage& message, const char* name, type_code type, int32 index);
+	JsonWriter& json, const BMessage& message, int32 field, type_code type, int32 index);
 
 // A value of a message's type by its bytes; nested messages are unflattened.
 void WriteValue(JsonWriter& json, type_code type, const void* data, size_t size);

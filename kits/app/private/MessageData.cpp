@@ -734,6 +734,11 @@ MessageData::CopyField(const MessageData& from, uint32 number)
 		} else
 			status = AddItem(last, { data, size });
 	}
+	if (status == B_OK) {
+		MessageField& copy = fFields[fCount - 1];
+		copy.flags |= original.flags & uint16(MessageField::kCarried | MessageField::kTwin);
+		copy.place = original.place;
+	}
 	return status;
 }
 
@@ -806,6 +811,17 @@ MessageData::SetCarried(uint32 number, bool carried)
 		fFields[number].flags |= MessageField::kCarried;
 	else
 		fFields[number].flags &= uint16(~MessageField::kCarried);
+}
+
+
+void
+MessageData::SetTwin(uint32 number, int32 place)
+{
+	if (place >= 0)
+		fFields[number].flags |= MessageField::kTwin;
+	else
+		fFields[number].flags &= uint16(~MessageField::kTwin);
+	fFields[number].place = uint32(place);
 }
 
 

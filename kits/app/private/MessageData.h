@@ -30,6 +30,7 @@ struct MessageField {
 		kWide = 0x20, // the same for the wide R5 form
 		kScattered = 0x40, // only the table tells where the items are
 		kCarried = 0x80, // put in by a WriteBack; the first item that is added replaces it
+		kTwin = 0x100, // put in by a WriteBack, which knows it by its place only
 	};
 
 	uint32 name; // offset
@@ -42,6 +43,7 @@ struct MessageField {
 	uint64* table; // where each variable item is, see ItemPlace; NULL when they are few
 	uint16 nameLength;
 	uint16 flags;
+	uint32 place; // of a kTwin field, its number in the source
 
 	bool Has(uint16 flag) const { return (flags & flag) != 0; }
 	uint32 ItemSize() const { return size / count; } // of a fixed field
@@ -136,6 +138,7 @@ public:
 	// Brings a field to an earlier place.
 	void MoveField(uint32 from, uint32 to);
 	void SetCarried(uint32 field, bool carried);
+	void SetTwin(uint32 field, int32 place); // -1: it is none
 
 	// How deep it lies in the message that was read, and how deep messages lie in it.
 	int32 Level() const { return fLevel; }

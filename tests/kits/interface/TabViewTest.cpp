@@ -321,6 +321,74 @@ TEST(TabView, TakesThePagesThatAnArchiveHasInTheContainer)
 }
 
 
+// Such containers do things of their own with the views that come and go in them.
+TEST(TabView, AContainerOfAnyClassComesOutAsItWasRead)
+{
+	BApplication app("application/x-vnd.Archway-test");
+	for (const char* className : { "BBox", "BButton", "BTabView", "BMenuBar", "BScrollView",
+			 "BTextControl", "BMenuField", "BTextView", "BListView", "NoClassOfThisName" }) {
+		for (const int32 selection : { -1, 0, 1 }) {
+			SCOPED_TRACE(std::string(className) + " " + std::to_string(selection));
+			std::unique_ptr<BTabView> model(NewTabView(2));
+			BMessage archive = ArchiveOf(*model);
+			BMessage container;
+			ASSERT_EQ(B_OK, archive.FindMessage("_views", &container));
+			container.ReplaceString("class", className);
+			const BMessage part = ArchiveOf(BView(BRect(1, 1, 9, 9), "part", B_FOLLOW_NONE, 0));
+			container.AddMessage("_views", &part);
+			container.AddData("_views", B_MESSAGE_TYPE, "no message", 10, false);
+			archive.ReplaceMessage("_views", &container);
+			archive.ReplaceInt32("_sel", selection);
+
+			std::unique_ptr<BTabView> revived = Revive<BTabView>(archive);
+			EXPECT_EQ("First Second", Labels(revived.get()));
+			EXPECT_TRUE(archive.HasSameData(ArchiveOf(*revived), false, true));
+			revived->Select(1);
+			revived->Select(0);
+			archive.ReplaceInt32("_sel", 0);
+			EXPECT_TRUE(archive.HasSameData(ArchiveOf(*revived), false, true));
+		}
+	}
+}
+
+
+TEST(TabView, WhatIsInAStrangeContainerCanBeChanged)
+{
+	BApplication app("application/x-vnd.Archway-test");
+	std::unique_ptr<BTabView> model(NewTabView(2));
+	BMessage archive = ArchiveOf(*model);
+	BMessage container;
+	ASSERT_EQ(B_OK, archive.FindMessage("_views", &container));
+	container.ReplaceString("class", "NoClassOfThisName");
+	const BMessage part = ArchiveOf(BView(BRect(1, 1, 9, 9), "part", B_FOLLOW_NONE, 0));
+	container.AddMessage("_views", &part);
+	archive.ReplaceMessage("_views", &container);
+	archive.ReplaceInt32("_sel", 1);
+
+	std::unique_ptr<BTabView> revived = Revive<BTabView>(archive);
+	revived->ContainerView()->FindView("part")->MoveTo(4, 4);
+	BMessage read;
+	ASSERT_EQ(B_OK, ArchiveOf(*revived).FindMessage("_views", &container));
+	EXPECT_STREQ("NoClassOfThisName", container.FindString("class"));
+	EXPECT_FALSE(container.HasMessage("_views", 1));
+	ASSERT_EQ(B_OK, container.FindMessage("_views", &read));
+	EXPECT_EQ(BRect(4, 4, 12, 12), read.FindRect("_frame"));
+}
+
+
+TEST(TabView, AnArchiveWithoutContainerStaysOne)
+{
+	BApplication app("application/x-vnd.Archway-test");
+	std::unique_ptr<BTabView> model(NewTabView(2));
+	BMessage archive = ArchiveOf(*model);
+	archive.RemoveName("_views");
+	archive.ReplaceInt32("_sel", 1);
+	std::unique_ptr<BTabView> revived = Revive<BTabView>(archive);
+	EXPECT_EQ(revived->ContainerView(), revived->ViewForTab(1)->Parent());
+	EXPECT_TRUE(archive.HasSameData(ArchiveOf(*revived), false, true));
+}
+
+
 TEST(TabView, APageOfAnUnknownClassStaysWhatItIs)
 {
 	BApplication app("application/x-vnd.Archway-test");

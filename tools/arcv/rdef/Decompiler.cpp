@@ -22,16 +22,13 @@ constexpr size_t kRawLine = 32; // bytes
 constexpr size_t kStringLine = 64;
 
 
-// Of two fields with one name nobody can ask for the second. No program makes such a message; its
-// bytes are written as they are.
+// The text has one field for each name. A message with several of one name, which no program makes,
+// is written as the bytes that it is.
 bool
 HasTwinFields(const BMessage& message)
 {
-	std::set<std::string_view> names;
-	char* name;
-	type_code type;
-	for (int32 i = 0; message.GetInfo(B_ANY_TYPE, i, &name, &type) == B_OK; i++) {
-		if (!names.insert(name).second)
+	for (int32 i = 0; i < message.CountNames(B_ANY_TYPE); i++) {
+		if (!is_first_of_its_name(message, i))
 			return true;
 	}
 	return false;
