@@ -85,6 +85,9 @@ struct ItemContents {
 // The owner of the only reference may change it; all others only read, from any thread.
 class MessageData {
 public:
+	// Up to here a walk over the fields is as good as a table.
+	static constexpr uint32 kFewFields = 16;
+
 	static MessageData* Create(); // NULL without memory
 	// Takes over a reference to the source and the tables of the fields. When all fields lie one
 	// after another in the compact form, bodySize is the sum of their bytes, else 0.
@@ -172,8 +175,20 @@ private:
 	void operator delete(void* block) { free(block); }
 
 	static MessageData* _CreateWithRoom(uint32 fields, uint32 store = 0);
+	const SharedBytes* _Flat() const;
+	uint8* _WriteField(const MessageField& field, uint8* to) const;
+	SharedBytes* _SourceOf(uint32 field, uint32 index, const void** _bytes, size_t size) const;
+	void _CopyStore(const MessageData& from);
+	static bool _CopyPlaces(const MessageField& from, MessageField* copy);
+	status_t _ShareField(const MessageField& original);
+	status_t _CopyItems(const MessageData& from, uint32 number);
 	bool _InitFrom(SharedBytes* source, const uint8* base, int32 level, uint32 bodySize);
-	void _Changed();
+	// What was derived from the fields no longer holds.
+	void _Changed()
+	{
+		if (fHasDerived.load(std::memory_order_relaxed))
+			_ForgetDerived();
+	}
 	void _ForgetDerived();
 	bool _ReserveFields(uint32 count) { return fCount + count <= fFieldRoom || _GrowFields(count); }
 	bool _ReserveStore(size_t size) { return size <= fStoreRoom - fStoreSize || _GrowStore(size); }
@@ -181,7 +196,11 @@ private:
 	bool _GrowStore(size_t size);
 	void _AddToIndex(uint32 field);
 	bool _BuildIndex();
-	bool _IsNamed(const MessageField& field, const char* name, size_t length, uint32 key) const;
+	bool _IsNamed(const MessageField& field, const char* name, size_t length, uint32 key) const
+	{
+		return field.key == key && field.nameLength == length
+			&& (length == 0 || memcmp(NameBytes(field), name, length) == 0);
+	}
 	bool _IsAtEnd(const MessageField& field) const;
 	status_t _AppendFixed(MessageField& field, const ItemContents& item);
 	status_t _AppendVariable(MessageField& field, const ItemContents& item);

@@ -10,6 +10,19 @@
 namespace BPrivate {
 
 
+enum R5MessageFlag : uint8 {
+	kR5HasTarget = 0x02,
+	kR5HasReply = 0x04,
+};
+
+
+inline uint32
+swap_if(uint32 value, bool swapped)
+{
+	return swapped ? __builtin_bswap32(value) : value;
+}
+
+
 // Every count and size is checked against the bytes before use. Messages in the host's byte order
 // are not copied: their fields refer to the bytes.
 class MessageReader {
@@ -57,15 +70,23 @@ private:
 	MessageData* _ReadR5();
 	bool _ReadR5Header();
 	bool _ReadR5Field(size_t* position, Field* field);
+	void _SetR5Flags(Field* field, uint8 flags);
 	MessageData* _ReadHaiku();
+	bool _ReadHaikuHeader(size_t* _count, size_t* _areaSize);
 	bool _ReadHaikuField(size_t position, size_t areaStart, size_t areaSize, Field* field);
 	MessageData* _ReadDano();
 	bool _ReadDanoSection(uint32 code, size_t position, size_t end);
+	bool _ReadDanoArray(Field* field, const uint8* data, size_t left, size_t itemSize);
 	bool _AddDanoItems(const Field& field, const uint8* items, size_t size, const uint8* ends);
 
 	bool _LeaveOut();
 	void _Shorten(Field* field, uint32 count);
-	bool _KeepWholeItems(Field* field);
+	// Leaves the items of a damaged field that are wholly there. False when nothing of it is left.
+	bool _KeepWholeItems(Field* field)
+	{
+		return fDamages == nullptr || field->count == 0 || _ShortenToWholeItems(field);
+	}
+	bool _ShortenToWholeItems(Field* field);
 	bool _KeepWholeVariableItems(Field* field, bool noted);
 	bool _Take(const Field& field);
 	bool _TakeReference(const Field& field);
@@ -79,8 +100,13 @@ private:
 	bool _Fail(status_t status, const uint8* where, const char* reason);
 	bool _Fail(status_t status, size_t offset, const char* reason);
 
-	uint16 _Number16(const uint8* from) const;
-	uint32 _Number32(const uint8* from) const;
+	uint16 _Number16(const uint8* from) const
+	{
+		uint16 value;
+		memcpy(&value, from, sizeof(value));
+		return fSwapped ? __builtin_bswap16(value) : value;
+	}
+	uint32 _Number32(const uint8* from) const { return swap_if(read_uint32(from), fSwapped); }
 
 	SharedBytes* fSource; // a reference
 	const uint8* fBytes;
@@ -93,7 +119,8 @@ private:
 	message_damage fDamage { 0, "" };
 	std::vector<message_damage>* fDamages = nullptr; // borrowed; NULL: the first ends the reading
 	std::vector<CutItem> fCutItems;
-	MessageField fFewFields[32]; // kFewFields
+	static constexpr uint32 kFewFields = 32; // as many have room in the reader itself
+	MessageField fFewFields[kFewFields];
 	MessageField* fManyFields = nullptr; // all of them, when there are more; from malloc()
 	size_t fManyRoom = 0;
 	uint32 fFieldCount = 0;
