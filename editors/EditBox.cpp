@@ -18,7 +18,7 @@ constexpr uint32 kBorderChosen = 'brdr';
 } // namespace
 
 
-EditBox::EditBox() : EditorInterface("EditBox", "Properties from BBox", kOneRowPanelHeight)
+EditBox::EditBox() : PanelOf("EditBox", "Properties from BBox", kOneRowPanelHeight)
 {
 	fLabelControl = AddTextControl(
 		this, TextBesideMenuFrame(), "Label: ", kLabelChanged, 40, B_FOLLOW_ALL_SIDES);
@@ -35,7 +35,7 @@ EditBox::~EditBox()
 bool
 EditBox::UseView(BView* view)
 {
-	if (!TakeTarget(dynamic_cast<BBox*>(view)))
+	if (!TakeTarget(view))
 		return false;
 
 	fLabelControl->SetText(_Target()->Label());
@@ -59,11 +59,4 @@ EditBox::ApplyEdit(BMessage* message)
 	}
 	target->Invalidate();
 	return true;
-}
-
-
-BBox*
-EditBox::_Target() const
-{
-	return static_cast<BBox*>(target);
 }

@@ -8,7 +8,7 @@ class BTextControl;
 class BBox;
 
 
-class EditBox : public EditorInterface {
+class EditBox : public PanelOf<BBox> {
 public:
 	EditBox();
 	~EditBox() override;
@@ -19,8 +19,6 @@ protected:
 	bool ApplyEdit(BMessage* message) override;
 
 private:
-	BBox* _Target() const; // of the class that UseView() has tested
-
 	BTextControl* fLabelControl;
 	BMenu* fBorderMenu;
 };

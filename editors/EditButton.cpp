@@ -15,8 +15,7 @@ constexpr uint32 kDefaultChanged = 'dflt';
 } // namespace
 
 
-EditButton::EditButton() :
-	EditorInterface("EditButton", "Properties from BButton", kOneRowPanelHeight)
+EditButton::EditButton() : PanelOf("EditButton", "Properties from BButton", kOneRowPanelHeight)
 {
 	const BRect area = RowArea();
 	fDefaultBox = AddCheckBox(
@@ -32,7 +31,7 @@ EditButton::~EditButton()
 bool
 EditButton::UseView(BView* view)
 {
-	if (!TakeTarget(dynamic_cast<BButton*>(view)))
+	if (!TakeTarget(view))
 		return false;
 
 	SetOn(fDefaultBox, _Target()->IsDefault());
@@ -49,11 +48,4 @@ EditButton::ApplyEdit(BMessage* message)
 	_Target()->MakeDefault(IsOn(fDefaultBox));
 	target->Invalidate();
 	return true;
-}
-
-
-BButton*
-EditButton::_Target() const
-{
-	return static_cast<BButton*>(target);
 }

@@ -7,7 +7,7 @@ class BCheckBox;
 class BButton;
 
 
-class EditButton : public EditorInterface {
+class EditButton : public PanelOf<BButton> {
 public:
 	EditButton();
 	~EditButton() override;
@@ -18,7 +18,5 @@ protected:
 	bool ApplyEdit(BMessage* message) override;
 
 private:
-	BButton* _Target() const; // of the class that UseView() has tested
-
 	BCheckBox* fDefaultBox;
 };

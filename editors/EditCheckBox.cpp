@@ -4,7 +4,7 @@
 
 
 EditCheckBox::EditCheckBox() :
-	EditorInterface("EditCheckBox", "Properties from BCheckBox", kSentencePanelHeight)
+	PanelOf("EditCheckBox", "Properties from BCheckBox", kSentencePanelHeight)
 {
 	AddOnlySentence("The BCheckBox adds no extra settings.");
 }
@@ -18,5 +18,5 @@ EditCheckBox::~EditCheckBox()
 bool
 EditCheckBox::UseView(BView* view)
 {
-	return TakeTarget(dynamic_cast<BCheckBox*>(view));
+	return TakeTarget(view);
 }

@@ -3,8 +3,10 @@
 
 #include "editors/EditorInterface.h"
 
+class BCheckBox;
 
-class EditCheckBox : public EditorInterface {
+
+class EditCheckBox : public PanelOf<BCheckBox> {
 public:
 	EditCheckBox();
 	~EditCheckBox() override;

@@ -43,7 +43,7 @@ IndexOfLayout(color_control_layout layout)
 
 
 EditColorControl::EditColorControl() :
-	EditorInterface("EditColorControl", "Properties from BColorControl", kPanelHeight)
+	PanelOf("EditColorControl", "Properties from BColorControl", kPanelHeight)
 {
 	const BRect area = RowArea();
 	fLayoutMenu = MakeChoiceMenu(
@@ -64,7 +64,7 @@ EditColorControl::~EditColorControl()
 bool
 EditColorControl::UseView(BView* view)
 {
-	if (!TakeTarget(dynamic_cast<BColorControl*>(view)))
+	if (!TakeTarget(view))
 		return false;
 
 	MarkChoice(fLayoutMenu, IndexOfLayout(_Target()->Layout()));
@@ -91,11 +91,4 @@ EditColorControl::ApplyEdit(BMessage* message)
 	}
 	target->Invalidate();
 	return true;
-}
-
-
-BColorControl*
-EditColorControl::_Target() const
-{
-	return static_cast<BColorControl*>(target);
 }

@@ -8,7 +8,7 @@ class IntControl;
 class BColorControl;
 
 
-class EditColorControl : public EditorInterface {
+class EditColorControl : public PanelOf<BColorControl> {
 public:
 	EditColorControl();
 	~EditColorControl() override;
@@ -19,8 +19,6 @@ protected:
 	bool ApplyEdit(BMessage* message) override;
 
 private:
-	BColorControl* _Target() const; // of the class that UseView() has tested
-
 	BMenu* fLayoutMenu;
 	IntControl* fCellSizeControl;
 };

@@ -21,8 +21,7 @@ constexpr uint32 kValueChanged = 'valu';
 } // namespace
 
 
-EditControl::EditControl() :
-	EditorInterface("EditControl", "Properties from BControl", kTwoRowPanelHeight)
+EditControl::EditControl() : PanelOf("EditControl", "Properties from BControl", kTwoRowPanelHeight)
 {
 	BRect row = RowArea();
 	row.bottom = row.top + kRowHeight;
@@ -46,7 +45,7 @@ EditControl::~EditControl()
 bool
 EditControl::UseView(BView* view)
 {
-	if (!TakeTarget(dynamic_cast<BControl*>(view)))
+	if (!TakeTarget(view))
 		return false;
 
 	ShowMessageCode(fMessageControl, _Target()->Message());
@@ -80,13 +79,6 @@ EditControl::ApplyEdit(BMessage* message)
 	}
 	target->Invalidate();
 	return true;
-}
-
-
-BControl*
-EditControl::_Target() const
-{
-	return static_cast<BControl*>(target);
 }
 
 

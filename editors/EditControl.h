@@ -8,7 +8,7 @@ class BTextControl;
 class BControl;
 
 
-class EditControl : public EditorInterface {
+class EditControl : public PanelOf<BControl> {
 public:
 	EditControl();
 	~EditControl() override;
@@ -19,7 +19,6 @@ protected:
 	bool ApplyEdit(BMessage* message) override;
 
 private:
-	BControl* _Target() const; // of the class that UseView() has tested
 	void _ShowValue();
 
 	BTextControl* fMessageControl;

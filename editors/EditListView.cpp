@@ -19,7 +19,7 @@ constexpr uint32 kInvokeMessageChanged = 'imsg';
 
 
 EditListView::EditListView() :
-	EditorInterface("EditListView", "Properties from BListView", kTwoRowPanelHeight)
+	PanelOf("EditListView", "Properties from BListView", kTwoRowPanelHeight)
 {
 	const BRect area = RowArea();
 	BRect frame = FrameAt(area.left, area.top, 120, kRowHeight);
@@ -42,7 +42,7 @@ EditListView::~EditListView()
 bool
 EditListView::UseView(BView* view)
 {
-	if (!TakeTarget(dynamic_cast<BListView*>(view)))
+	if (!TakeTarget(view))
 		return false;
 
 	const bool isMultiple = _Target()->ListType() != B_SINGLE_SELECTION_LIST;
@@ -73,11 +73,4 @@ EditListView::ApplyEdit(BMessage* message)
 			return false;
 	}
 	return true;
-}
-
-
-BListView*
-EditListView::_Target() const
-{
-	return static_cast<BListView*>(target);
 }

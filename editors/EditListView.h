@@ -8,7 +8,7 @@ class BListView;
 class BTextControl;
 
 
-class EditListView : public EditorInterface {
+class EditListView : public PanelOf<BListView> {
 public:
 	EditListView();
 	~EditListView() override;
@@ -19,8 +19,6 @@ protected:
 	bool ApplyEdit(BMessage* message) override;
 
 private:
-	BListView* _Target() const; // of the class that UseView() has tested
-
 	BTextControl* selectMessageControl;
 	BTextControl* invokeMessageControl;
 	BCheckBox* multipleSelectionCheckBox;

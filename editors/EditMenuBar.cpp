@@ -71,7 +71,7 @@ ZetkaStringItem::~ZetkaStringItem()
 
 
 EditMenuBar::EditMenuBar() :
-	EditorInterface("EditMenuBar", "Properties from BMenuBar", kPanelHeight), selectedEntry(nullptr)
+	PanelOf("EditMenuBar", "Properties from BMenuBar", kPanelHeight), selectedEntry(nullptr)
 {
 	const BRect area = RowArea();
 	borderMenu = MakeChoiceMenu(
@@ -94,7 +94,7 @@ EditMenuBar::~EditMenuBar()
 bool
 EditMenuBar::UseView(BView* view)
 {
-	if (!TakeTarget(dynamic_cast<BMenuBar*>(view))) {
+	if (!TakeTarget(view)) {
 		itemList->DeselectAll();
 		return false;
 	}
@@ -120,13 +120,6 @@ EditMenuBar::ApplyEdit(BMessage* message)
 			return _ApplyItemEdit(message->what) || _ApplyTreeEdit(message->what);
 	}
 	return true;
-}
-
-
-BMenuBar*
-EditMenuBar::_Target() const
-{
-	return static_cast<BMenuBar*>(target);
 }
 
 

@@ -29,7 +29,7 @@ public:
 
 // The outline has one entry for each item, in pre-order. Items and entries that are taken out stay
 // valid, for an entry may still stand for a removed item, until another view becomes the target.
-class EditMenuBar : public EditorInterface {
+class EditMenuBar : public PanelOf<BMenuBar> {
 public:
 	EditMenuBar();
 	~EditMenuBar() override;
@@ -40,8 +40,6 @@ protected:
 	bool ApplyEdit(BMessage* message) override;
 
 private:
-	BMenuBar* _Target() const; // of the class that UseView() has tested
-
 	void _AddItemList(BRect area);
 	void _AddItemRows(BRect area);
 	BMenu* _SelectedMenu() const;

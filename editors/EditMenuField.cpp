@@ -24,7 +24,7 @@ constexpr uint32 kEnabledChanged = 'enbl';
 
 
 EditMenuField::EditMenuField() :
-	EditorInterface("EditMenuField", "Properties from BMenuField", kTwoRowPanelHeight)
+	PanelOf("EditMenuField", "Properties from BMenuField", kTwoRowPanelHeight)
 {
 	labelControl = AddTextControl(
 		this, TextBesideMenuFrame(), "Label: ", kLabelChanged, 40, B_FOLLOW_ALL_SIDES);
@@ -48,7 +48,7 @@ EditMenuField::~EditMenuField()
 bool
 EditMenuField::UseView(BView* view)
 {
-	if (!TakeTarget(dynamic_cast<BMenuField*>(view)))
+	if (!TakeTarget(view))
 		return false;
 
 	labelControl->SetText(_Target()->Label());
@@ -81,11 +81,4 @@ EditMenuField::ApplyEdit(BMessage* message)
 	}
 	target->Invalidate();
 	return true;
-}
-
-
-BMenuField*
-EditMenuField::_Target() const
-{
-	return static_cast<BMenuField*>(target);
 }

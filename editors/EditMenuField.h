@@ -10,7 +10,7 @@ class BTextControl;
 class FloatControl;
 
 
-class EditMenuField : public EditorInterface {
+class EditMenuField : public PanelOf<BMenuField> {
 public:
 	EditMenuField();
 	~EditMenuField() override;
@@ -21,8 +21,6 @@ protected:
 	bool ApplyEdit(BMessage* message) override;
 
 private:
-	BMenuField* _Target() const; // of the class that UseView() has tested
-
 	BTextControl* labelControl;
 	BMenu* alignmentMenu;
 	BCheckBox* enabledCheckBox;

@@ -4,7 +4,7 @@
 
 
 EditOutlineListView::EditOutlineListView() :
-	EditorInterface("EditOutlineListView", "Properties from BOutlineListView", kSentencePanelHeight)
+	PanelOf("EditOutlineListView", "Properties from BOutlineListView", kSentencePanelHeight)
 {
 	AddOnlySentence("The BOutlineListView adds no extra settings.");
 }
@@ -18,5 +18,5 @@ EditOutlineListView::~EditOutlineListView()
 bool
 EditOutlineListView::UseView(BView* view)
 {
-	return TakeTarget(dynamic_cast<BOutlineListView*>(view));
+	return TakeTarget(view);
 }

@@ -3,8 +3,10 @@
 
 #include "editors/EditorInterface.h"
 
+class BOutlineListView;
 
-class EditOutlineListView : public EditorInterface {
+
+class EditOutlineListView : public PanelOf<BOutlineListView> {
 public:
 	EditOutlineListView();
 	~EditOutlineListView() override;

@@ -4,7 +4,7 @@
 
 
 EditRadioButton::EditRadioButton() :
-	EditorInterface("EditRadioButton", "Properties from BRadioButton", kSentencePanelHeight)
+	PanelOf("EditRadioButton", "Properties from BRadioButton", kSentencePanelHeight)
 {
 	AddOnlySentence("The BRadioButton adds no extra settings.");
 }
@@ -18,5 +18,5 @@ EditRadioButton::~EditRadioButton()
 bool
 EditRadioButton::UseView(BView* view)
 {
-	return TakeTarget(dynamic_cast<BRadioButton*>(view));
+	return TakeTarget(view);
 }

@@ -3,8 +3,10 @@
 
 #include "editors/EditorInterface.h"
 
+class BRadioButton;
 
-class EditRadioButton : public EditorInterface {
+
+class EditRadioButton : public PanelOf<BRadioButton> {
 public:
 	EditRadioButton();
 	~EditRadioButton() override;

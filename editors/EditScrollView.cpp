@@ -93,7 +93,7 @@ CopyLook(const BView* from, BView* to)
 
 
 EditScrollView::EditScrollView() :
-	EditorInterface("EditScrollView", "Properties from BScrollView", kPanelHeight)
+	PanelOf("EditScrollView", "Properties from BScrollView", kPanelHeight)
 {
 	BRect row = RowArea();
 	row.bottom = row.top + kFieldHeight;
@@ -131,7 +131,7 @@ EditScrollView::FrameChanged()
 bool
 EditScrollView::UseView(BView* view)
 {
-	if (!TakeTarget(dynamic_cast<BScrollView*>(view)))
+	if (!TakeTarget(view))
 		return false;
 
 	MarkChoice(fBorderMenu, _Target()->Border());
@@ -174,13 +174,6 @@ EditScrollView::ApplyEdit(BMessage* message)
 			return false;
 	}
 	return true;
-}
-
-
-BScrollView*
-EditScrollView::_Target() const
-{
-	return static_cast<BScrollView*>(target);
 }
 
 

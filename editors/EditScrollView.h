@@ -11,7 +11,7 @@ class FloatControl;
 class IntControl;
 
 
-class EditScrollView : public EditorInterface {
+class EditScrollView : public PanelOf<BScrollView> {
 public:
 	EditScrollView();
 	~EditScrollView() override;
@@ -25,8 +25,6 @@ protected:
 	bool ApplyEdit(BMessage* message) override;
 
 private:
-	BScrollView* _Target() const; // of the class that UseView() has tested
-
 	// The controls of one scroll bar.
 	struct Bar {
 		orientation direction;

@@ -36,7 +36,7 @@ constexpr rgb_color kDefaultColor = { 80, 80, 80, 0 };
 } // namespace
 
 
-EditSlider::EditSlider() : EditorInterface("EditSlider", "Properties from BSlider", kPanelHeight)
+EditSlider::EditSlider() : PanelOf("EditSlider", "Properties from BSlider", kPanelHeight)
 {
 	BRect row = RowArea();
 	row.bottom = row.top + kRowHeight;
@@ -67,7 +67,7 @@ EditSlider::~EditSlider()
 bool
 EditSlider::UseView(BView* view)
 {
-	if (!TakeTarget(dynamic_cast<BSlider*>(view)))
+	if (!TakeTarget(view))
 		return false;
 
 	const BSlider* slider = _Target();
@@ -115,13 +115,6 @@ EditSlider::ApplyEdit(BMessage* message)
 			return _ApplyMarks(message->what);
 	}
 	return true;
-}
-
-
-BSlider*
-EditSlider::_Target() const
-{
-	return static_cast<BSlider*>(target);
 }
 
 

@@ -14,7 +14,7 @@ class IntControl;
 
 // What a slider cannot change once it is made is changed in its archive, and a new slider takes the
 // old one's place.
-class EditSlider : public EditorInterface {
+class EditSlider : public PanelOf<BSlider> {
 public:
 	EditSlider();
 	~EditSlider() override;
@@ -25,8 +25,6 @@ protected:
 	bool ApplyEdit(BMessage* message) override;
 
 private:
-	BSlider* _Target() const; // of the class that UseView() has tested
-
 	void _AddLimitRow(BRect row, const char* label, uint32 labelCode, BTextControl*& labelControl,
 		const char* value, uint32 valueCode, IntControl*& valueControl);
 	void _AddMenuRow(BRect row);

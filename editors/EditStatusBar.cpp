@@ -34,7 +34,7 @@ constexpr rgb_color kDefaultColor = { 50, 150, 255, 0 };
 
 
 EditStatusBar::EditStatusBar() :
-	EditorInterface("EditStatusBar", "Properties from BStatusBar", kPanelHeight)
+	PanelOf("EditStatusBar", "Properties from BStatusBar", kPanelHeight)
 {
 	const BRect area = RowArea();
 	BRect row = area;
@@ -60,7 +60,7 @@ EditStatusBar::~EditStatusBar()
 bool
 EditStatusBar::UseView(BView* view)
 {
-	if (!TakeTarget(dynamic_cast<BStatusBar*>(view)))
+	if (!TakeTarget(view))
 		return false;
 
 	const BStatusBar* bar = _Target();
@@ -106,13 +106,6 @@ EditStatusBar::ApplyEdit(BMessage* message)
 			return false;
 	}
 	return true;
-}
-
-
-BStatusBar*
-EditStatusBar::_Target() const
-{
-	return static_cast<BStatusBar*>(target);
 }
 
 

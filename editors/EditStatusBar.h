@@ -9,7 +9,7 @@ class BTextControl;
 class FloatControl;
 
 
-class EditStatusBar : public EditorInterface {
+class EditStatusBar : public PanelOf<BStatusBar> {
 public:
 	EditStatusBar();
 	~EditStatusBar() override;
@@ -20,8 +20,6 @@ protected:
 	bool ApplyEdit(BMessage* message) override;
 
 private:
-	BStatusBar* _Target() const; // of the class that UseView() has tested
-
 	void _AddTextRow(BRect row, const char* left, uint32 leftCode, BTextControl*& leftControl,
 		const char* right, uint32 rightCode, BTextControl*& rightControl);
 	void _AddNumberRow(BRect row);

@@ -19,7 +19,7 @@ constexpr uint32 kAlignmentChosen = 'algn';
 
 
 EditStringView::EditStringView() :
-	EditorInterface("EditStringView", "Properties from BStringView", kOneRowPanelHeight)
+	PanelOf("EditStringView", "Properties from BStringView", kOneRowPanelHeight)
 {
 	fTextControl =
 		AddTextControl(this, TextBesideMenuFrame(), "Text: ", kTextChanged, 40, B_FOLLOW_ALL_SIDES);
@@ -36,7 +36,7 @@ EditStringView::~EditStringView()
 bool
 EditStringView::UseView(BView* view)
 {
-	if (!TakeTarget(dynamic_cast<BStringView*>(view)))
+	if (!TakeTarget(view))
 		return false;
 
 	fTextControl->SetText(_Target()->Text());
@@ -60,11 +60,4 @@ EditStringView::ApplyEdit(BMessage* message)
 	}
 	target->Invalidate();
 	return true;
-}
-
-
-BStringView*
-EditStringView::_Target() const
-{
-	return static_cast<BStringView*>(target);
 }

@@ -8,7 +8,7 @@ class BTextControl;
 class BStringView;
 
 
-class EditStringView : public EditorInterface {
+class EditStringView : public PanelOf<BStringView> {
 public:
 	EditStringView();
 	~EditStringView() override;
@@ -19,8 +19,6 @@ protected:
 	bool ApplyEdit(BMessage* message) override;
 
 private:
-	BStringView* _Target() const; // of the class that UseView() has tested
-
 	BTextControl* fTextControl;
 	BMenu* fAlignmentMenu;
 };

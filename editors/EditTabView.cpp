@@ -30,8 +30,7 @@ constexpr rgb_color kPageColor = { 216, 216, 216, 255 };
 } // namespace
 
 
-EditTabView::EditTabView() :
-	EditorInterface("EditTabView", "Properties from BTabView", kPanelHeight)
+EditTabView::EditTabView() : PanelOf("EditTabView", "Properties from BTabView", kPanelHeight)
 {
 	BRect row = RowArea();
 	row.bottom = row.top + 20;
@@ -64,7 +63,7 @@ EditTabView::~EditTabView()
 bool
 EditTabView::UseView(BView* view)
 {
-	if (!TakeTarget(dynamic_cast<BTabView*>(view)))
+	if (!TakeTarget(view))
 		return false;
 
 	tabHeightControl->SetFloatValue(_Target()->TabHeight());
@@ -100,13 +99,6 @@ EditTabView::ApplyEdit(BMessage* message)
 	}
 	target->Invalidate();
 	return true;
-}
-
-
-BTabView*
-EditTabView::_Target() const
-{
-	return static_cast<BTabView*>(target);
 }
 
 

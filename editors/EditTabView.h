@@ -9,7 +9,7 @@ class BTabView;
 class FloatControl;
 
 
-class EditTabView : public EditorInterface {
+class EditTabView : public PanelOf<BTabView> {
 public:
 	EditTabView();
 	~EditTabView() override;
@@ -20,7 +20,6 @@ protected:
 	bool ApplyEdit(BMessage* message) override;
 
 private:
-	BTabView* _Target() const; // of the class that UseView() has tested
 	void _MoveForward();
 	void _MoveBackward();
 	void _MoveToEnd(int32 index);

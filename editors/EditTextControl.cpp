@@ -23,7 +23,7 @@ constexpr uint32 kMessageChanged = 'mssg';
 
 
 EditTextControl::EditTextControl() :
-	EditorInterface("EditTextControl", "Properties from BTextControl", kTwoRowPanelHeight)
+	PanelOf("EditTextControl", "Properties from BTextControl", kTwoRowPanelHeight)
 {
 	BRect row = RowArea();
 	row.bottom = row.top + 20;
@@ -53,7 +53,7 @@ EditTextControl::~EditTextControl()
 bool
 EditTextControl::UseView(BView* view)
 {
-	if (!TakeTarget(dynamic_cast<BTextControl*>(view)))
+	if (!TakeTarget(view))
 		return false;
 
 	ShowMessageCode(fMessageControl, _Target()->ModificationMessage());
@@ -88,11 +88,4 @@ EditTextControl::ApplyEdit(BMessage* message)
 	}
 	target->Invalidate();
 	return true;
-}
-
-
-BTextControl*
-EditTextControl::_Target() const
-{
-	return static_cast<BTextControl*>(target);
 }

@@ -8,7 +8,7 @@ class FloatControl;
 class BTextControl;
 
 
-class EditTextControl : public EditorInterface {
+class EditTextControl : public PanelOf<BTextControl> {
 public:
 	EditTextControl();
 	~EditTextControl() override;
@@ -19,8 +19,6 @@ protected:
 	bool ApplyEdit(BMessage* message) override;
 
 private:
-	BTextControl* _Target() const; // of the class that UseView() has tested
-
 	BMenu* fLabelAlignMenu;
 	BMenu* fTextAlignMenu;
 	FloatControl* fDividerControl;

@@ -39,8 +39,7 @@ constexpr float kTextInset = 2;
 } // namespace
 
 
-EditTextView::EditTextView() :
-	EditorInterface("EditTextView", "Properties from BTextView", kPanelHeight)
+EditTextView::EditTextView() : PanelOf("EditTextView", "Properties from BTextView", kPanelHeight)
 {
 	BRect row = RowArea();
 	row.bottom = row.top + kRowHeight;
@@ -77,7 +76,7 @@ EditTextView::FrameChanged()
 bool
 EditTextView::UseView(BView* view)
 {
-	if (!TakeTarget(dynamic_cast<BTextView*>(view)))
+	if (!TakeTarget(view))
 		return false;
 
 	const BTextView* text = _Target();
@@ -117,13 +116,6 @@ EditTextView::ApplyEdit(BMessage* message)
 	}
 	target->Invalidate();
 	return true;
-}
-
-
-BTextView*
-EditTextView::_Target() const
-{
-	return static_cast<BTextView*>(target);
 }
 
 

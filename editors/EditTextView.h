@@ -10,7 +10,7 @@ class FloatControl;
 class IntControl;
 
 
-class EditTextView : public EditorInterface {
+class EditTextView : public PanelOf<BTextView> {
 public:
 	EditTextView();
 	~EditTextView() override;
@@ -24,7 +24,6 @@ protected:
 	bool ApplyEdit(BMessage* message) override;
 
 private:
-	BTextView* _Target() const; // of the class that UseView() has tested
 	void _AddMenuRow(BRect row);
 	void _AddSwitchRows(BRect row);
 	void _AddHints(BRect row);

@@ -57,6 +57,18 @@ private:
 };
 
 
+// A panel whose targets are views of one class. Both calls need the class to be complete.
+template<class View> class PanelOf : public EditorInterface {
+protected:
+	using EditorInterface::EditorInterface;
+
+	// Returns whether the view is of the class, and so the target.
+	bool TakeTarget(BView* view) { return EditorInterface::TakeTarget(dynamic_cast<View*>(view)); }
+
+	View* _Target() const { return static_cast<View*>(target); }
+};
+
+
 // The layout that the panels share, in pixels.
 constexpr float kSentencePanelHeight = 38;
 constexpr float kOneRowPanelHeight = 42;
