@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <mutex>
 
+#include <Messenger.h>
 #include <Screen.h>
 
 #include "palette/WidgetWindow.h"
@@ -12,6 +13,7 @@ namespace {
 
 // Editors live in windows with threads of their own. The palette's thread never takes this.
 std::mutex sMutex;
+BMessenger sPalette; // invalid once the palette is gone, as when the program ends all its windows
 
 const BPoint kPaletteLeftTop(800, 400); // on the screen, if it is large enough
 constexpr float kFrameWidth = 6; // of the desktop's frames, at most
@@ -39,8 +41,9 @@ EnterPalette()
 {
 	std::lock_guard<std::mutex> guard(sMutex);
 
-	if (widgetWindow == nullptr) {
+	if (widgetWindow == nullptr || !sPalette.IsValid()) {
 		widgetWindow = new WidgetWindow(kPaletteLeftTop);
+		sPalette = BMessenger(widgetWindow);
 		widgetWindow->Lock();
 		MoveOntoScreen(widgetWindow);
 		widgetWindow->Show();
@@ -58,7 +61,7 @@ LeavePalette()
 	if (--widgetWindowCount > 0 || widgetWindow == nullptr)
 		return;
 
-	widgetWindow->Lock();
-	widgetWindow->Quit();
+	if (sPalette.LockTarget())
+		widgetWindow->Quit();
 	widgetWindow = nullptr;
 }

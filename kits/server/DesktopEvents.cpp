@@ -51,7 +51,8 @@ DesktopThread::HandleEvent(const BackendEvent& event)
 			break;
 
 		case Type::CloseRequested:
-			if (WindowReference window = Find(event.window))
+			// Desktops show a close button, and have a key, for any window.
+			if (WindowReference window = Find(event.window); window && window->MayClose())
 				window->Deliver(std::make_unique<BMessage>(B_QUIT_REQUESTED));
 			break;
 

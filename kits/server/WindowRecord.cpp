@@ -100,6 +100,14 @@ WindowRecord::IsFloating() const
 }
 
 
+// A question that the user does not want to answer is closed whatever its flags.
+bool
+WindowRecord::MayClose() const
+{
+	return (Flags() & kNotClosable) == 0 || IsModal();
+}
+
+
 bool
 WindowRecord::FloatsOverAll() const
 {

@@ -43,6 +43,7 @@ public:
 	bool IsMenu() const;
 	bool IsModal() const;
 	bool IsFloating() const;
+	bool MayClose() const; // by the user
 	bool FloatsOverAll() const; // over windows of other programs too
 	bool HasSubset() const; // floats over, or blocks, the windows of its subset alone
 	void Change(const std::function<void(Properties&)>& change);

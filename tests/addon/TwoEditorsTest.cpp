@@ -204,6 +204,33 @@ TEST_F(TwoEditors, ThePaletteClosesDuringItsDrag)
 }
 
 
+// Desktops show a close button all the same.
+TEST_F(TwoEditors, ThePaletteStaysWhenTheUserClosesIt)
+{
+	const WidgetWindow* palette = widgetWindow;
+	driver.CloseWindow(widgetWindow);
+	EXPECT_EQ(palette, widgetWindow);
+	const BPoint where = Driver::PointIn(left.Root(), BPoint(90, 110));
+	BeginDrag(Entry(kButtonEntry), where);
+	driver.Release();
+	EXPECT_EQ(2, left.Root()->CountChildren());
+}
+
+
+// As when the program ends all its windows, in whatever order.
+TEST_F(TwoEditors, CloseAfterThePalette)
+{
+	widgetWindow->Lock();
+	widgetWindow->Quit();
+	left.Close();
+	right.Close();
+	EXPECT_EQ(NULL, widgetWindow);
+	EXPECT_EQ(0, widgetWindowCount);
+	OpenEditor another(collection, 3, BPoint(20, 40));
+	EXPECT_STREQ("Widgets", widgetWindow->Title());
+}
+
+
 TEST_F(TwoEditors, ThePointerTellsWhereAWidgetIsTaken)
 {
 	const BPoint entry = Entry(kButtonEntry);

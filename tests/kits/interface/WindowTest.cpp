@@ -93,6 +93,18 @@ TEST(Window, AQuitRequestEndsIt)
 }
 
 
+// Desktops show a close button all the same.
+TEST(Window, OneThatIsNotClosableIsNotClosedByTheUser)
+{
+	TestWindow test;
+	test.Locked([&] { test.Window()->SetFlags(B_NOT_CLOSABLE); });
+	test.driver.CloseWindow(test.Window());
+	EXPECT_TRUE(BMessenger(test.Window()).IsValid());
+	test.driver.Key("w", B_COMMAND_KEY);
+	EXPECT_TRUE(BMessenger(test.Window()).IsValid());
+}
+
+
 TEST(Window, TypesAreLooksAndFeels)
 {
 	TestWindow test;
