@@ -286,6 +286,18 @@ Driver::Key(const char* name, uint32 modifiers, int32 times)
 
 
 void
+Driver::KeyThatTypes(std::string_view bytes)
+{
+	const KeyStroke stroke { .text = std::string(bytes) };
+	_Wait();
+	fInput->KeyDown(stroke);
+	_Wait();
+	fInput->KeyUp(stroke);
+	_Wait();
+}
+
+
+void
 Driver::KeyDown(const char* name, uint32 modifiers)
 {
 	_Key(true, name, modifiers);

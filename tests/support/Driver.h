@@ -51,6 +51,8 @@ public:
 	void Type(std::string_view utf8); // '\n' is Return, '\t' Tab
 	// A name of the play language ("Return", "Left", "F1", ...) or one character.
 	void Key(const char* name, uint32 modifiers = 0, int32 times = 1);
+	// A key to which the keyboard's layout gives several bytes, none of them zero.
+	void KeyThatTypes(std::string_view bytes);
 	void KeyDown(const char* name, uint32 modifiers = 0);
 	void KeyUp(const char* name, uint32 modifiers = 0);
 

@@ -23,8 +23,23 @@
 #include "archive/ViewTree.h"
 #include "support/TestWindow.h"
 #include "work/WorkBackgroundView.h"
+#include "work/WorkViewFixture.h"
 
 namespace {
+
+
+// Another program's view, so to speak: what is pressed there drags a message along.
+class SourceView : public BView {
+public:
+	SourceView() : BView(BRect(0, 360, 99, 389), "source", B_FOLLOW_NONE, B_WILL_DRAW) {}
+
+	void MouseDown(BPoint where) override
+	{
+		DragMessage(&message, BRect(where, where + BPoint(9, 9)));
+	}
+
+	BMessage message;
+};
 
 
 class WorkViewDropTest : public testing::Test {
@@ -35,6 +50,7 @@ protected:
 		window.Add(listener);
 		workView = new WorkView(BRect(20, 20, 449, 349), B_FOLLOW_ALL_SIDES, listener);
 		window.Add(workView);
+		source = window.Add(new SourceView);
 		root = new BView(BRect(0, 0, 299, 199), "root", B_FOLLOW_LEFT | B_FOLLOW_TOP, B_WILL_DRAW);
 		root->AddChild(new BButton(BRect(20, 20, 99, 44), "button", "Press", NULL));
 		box = new BBox(BRect(140, 20, 279, 179), "box");
@@ -49,24 +65,37 @@ protected:
 	{
 		BView* view = Find(name);
 		window.driver.Click(view, BPoint(10, 10));
-		const BPoint from = Driver::PointIn(view, BPoint(10, 10));
-		window.driver.Drag(from, Driver::PointIn(to, where), 10, 1, modifiers);
+		Drag(Driver::PointIn(view, BPoint(10, 10)), Driver::PointIn(to, where), modifiers);
 	}
 
-	// As a drag from elsewhere delivers it.
-	void Drop(BMessage* message, BView* target, BPoint where)
+	// To that very place, which may be between points.
+	void Drag(BPoint from, BPoint to, uint32 modifiers = 0)
 	{
-		message->AddPoint("_drop_point_", Driver::PointIn(target, where));
-		message->AddPoint("_drop_offset_", BPoint(0, 0));
-		window.Window()->PostMessage(message, target);
-		Driver::WaitUntilIdle();
+		window.driver.MoveTo(from);
+		window.driver.Press(1, modifiers);
+		window.driver.MoveTo(from + BPoint(8, 8), modifiers);
+		window.driver.MoveTo(to, modifiers);
+		window.driver.Release(1, modifiers);
+		window.driver.MoveTo(to); // lets go of the keys
+	}
+
+	// Held at its left top.
+	void Drop(const BMessage& message, BView* target, BPoint where)
+	{
+		window.Locked([&] { source->message = message; });
+		Drag(Driver::PointIn(source, BPoint(20, 10)), Driver::PointIn(target, where));
 	}
 
 	TestWindow window;
 	WorkView* workView;
+	SourceView* source;
 	BView* root;
 	BBox* box;
 };
+
+
+// On a screen of two pixels a point, where the pointer may be between points.
+class SharpDropTest : private SharpScreen, public WorkViewDropTest {};
 
 
 } // namespace
@@ -220,7 +249,7 @@ TEST_F(WorkViewDropTest, AMenuBarEndsAtTheLeftTop)
 	BMenuBar bar(BRect(0, 0, 100, 18), "bar");
 	BMessage drag;
 	MakeDragMessage(&bar, &drag);
-	Drop(&drag, box, BPoint(40, 40));
+	Drop(drag, box, BPoint(40, 40));
 	BView* dropped = Find("bar");
 	ASSERT_NE(nullptr, dropped);
 	EXPECT_EQ(box, dropped->Parent());
@@ -234,7 +263,7 @@ TEST_F(WorkViewDropTest, OnlyADroppedArchiveKeepsItsMenuBarWhereItFalls)
 	for (const uint32 code : { 'drpp', 'drop' }) {
 		BMessage archive(code);
 		bar.Archive(&archive, true);
-		Drop(&archive, box, BPoint(40, 40));
+		Drop(archive, box, BPoint(40, 40));
 		BView* dropped = box->ChildAt(box->CountChildren() - 1);
 		EXPECT_STREQ("bar", dropped->Name());
 		EXPECT_EQ(code == 'drop' ? BPoint(40, 40) : BPoint(0, 0), dropped->Frame().LeftTop());
@@ -243,13 +272,21 @@ TEST_F(WorkViewDropTest, OnlyADroppedArchiveKeepsItsMenuBarWhereItFalls)
 }
 
 
-TEST_F(WorkViewDropTest, ADropBetweenPixelsFallsOnTheNearest)
+TEST_F(SharpDropTest, ADropBetweenPixelsFallsOnTheNearest)
 {
 	BView view(BRect(0, 0, 30, 30), "fresh", B_FOLLOW_NONE, B_WILL_DRAW);
 	BMessage archive('drop');
 	view.Archive(&archive, true);
-	Drop(&archive, root, BPoint(25.25, 150.75));
-	EXPECT_EQ(BRect(25, 151, 55, 181), Find("fresh")->Frame());
+	Drop(archive, root, BPoint(25.5, 150.5));
+	EXPECT_EQ(BRect(26, 151, 56, 181), Find("fresh")->Frame());
+}
+
+
+TEST_F(SharpDropTest, ADragThatEndsBetweenPixelsPutsTheViewOnTheNearest)
+{
+	DragSelected("button", root, BPoint(40.5, 130.5));
+	ASSERT_NE(nullptr, Find("button"));
+	EXPECT_EQ(BRect(31, 121, 110, 145), Find("button")->Frame());
 }
 
 
@@ -258,7 +295,7 @@ TEST_F(WorkViewDropTest, AnArchiveIsAddedWhereItIsDropped)
 	BView view(BRect(0, 0, 30, 30), "fresh", B_FOLLOW_NONE, B_WILL_DRAW);
 	BMessage archive('drop');
 	view.Archive(&archive, true);
-	Drop(&archive, root, BPoint(25, 150));
+	Drop(archive, root, BPoint(25, 150));
 	ASSERT_NE(nullptr, Find("fresh"));
 	EXPECT_EQ(BPoint(25, 150), Find("fresh")->Frame().LeftTop());
 	EXPECT_EQ(Find("fresh"), workView->SelectedView());
@@ -269,14 +306,14 @@ TEST_F(WorkViewDropTest, RubbishBeepsAndChangesNothing)
 {
 	const int32 beeps = Driver::CountBeeps();
 	BMessage empty('DATA');
-	Drop(&empty, root, BPoint(25, 150));
+	Drop(empty, root, BPoint(25, 150));
 	BMessage unknown('drop');
 	unknown.AddString("class", "NoSuchClass");
-	Drop(&unknown, root, BPoint(25, 150));
+	Drop(unknown, root, BPoint(25, 150));
 	BMenuItem item("no view", NULL);
 	BMessage noView('drop');
 	item.Archive(&noView, true);
-	Drop(&noView, root, BPoint(25, 150));
+	Drop(noView, root, BPoint(25, 150));
 	EXPECT_EQ(beeps + 3, Driver::CountBeeps());
 	EXPECT_EQ(2, root->CountChildren());
 	EXPECT_EQ(root, workView->SelectedView());
@@ -291,7 +328,7 @@ TEST_F(WorkViewDropTest, APictureBecomesABitmapView)
 	ASSERT_EQ(B_OK, get_ref_for_path(path.c_str(), &ref));
 	BMessage drop('DATA');
 	drop.AddRef("refs", &ref);
-	Drop(&drop, root, BPoint(5, 150));
+	Drop(drop, root, BPoint(5, 150));
 
 	BitmapView* view = dynamic_cast<BitmapView*>(Find("dropped picture.png"));
 	ASSERT_NE(nullptr, view);
@@ -319,7 +356,7 @@ TEST_F(WorkViewDropTest, AFileOfAViewComesBack)
 	ASSERT_EQ(B_OK, get_ref_for_path(path.c_str(), &ref));
 	BMessage drop('DATA');
 	drop.AddRef("refs", &ref);
-	Drop(&drop, root, BPoint(5, 150));
+	Drop(drop, root, BPoint(5, 150));
 	EXPECT_NE(nullptr, dynamic_cast<BButton*>(Find("filed")));
 }
 
@@ -330,9 +367,7 @@ TEST_F(WorkViewDropTest, TheGroundAsksBeforeItReplaces)
 		BView view(BRect(0, 0, 80, 80), "fresh", B_FOLLOW_NONE, B_WILL_DRAW);
 		BMessage archive('drop');
 		view.Archive(&archive, true);
-		archive.AddPoint("_drop_point_", BPoint(400, 300));
-		window.Window()->PostMessage(&archive, workView->Container());
-		Driver::WaitUntilIdle();
+		Drop(archive, workView->Container(), BPoint(330, 230));
 		if (yes) {
 			BWindow* alert = be_app->WindowAt(be_app->CountWindows() - 1);
 			EXPECT_STREQ("Warning!", alert->Title());

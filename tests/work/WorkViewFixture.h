@@ -1,6 +1,7 @@
 // WorkViewFixture: a work view with a design in a window, used by mouse and keys.
 #pragma once
 
+#include <cstdlib>
 #include <vector>
 
 #include <gmock/gmock.h>
@@ -15,6 +16,12 @@
 #include "support/TestWindow.h"
 #include "work/WorkBackgroundView.h"
 #include "work/WorkView.h"
+
+
+// Of two pixels a point; to be made before the application.
+struct SharpScreen {
+	SharpScreen() { setenv("ARCHWAY_SCALE", "2", 1); }
+};
 
 
 // Stands for the editor: notes what it is told.

@@ -10,6 +10,10 @@ namespace {
 class WorkViewTest : public WorkViewFixture {};
 
 
+// On a screen of two pixels a point, where the pointer may be between points.
+class SharpWorkViewTest : private SharpScreen, public WorkViewFixture {};
+
+
 } // namespace
 
 
@@ -154,15 +158,14 @@ TEST_F(WorkViewTest, TheCornerResizes)
 }
 
 
-// As on a screen of two pixels a point.
-TEST_F(WorkViewTest, TheCornerStaysUnderThePointerInHalfSteps)
+TEST_F(SharpWorkViewTest, TheCornerStaysUnderThePointerInHalfSteps)
 {
 	window.driver.Click(plain);
 	window.driver.MoveTo(plain, FromCorner(plain, 3, 3));
 	const BPoint start = Driver::PointIn(plain, FromCorner(plain, 3, 3));
 	window.driver.Press();
 	for (int i = 1; i <= 40; i++)
-		window.driver.MoveTo(start + BPoint(0.5f * i, 0.25f * i));
+		window.driver.MoveTo(start + BPoint(0.5f * i, 0.5f * (i / 2)));
 	window.driver.Release();
 	EXPECT_EQ(BRect(20, 20, 139, 89), plain->Frame());
 }
@@ -200,7 +203,7 @@ TEST_F(WorkViewTest, TheResizeZoneEndsAtTwelve)
 }
 
 
-TEST_F(WorkViewTest, AHalfPixelInsideTheZoneResizes)
+TEST_F(SharpWorkViewTest, AHalfPixelInsideTheZoneResizes)
 {
 	window.driver.Click(plain);
 	window.driver.MoveTo(plain, FromCorner(plain, 6, 5.5));
@@ -295,10 +298,7 @@ TEST_F(WorkViewTest, EachByteOfAKeyActs)
 {
 	window.driver.Click(plain);
 	const char bytes[] = { B_LEFT_ARROW, B_UP_ARROW, B_LEFT_ARROW, '\0' };
-	BMessage key(B_KEY_DOWN);
-	key.AddString("bytes", bytes);
-	window.Window()->PostMessage(&key, workView);
-	Driver::WaitUntilIdle();
+	window.driver.KeyThatTypes(bytes);
 	EXPECT_EQ(BRect(18, 19, 117, 78), plain->Frame());
 	EXPECT_EQ(3, listener->moves);
 }
@@ -310,8 +310,19 @@ TEST_F(WorkViewTest, KeysAreTraced)
 	testing::internal::CaptureStdout();
 	window.driver.Key("Left");
 	window.driver.Key("a");
+	window.driver.Type("\u00e9");
 	fflush(stdout);
-	EXPECT_EQ("1c\n61\n", testing::internal::GetCapturedStdout());
+	EXPECT_EQ("1c\n61\nc3\na9\n", testing::internal::GetCapturedStdout());
+}
+
+
+// Steps are points, however many pixels that are.
+TEST_F(SharpWorkViewTest, ArrowKeysMoveByPoints)
+{
+	window.driver.Click(plain);
+	window.driver.Key("Right", 0, 3);
+	window.driver.Key("Up");
+	EXPECT_EQ(BRect(23, 19, 122, 78), plain->Frame());
 }
 
 
