@@ -42,7 +42,7 @@ public:
 	uint32 what = 0;
 
 	BMessage();
-	explicit BMessage(uint32 what);
+	BMessage(uint32 what);
 	BMessage(const BMessage& message);
 	BMessage(BMessage&& message);
 	virtual ~BMessage();

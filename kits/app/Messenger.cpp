@@ -83,7 +83,7 @@ status_t
 BMessenger::LockTargetWithTimeout(bigtime_t timeout) const
 {
 	const std::shared_ptr<LooperCore> core = IsTargetLocal() ? FindCore(fPort) : nullptr;
-	return core ? core->Lock(timeout) : B_BAD_PORT_ID;
+	return core ? core->Lock(timeout) : B_BAD_VALUE;
 }
 
 

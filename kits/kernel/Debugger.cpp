@@ -9,6 +9,7 @@
 
 static std::atomic<BPrivate::debugger_hook> sHook { nullptr };
 static std::atomic<int> sDisabled { 0 };
+static std::atomic<bool> sDebugEnabled { true };
 
 
 void
@@ -51,6 +52,20 @@ assertion_failed(const char* condition, const char* file, int line)
 	char text[512];
 	snprintf(text, sizeof(text), "%s:%d: assertion failed: %s", file, line, condition);
 	debugger(text);
+}
+
+
+bool
+set_debug_enabled(bool enabled)
+{
+	return sDebugEnabled.exchange(enabled);
+}
+
+
+bool
+is_debug_enabled()
+{
+	return sDebugEnabled;
 }
 
 

@@ -84,6 +84,9 @@ typedef struct {
 // treats all threads alike.
 thread_id spawn_thread(thread_func function, const char* name, int32 priority, void* data);
 status_t resume_thread(thread_id thread);
+// Ends a thread that was not resumed yet; the host cannot safely stop one that runs, so the answer
+// is then B_NOT_ALLOWED.
+status_t kill_thread(thread_id thread);
 // Waits for the end of the thread and gives its result; any number of threads may wait, also late.
 status_t wait_for_thread(thread_id thread, status_t* _returnCode);
 void exit_thread(status_t status);
@@ -97,7 +100,11 @@ int32 receive_data(thread_id* _sender, void* buffer, size_t bufferSize);
 bool has_data(thread_id thread);
 
 status_t _get_thread_info(thread_id id, thread_info* info, size_t size);
+// Walks the threads of a team (0 means this one), oldest first. The cookie starts at 0.
+status_t _get_next_thread_info(team_id team, int32* cookie, thread_info* info, size_t size);
 #define get_thread_info(id, info) _get_thread_info((id), (info), sizeof(*(info)))
+#define get_next_thread_info(team, cookie, info)                                                   \
+	_get_next_thread_info((team), (cookie), (info), sizeof(*(info)))
 
 // A slot of storage of which each thread has its own value, at first NULL.
 int32 tls_allocate(void);
@@ -131,9 +138,23 @@ status_t release_sem(sem_id id);
 status_t release_sem_etc(sem_id id, int32 count, uint32 flags);
 status_t get_sem_count(sem_id id, int32* _count);
 status_t _get_sem_info(sem_id id, sem_info* info, size_t size);
+status_t _get_next_sem_info(team_id team, int32* cookie, sem_info* info, size_t size);
 #define get_sem_info(id, info) _get_sem_info((id), (info), sizeof(*(info)))
+#define get_next_sem_info(team, cookie, info)                                                      \
+	_get_next_sem_info((team), (cookie), (info), sizeof(*(info)))
+// There is one team only, which owns everything already.
+status_t set_sem_owner(sem_id id, team_id team);
 
 // #pragma mark - ports
+
+typedef struct port_info {
+	port_id port;
+	team_id team;
+	char name[B_OS_NAME_LENGTH];
+	int32 capacity;
+	int32 queue_count;
+	int32 total_count; // messages written so far
+} port_info;
 
 port_id create_port(int32 capacity, const char* name);
 port_id find_port(const char* name);
@@ -148,6 +169,12 @@ ssize_t read_port_etc(
 ssize_t port_buffer_size(port_id id);
 ssize_t port_buffer_size_etc(port_id id, uint32 flags, bigtime_t timeout);
 ssize_t port_count(port_id id);
+status_t set_port_owner(port_id id, team_id team); // see set_sem_owner()
+status_t _get_port_info(port_id id, port_info* info, size_t size);
+status_t _get_next_port_info(team_id team, int32* cookie, port_info* info, size_t size);
+#define get_port_info(id, info) _get_port_info((id), (info), sizeof(*(info)))
+#define get_next_port_info(team, cookie, info)                                                     \
+	_get_next_port_info((team), (cookie), (info), sizeof(*(info)))
 
 // #pragma mark - areas
 
@@ -159,19 +186,57 @@ typedef struct area_info {
 	area_id area;
 	char name[B_OS_NAME_LENGTH];
 	size_t size;
+	uint32 lock;
 	uint32 protection;
 	team_id team;
+	uint32 ram_size;
+	uint32 copy_count;
+	uint32 in_count;
+	uint32 out_count;
 	void* address;
 } area_info;
 
 // Zeroed memory of whole pages; the size must be a multiple of B_PAGE_SIZE.
 area_id create_area(const char* name, void** _address, uint32 addressSpec, size_t size, uint32 lock,
 	uint32 protection);
+// The same memory at another address.
+area_id clone_area(
+	const char* name, void** _address, uint32 addressSpec, uint32 protection, area_id source);
 area_id find_area(const char* name);
 area_id area_for(void* address);
 status_t delete_area(area_id id);
+status_t set_area_protection(area_id id, uint32 protection);
+// The address stays; B_ERROR when there is no room behind the area, or it has clones.
+status_t resize_area(area_id id, size_t newSize);
 status_t _get_area_info(area_id id, area_info* info, size_t size);
+// The cookie starts at 0.
+status_t _get_next_area_info(team_id team, ssize_t* cookie, area_info* info, size_t size);
+#define get_next_area_info(team, cookie, info)                                                     \
+	_get_next_area_info((team), (cookie), (info), sizeof(*(info)))
 #define get_area_info(id, info) _get_area_info((id), (info), sizeof(*(info)))
+
+// #pragma mark - teams
+
+#define B_CURRENT_TEAM 0
+
+typedef struct {
+	team_id team;
+	int32 thread_count;
+	int32 image_count;
+	int32 area_count;
+	thread_id debugger_nub_thread;
+	port_id debugger_nub_port;
+	int32 argc;
+	char args[64];
+	uid_t uid;
+	gid_t gid;
+} team_info;
+
+// Of this team alone: B_BAD_TEAM_ID for others.
+status_t _get_team_info(team_id team, team_info* info, size_t size);
+status_t _get_next_team_info(int32* cookie, team_info* info, size_t size);
+#define get_team_info(team, info) _get_team_info((team), (info), sizeof(*(info)))
+#define get_next_team_info(cookie, info) _get_next_team_info((cookie), (info), sizeof(*(info)))
 
 // #pragma mark - system
 
@@ -185,6 +250,7 @@ typedef struct {
 
 status_t get_system_info(system_info* info);
 int32 is_computer_on(void);
+double is_computer_on_fire(void);
 
 #ifdef __cplusplus
 }

@@ -7,6 +7,8 @@
 #include <string>
 #include <vector>
 
+#include <unistd.h>
+
 #include "kernel/private/Deadline.h"
 #include "kernel/private/Table.h"
 
@@ -30,6 +32,7 @@ struct Port {
 	size_t capacity;
 	bool closed = false;
 	bool deleted = false;
+	int32 written = 0;
 	std::deque<PortMessage> messages;
 };
 
@@ -133,6 +136,7 @@ write_port_etc(
 
 	const char* bytes = static_cast<const char*>(buffer);
 	port->messages.push_back({ code, std::vector<char>(bytes, bytes + bufferSize) });
+	port->written++;
 	port->changed.notify_all();
 	return B_OK;
 }
@@ -201,4 +205,41 @@ port_count(port_id id)
 		return B_BAD_PORT_ID;
 	std::unique_lock lock(port->lock);
 	return static_cast<ssize_t>(port->messages.size());
+}
+
+
+status_t
+set_port_owner(port_id id, team_id team)
+{
+	if (ports().Get(id) == nullptr)
+		return B_BAD_PORT_ID;
+	return BPrivate::IsOwnTeam(team) ? B_OK : B_BAD_TEAM_ID;
+}
+
+
+status_t
+_get_port_info(port_id id, port_info* info, size_t size)
+{
+	if (info == nullptr || size != sizeof(port_info))
+		return B_BAD_VALUE;
+	std::shared_ptr<Port> port = ports().Get(id);
+	if (port == nullptr)
+		return B_BAD_PORT_ID;
+
+	memset(info, 0, sizeof(*info));
+	std::unique_lock lock(port->lock);
+	info->port = id;
+	info->team = getpid();
+	strncpy(info->name, port->name.c_str(), B_OS_NAME_LENGTH - 1);
+	info->capacity = static_cast<int32>(port->capacity);
+	info->queue_count = static_cast<int32>(port->messages.size());
+	info->total_count = port->written;
+	return B_OK;
+}
+
+
+status_t
+_get_next_port_info(team_id team, int32* cookie, port_info* info, size_t size)
+{
+	return BPrivate::NextInfo(ports(), team, cookie, info, size, _get_port_info);
 }

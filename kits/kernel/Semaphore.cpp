@@ -194,3 +194,19 @@ _get_sem_info(sem_id id, sem_info* info, size_t size)
 	info->latest_holder = semaphore->latestHolder;
 	return B_OK;
 }
+
+
+status_t
+_get_next_sem_info(team_id team, int32* cookie, sem_info* info, size_t size)
+{
+	return BPrivate::NextInfo(semaphores(), team, cookie, info, size, _get_sem_info);
+}
+
+
+status_t
+set_sem_owner(sem_id id, team_id team)
+{
+	if (semaphores().Get(id) == nullptr)
+		return B_BAD_SEM_ID;
+	return BPrivate::IsOwnTeam(team) ? B_OK : B_BAD_TEAM_ID;
+}

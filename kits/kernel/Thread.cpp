@@ -201,6 +201,24 @@ resume_thread(thread_id id)
 
 
 status_t
+kill_thread(thread_id id)
+{
+	std::shared_ptr<Thread> thread = registry().threads.Get(id);
+	if (thread == nullptr)
+		return B_BAD_THREAD_ID;
+	std::unique_lock lock(thread->lock);
+	if (thread->finished)
+		return B_BAD_THREAD_ID;
+	if (thread->started)
+		return B_NOT_ALLOWED;
+	thread->started = true;
+	lock.unlock();
+	finish(*thread, B_INTERRUPTED);
+	return B_OK;
+}
+
+
+status_t
 wait_for_thread(thread_id id, status_t* _returnCode)
 {
 	std::shared_ptr<Thread> thread = registry().threads.Get(id);
@@ -361,6 +379,13 @@ _get_thread_info(thread_id id, thread_info* info, size_t size)
 		&& clock_gettime(clock, &used) == 0)
 		info->user_time = bigtime_t(used.tv_sec) * 1000000 + used.tv_nsec / 1000;
 	return B_OK;
+}
+
+
+status_t
+_get_next_thread_info(team_id team, int32* cookie, thread_info* info, size_t size)
+{
+	return BPrivate::NextInfo(registry().threads, team, cookie, info, size, _get_thread_info);
 }
 
 

@@ -270,7 +270,7 @@ BDirectory::GetNextDirents(struct dirent* buffer, size_t length, int32 count)
 	if (buffer == NULL)
 		return B_BAD_VALUE;
 	if (InitCheck() != B_OK)
-		return InitCheck();
+		return B_FILE_ERROR;
 	if (fIterator == NULL && Rewind() != B_OK)
 		return B_FILE_ERROR;
 
@@ -299,7 +299,7 @@ status_t
 BDirectory::Rewind()
 {
 	if (InitCheck() != B_OK)
-		return InitCheck();
+		return B_FILE_ERROR;
 	if (fIterator != NULL) {
 		rewinddir(fIterator);
 		return B_OK;

@@ -141,6 +141,8 @@ BFile::Read(void* buffer, size_t size)
 {
 	if (InitCheck() != B_OK)
 		return InitCheck();
+	if (!IsReadable())
+		return B_NOT_ALLOWED;
 	return Transfer(size, [&](size_t done, size_t left) {
 		return read(_Fd(), static_cast<char*>(buffer) + done, left);
 	});
@@ -152,6 +154,8 @@ BFile::ReadAt(off_t location, void* buffer, size_t size)
 {
 	if (InitCheck() != B_OK)
 		return InitCheck();
+	if (!IsReadable())
+		return B_NOT_ALLOWED;
 	if (location < 0)
 		return B_BAD_VALUE;
 	return Transfer(size, [&](size_t done, size_t left) {
@@ -165,6 +169,8 @@ BFile::Write(const void* buffer, size_t size)
 {
 	if (InitCheck() != B_OK)
 		return InitCheck();
+	if (!IsWritable())
+		return B_NOT_ALLOWED;
 	return Transfer(size, [&](size_t done, size_t left) {
 		return write(_Fd(), static_cast<const char*>(buffer) + done, left);
 	});
@@ -176,6 +182,8 @@ BFile::WriteAt(off_t location, const void* buffer, size_t size)
 {
 	if (InitCheck() != B_OK)
 		return InitCheck();
+	if (!IsWritable())
+		return B_NOT_ALLOWED;
 	if (location < 0)
 		return B_BAD_VALUE;
 	return Transfer(size, [&](size_t done, size_t left) {

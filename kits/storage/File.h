@@ -26,7 +26,8 @@ public:
 	bool IsReadable() const;
 	bool IsWritable() const;
 
-	// The number of bytes, or an error. An interrupted call is continued.
+	// The number of bytes, or an error: B_NOT_ALLOWED when it was not opened for that. An
+	// interrupted call is continued.
 	virtual ssize_t Read(void* buffer, size_t size);
 	virtual ssize_t ReadAt(off_t location, void* buffer, size_t size);
 	virtual ssize_t Write(const void* buffer, size_t size);

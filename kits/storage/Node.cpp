@@ -4,7 +4,6 @@
 #include <fcntl.h>
 #include <stdlib.h>
 #include <string.h>
-#include <sys/file.h>
 #include <unistd.h>
 
 #include <algorithm>
@@ -179,10 +178,8 @@ status_t
 BNode::Lock()
 {
 	if (fCStatus != B_OK)
-		return fCStatus;
-	if (flock(_Fd(), LOCK_EX | LOCK_NB) < 0)
-		return errno == EWOULDBLOCK ? B_BUSY : LastStatus();
-	return B_OK;
+		return B_FILE_ERROR;
+	return fDescriptor->Lock();
 }
 
 
@@ -190,8 +187,8 @@ status_t
 BNode::Unlock()
 {
 	if (fCStatus != B_OK)
-		return fCStatus;
-	return flock(_Fd(), LOCK_UN) < 0 ? LastStatus() : B_OK;
+		return B_FILE_ERROR;
+	return fDescriptor->Unlock();
 }
 
 
@@ -199,7 +196,7 @@ status_t
 BNode::Sync()
 {
 	if (fCStatus != B_OK)
-		return fCStatus;
+		return B_FILE_ERROR;
 	while (fsync(_Fd()) < 0) {
 		if (errno != EINTR)
 			return LastStatus();
@@ -215,7 +212,7 @@ ssize_t
 BNode::WriteAttr(const char* name, type_code type, off_t offset, const void* buffer, size_t length)
 {
 	if (fCStatus != B_OK)
-		return fCStatus;
+		return B_FILE_ERROR;
 	if (name == NULL || buffer == NULL || offset < 0)
 		return B_BAD_VALUE;
 	// More than any file system of the host keeps in an attribute.
@@ -243,7 +240,7 @@ ssize_t
 BNode::ReadAttr(const char* name, type_code, off_t offset, void* buffer, size_t length) const
 {
 	if (fCStatus != B_OK)
-		return fCStatus;
+		return B_FILE_ERROR;
 	if (name == NULL || buffer == NULL || offset < 0)
 		return B_BAD_VALUE;
 
@@ -263,7 +260,7 @@ status_t
 BNode::RemoveAttr(const char* name)
 {
 	if (fCStatus != B_OK)
-		return fCStatus;
+		return B_FILE_ERROR;
 	return RemoveAttribute(_Fd(), name);
 }
 
@@ -272,7 +269,7 @@ status_t
 BNode::RenameAttr(const char* oldName, const char* newName)
 {
 	if (fCStatus != B_OK)
-		return fCStatus;
+		return B_FILE_ERROR;
 	if (oldName == NULL || newName == NULL)
 		return B_BAD_VALUE;
 	AttributeValue value;
@@ -288,7 +285,7 @@ status_t
 BNode::GetAttrInfo(const char* name, struct attr_info* _info) const
 {
 	if (fCStatus != B_OK)
-		return fCStatus;
+		return B_FILE_ERROR;
 	if (name == NULL || _info == NULL)
 		return B_BAD_VALUE;
 	AttributeValue value;
@@ -307,7 +304,7 @@ BNode::GetNextAttrName(char* buffer)
 	if (buffer == NULL)
 		return B_BAD_VALUE;
 	if (fCStatus != B_OK)
-		return fCStatus;
+		return B_FILE_ERROR;
 	if (fAttributes == nullptr) {
 		auto attributes = std::make_unique<AttributeNames>();
 		const status_t status = ListAttributes(_Fd(), &attributes->names);
@@ -326,7 +323,7 @@ status_t
 BNode::RewindAttrs()
 {
 	if (fCStatus != B_OK)
-		return fCStatus;
+		return B_FILE_ERROR;
 	fAttributes.reset();
 	return B_OK;
 }
@@ -347,7 +344,7 @@ status_t
 BNode::ReadAttrString(const char* name, BString* _result) const
 {
 	if (fCStatus != B_OK)
-		return fCStatus;
+		return B_FILE_ERROR;
 	if (name == NULL || _result == NULL)
 		return B_BAD_VALUE;
 	AttributeValue value;
@@ -422,8 +419,12 @@ BNode::set_stat(struct stat& stat, uint32 what)
 status_t
 BNode::_SetTo(int directoryFd, const char* path)
 {
+	if (path == NULL && directoryFd == AT_FDCWD) {
+		Unset();
+		return fCStatus = B_BAD_VALUE;
+	}
 	if (path == NULL)
-		path = directoryFd == AT_FDCWD ? "" : ".";
+		path = ".";
 	if (path[0] == '\0') {
 		Unset();
 		return fCStatus = B_ENTRY_NOT_FOUND;

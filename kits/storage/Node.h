@@ -55,7 +55,9 @@ public:
 	status_t SetTo(const BDirectory* directory, const char* path);
 	void Unset();
 
-	// Advisory, between programs that lock too. B_BUSY when it is locked.
+	// These and the attribute functions answer B_FILE_ERROR when there is no node. A lock is
+	// advisory, between those who lock too: B_BUSY when it is locked, B_BAD_VALUE for unlocking
+	// what was not. It ends with the node and its copies.
 	status_t Lock();
 	status_t Unlock();
 	status_t Sync();

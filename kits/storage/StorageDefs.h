@@ -19,6 +19,7 @@
 // Shorter than on the original system: the host's attribute names carry a prefix.
 #define B_ATTR_NAME_LENGTH 247
 #define B_MIME_TYPE_LENGTH 239
+#define B_DEV_NAME_LENGTH 128
 #define B_MAX_SYMLINKS 16
 
 // The host's own values, so that both families of names may be mixed.

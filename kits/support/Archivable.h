@@ -9,7 +9,7 @@ class BMessage;
 class BArchivable {
 public:
 	BArchivable();
-	explicit BArchivable(BMessage* from);
+	BArchivable(BMessage* from);
 	virtual ~BArchivable();
 
 	// Writes the name of the dynamic class as the first entry of "class".

@@ -30,18 +30,39 @@ float __swap_float(float value);
 }
 #endif
 
-#define B_SWAP_INT16(value) ((int16)__builtin_bswap16((uint16)(value)))
-#define B_SWAP_INT32(value) ((int32)__builtin_bswap32((uint32)(value)))
-#define B_SWAP_INT64(value) ((int64)__builtin_bswap64((uint64)(value)))
+static inline uint16
+__swap_int16(uint16 value)
+{
+	return __builtin_bswap16(value);
+}
+
+
+static inline uint32
+__swap_int32(uint32 value)
+{
+	return __builtin_bswap32(value);
+}
+
+
+static inline uint64
+__swap_int64(uint64 value)
+{
+	return __builtin_bswap64(value);
+}
+
+// Integers come out unsigned, whatever they were.
+#define B_SWAP_INT16(value) __swap_int16((uint16)(value))
+#define B_SWAP_INT32(value) __swap_int32((uint32)(value))
+#define B_SWAP_INT64(value) __swap_int64((uint64)(value))
 #define B_SWAP_FLOAT(value) __swap_float(value)
 #define B_SWAP_DOUBLE(value) __swap_double(value)
 
 #if __BYTE_ORDER__ == __ORDER_LITTLE_ENDIAN__
 #define B_HOST_IS_LENDIAN 1
 #define B_HOST_IS_BENDIAN 0
-#define B_HOST_TO_LENDIAN_INT16(value) ((int16)(value))
-#define B_HOST_TO_LENDIAN_INT32(value) ((int32)(value))
-#define B_HOST_TO_LENDIAN_INT64(value) ((int64)(value))
+#define B_HOST_TO_LENDIAN_INT16(value) ((uint16)(value))
+#define B_HOST_TO_LENDIAN_INT32(value) ((uint32)(value))
+#define B_HOST_TO_LENDIAN_INT64(value) ((uint64)(value))
 #define B_HOST_TO_LENDIAN_FLOAT(value) ((float)(value))
 #define B_HOST_TO_LENDIAN_DOUBLE(value) ((double)(value))
 #define B_HOST_TO_BENDIAN_INT16(value) B_SWAP_INT16(value)
@@ -57,9 +78,9 @@ float __swap_float(float value);
 #define B_HOST_TO_LENDIAN_INT64(value) B_SWAP_INT64(value)
 #define B_HOST_TO_LENDIAN_FLOAT(value) B_SWAP_FLOAT(value)
 #define B_HOST_TO_LENDIAN_DOUBLE(value) B_SWAP_DOUBLE(value)
-#define B_HOST_TO_BENDIAN_INT16(value) ((int16)(value))
-#define B_HOST_TO_BENDIAN_INT32(value) ((int32)(value))
-#define B_HOST_TO_BENDIAN_INT64(value) ((int64)(value))
+#define B_HOST_TO_BENDIAN_INT16(value) ((uint16)(value))
+#define B_HOST_TO_BENDIAN_INT32(value) ((uint32)(value))
+#define B_HOST_TO_BENDIAN_INT64(value) ((uint64)(value))
 #define B_HOST_TO_BENDIAN_FLOAT(value) ((float)(value))
 #define B_HOST_TO_BENDIAN_DOUBLE(value) ((double)(value))
 #endif

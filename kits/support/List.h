@@ -6,7 +6,7 @@
 // Owns only its array, never what the pointers point to. Not thread-safe.
 class BList {
 public:
-	explicit BList(int32 itemsPerBlock = 20);
+	BList(int32 itemsPerBlock = 20);
 	BList(const BList& other);
 	virtual ~BList();
 

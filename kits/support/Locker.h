@@ -8,8 +8,8 @@
 class BLocker {
 public:
 	BLocker();
-	explicit BLocker(const char* name);
-	explicit BLocker(bool benaphoreStyle);
+	BLocker(const char* name);
+	BLocker(bool benaphoreStyle);
 	BLocker(const char* name, bool benaphoreStyle);
 	virtual ~BLocker();
 

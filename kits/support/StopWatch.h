@@ -6,7 +6,7 @@
 // The destructor prints the time and the laps on standard output, unless it is silent.
 class BStopWatch {
 public:
-	explicit BStopWatch(const char* name, bool silent = false);
+	BStopWatch(const char* name, bool silent = false);
 	virtual ~BStopWatch();
 
 	void Suspend();

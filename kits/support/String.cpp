@@ -106,8 +106,10 @@ find_first(const char* text, int32 textLength, const char* pattern, int32 from, 
 {
 	if (pattern == nullptr)
 		return B_BAD_VALUE;
+	if (from < 0)
+		return B_ERROR;
 	const int32 length = safe_length(pattern);
-	for (int32 at = max_c(from, 0); at <= textLength - length; at++) {
+	for (int32 at = from; at <= textLength - length; at++) {
 		if (matches(text + at, pattern, length, ignoreCase))
 			return at;
 	}
@@ -750,7 +752,7 @@ BString::FindFirst(char character) const
 int32
 BString::FindFirst(char character, int32 fromOffset) const
 {
-	for (int32 i = max_c(fromOffset, 0); i < Length(); i++) {
+	for (int32 i = fromOffset; i >= 0 && i < Length(); i++) {
 		if (fData[i] == character)
 			return i;
 	}

@@ -215,6 +215,18 @@ operator>(const char* a, const BString& b)
 }
 
 inline bool
+operator<=(const char* a, const BString& b)
+{
+	return b >= a;
+}
+
+inline bool
+operator>=(const char* a, const BString& b)
+{
+	return b <= a;
+}
+
+inline bool
 operator==(const char* a, const BString& b)
 {
 	return b == a;

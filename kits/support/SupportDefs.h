@@ -27,6 +27,15 @@ typedef volatile uint32 vuint32;
 typedef volatile int64 vint64;
 typedef volatile uint64 vuint64;
 
+typedef volatile char vchar;
+typedef volatile short vshort;
+typedef volatile int vint;
+typedef volatile long vlong;
+typedef volatile unsigned char vuchar;
+typedef volatile unsigned short vushort;
+typedef volatile unsigned int vuint;
+typedef volatile unsigned long vulong;
+
 typedef unsigned char uchar;
 typedef unsigned short unichar;
 
@@ -46,6 +55,13 @@ typedef uint32 perform_code;
 #define NULL 0
 #endif
 
+#ifndef TRUE
+#define TRUE 1
+#endif
+#ifndef FALSE
+#define FALSE 0
+#endif
+
 #define min_c(a, b) ((a) > (b) ? (b) : (a))
 #define max_c(a, b) ((a) > (b) ? (a) : (b))
 
@@ -56,13 +72,18 @@ extern "C" {
 #endif
 
 // Each returns the value before the change and is a full memory barrier.
-int32 atomic_set(int32* value, int32 newValue);
-int32 atomic_test_and_set(int32* value, int32 newValue, int32 testAgainst);
-int32 atomic_add(int32* value, int32 addValue);
-int32 atomic_and(int32* value, int32 andValue);
-int32 atomic_or(int32* value, int32 orValue);
-int32 atomic_get(int32* value);
-
+int32 atomic_set(vint32* value, int32 newValue);
+int32 atomic_test_and_set(vint32* value, int32 newValue, int32 testAgainst);
+int32 atomic_add(vint32* value, int32 addValue);
+int32 atomic_and(vint32* value, int32 andValue);
+int32 atomic_or(vint32* value, int32 orValue);
+int32 atomic_get(vint32* value);
+int64 atomic_set64(vint64* value, int64 newValue);
+int64 atomic_test_and_set64(vint64* value, int64 newValue, int64 testAgainst);
+int64 atomic_add64(vint64* value, int64 addValue);
+int64 atomic_and64(vint64* value, int64 andValue);
+int64 atomic_or64(vint64* value, int64 orValue);
+int64 atomic_get64(vint64* value);
 
 #ifdef __cplusplus
 }

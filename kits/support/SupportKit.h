@@ -5,6 +5,7 @@
 #include <Autolock.h>
 #include <BeBuild.h>
 #include <Beep.h>
+#include <BlockCache.h>
 #include <ByteOrder.h>
 #include <ClassInfo.h>
 #include <DataIO.h>

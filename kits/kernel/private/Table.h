@@ -7,7 +7,9 @@
 #include <unordered_map>
 #include <vector>
 
-#include <SupportDefs.h>
+#include <unistd.h>
+
+#include <OS.h>
 
 namespace BPrivate {
 
@@ -60,11 +62,56 @@ public:
 		return -1;
 	}
 
+	// The smallest id above the given one, or -1.
+	int32 Next(int32 id) const
+	{
+		std::shared_lock lock(fLock);
+		int32 next = -1;
+		for (const auto& entry : fObjects) {
+			if (entry.first > id && (next < 0 || entry.first < next))
+				next = entry.first;
+		}
+		return next;
+	}
+
+	int32 Count() const
+	{
+		std::shared_lock lock(fLock);
+		return static_cast<int32>(fObjects.size());
+	}
+
 private:
 	mutable std::shared_mutex fLock;
 	std::unordered_map<int32, std::shared_ptr<T>> fObjects;
 	int32 fNextID = 0;
 };
+
+// Whether the id names this team, the only one that is known.
+inline bool
+IsOwnTeam(team_id team)
+{
+	return team == B_CURRENT_TEAM || team == getpid();
+}
+
+// Gives the next object of a team to a function that fills its information. The cookie is the last
+// id that was given.
+template<typename T, typename Info>
+status_t
+NextInfo(const Table<T>& table, team_id team, int32* cookie, Info* info, size_t size,
+	status_t (*fill)(int32, Info*, size_t))
+{
+	if (cookie == nullptr || info == nullptr || size != sizeof(Info) || *cookie < 0)
+		return B_BAD_VALUE;
+	if (!IsOwnTeam(team))
+		return B_BAD_TEAM_ID;
+	// What goes away meanwhile is passed over.
+	for (int32 id; (id = table.Next(*cookie)) >= 0;) {
+		*cookie = id;
+		if (fill(id, info, size) == B_OK)
+			return B_OK;
+	}
+	return B_BAD_VALUE;
+}
 
 
 } // namespace BPrivate

@@ -3,6 +3,7 @@
 #include <errno.h>
 #include <fcntl.h>
 #include <limits.h>
+#include <sys/file.h>
 #include <sys/stat.h>
 #include <unistd.h>
 
@@ -30,6 +31,32 @@ Descriptor::Replace(int fd)
 		if (errno != EINTR && errno != EBUSY)
 			return LastStatus();
 	}
+	return B_OK;
+}
+
+
+status_t
+Descriptor::Lock()
+{
+	// The host lets the holder of a lock take it again, so we remember.
+	if (fLocked.exchange(true))
+		return B_BUSY;
+	if (flock(fFd, LOCK_EX | LOCK_NB) == 0)
+		return B_OK;
+	const status_t status = errno == EWOULDBLOCK ? B_BUSY : LastStatus();
+	fLocked = false;
+	return status;
+}
+
+
+status_t
+Descriptor::Unlock()
+{
+	if (!fLocked)
+		return B_BAD_VALUE;
+	if (flock(fFd, LOCK_UN) < 0)
+		return LastStatus();
+	fLocked = false;
 	return B_OK;
 }
 

@@ -1,6 +1,7 @@
 // Descriptor: one of the host's file descriptors, closed with its last owner.
 #pragma once
 
+#include <atomic>
 #include <memory>
 #include <string>
 
@@ -20,11 +21,17 @@ public:
 	// Lets all owners see what `fd` shows, which stays the caller's. The number stays the same.
 	status_t Replace(int fd);
 
+	// Keep other descriptors from locking the node: B_BUSY when somebody has done so, be it this
+	// one; B_BAD_VALUE for unlocking what was not locked here. Any thread.
+	status_t Lock();
+	status_t Unlock();
+
 private:
 	Descriptor(const Descriptor&);
 	Descriptor& operator=(const Descriptor&);
 
 	const int fFd;
+	std::atomic<bool> fLocked { false };
 };
 
 // A path under which the node can be found now; empty when it was deleted.

@@ -20,6 +20,7 @@ TEST(Messenger, IsInvalidAtFirst)
 	EXPECT_EQ(nullptr, messenger.Target(&looper));
 	EXPECT_EQ(nullptr, looper);
 	EXPECT_FALSE(messenger.LockTarget());
+	EXPECT_EQ(B_BAD_VALUE, messenger.LockTargetWithTimeout(0));
 	EXPECT_EQ(B_BAD_PORT_ID, messenger.SendMessage('what'));
 }
 

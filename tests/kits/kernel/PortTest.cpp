@@ -92,3 +92,73 @@ TEST(Area, IsZeroedMemory)
 	EXPECT_EQ(
 		B_BAD_VALUE, create_area("odd", &address, B_ANY_ADDRESS, 100, B_NO_LOCK, B_READ_AREA));
 }
+
+
+TEST(Port, TellsAboutItself)
+{
+	const port_id id = create_port(5, "told");
+	ASSERT_EQ(B_OK, write_port(id, 1, nullptr, 0));
+	ASSERT_EQ(B_OK, write_port(id, 2, nullptr, 0));
+	read_port(id, nullptr, nullptr, 0);
+	port_info info;
+	ASSERT_EQ(B_OK, get_port_info(id, &info));
+	EXPECT_STREQ("told", info.name);
+	EXPECT_EQ(5, info.capacity);
+	EXPECT_EQ(1, info.queue_count);
+	EXPECT_EQ(2, info.total_count);
+
+	bool found = false;
+	for (int32 cookie = 0; get_next_port_info(B_CURRENT_TEAM, &cookie, &info) == B_OK;)
+		found |= info.port == id;
+	EXPECT_TRUE(found);
+	EXPECT_EQ(B_OK, set_port_owner(id, info.team));
+	EXPECT_EQ(B_BAD_TEAM_ID, set_port_owner(id, -5));
+	delete_port(id);
+	EXPECT_EQ(B_BAD_PORT_ID, get_port_info(id, &info));
+	EXPECT_EQ(B_BAD_PORT_ID, set_port_owner(id, B_CURRENT_TEAM));
+}
+
+
+TEST(Area, ACloneIsTheSameMemory)
+{
+	void* address = nullptr;
+	const area_id id = create_area(
+		"mine", &address, B_ANY_ADDRESS, B_PAGE_SIZE, B_NO_LOCK, B_READ_AREA | B_WRITE_AREA);
+	ASSERT_LT(0, id);
+	void* same = nullptr;
+	const area_id clone = clone_area("clone", &same, B_ANY_ADDRESS, B_READ_AREA, id);
+	ASSERT_LT(0, clone);
+	EXPECT_NE(address, same);
+	static_cast<char*>(address)[7] = 'x';
+	EXPECT_EQ('x', static_cast<char*>(same)[7]);
+	EXPECT_EQ(B_ERROR, resize_area(id, 2 * B_PAGE_SIZE));
+	EXPECT_EQ(B_OK, delete_area(id));
+	EXPECT_EQ('x', static_cast<char*>(same)[7]);
+	EXPECT_EQ(B_OK, delete_area(clone));
+	EXPECT_EQ(B_BAD_VALUE, clone_area("none", &same, B_ANY_ADDRESS, B_READ_AREA, id));
+}
+
+
+TEST(Area, ChangesItsSizeAndProtection)
+{
+	void* address = nullptr;
+	const area_id id = create_area("changing", &address, B_ANY_ADDRESS, 4 * B_PAGE_SIZE, B_NO_LOCK,
+		B_READ_AREA | B_WRITE_AREA);
+	ASSERT_LT(0, id);
+	static_cast<char*>(address)[0] = 'x';
+	EXPECT_EQ(B_BAD_VALUE, resize_area(id, 100));
+	EXPECT_EQ(B_OK, resize_area(id, 2 * B_PAGE_SIZE));
+	EXPECT_EQ(B_OK, set_area_protection(id, B_READ_AREA));
+	area_info info;
+	ASSERT_EQ(B_OK, get_area_info(id, &info));
+	EXPECT_EQ(size_t(2 * B_PAGE_SIZE), info.size);
+	EXPECT_EQ(uint32(B_READ_AREA), info.protection);
+	EXPECT_EQ('x', static_cast<char*>(address)[0]);
+
+	bool found = false;
+	for (ssize_t cookie = 0; get_next_area_info(B_CURRENT_TEAM, &cookie, &info) == B_OK;)
+		found |= info.area == id;
+	EXPECT_TRUE(found);
+	delete_area(id);
+	EXPECT_EQ(B_BAD_VALUE, set_area_protection(id, B_READ_AREA));
+}

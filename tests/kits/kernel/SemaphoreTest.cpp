@@ -119,3 +119,19 @@ TEST(Semaphore, ReleasesAllWhoWait)
 	EXPECT_EQ(0, count);
 	delete_sem(sem);
 }
+
+
+TEST(Semaphore, IsAmongThoseOfTheTeam)
+{
+	const sem_id id = create_sem(3, "listed");
+	sem_info info;
+	bool found = false;
+	for (int32 cookie = 0; get_next_sem_info(B_CURRENT_TEAM, &cookie, &info) == B_OK;)
+		found |= info.sem == id && info.count == 3;
+	EXPECT_TRUE(found);
+	int32 cookie = 0;
+	EXPECT_EQ(B_BAD_TEAM_ID, get_next_sem_info(-5, &cookie, &info));
+	EXPECT_EQ(B_OK, set_sem_owner(id, B_CURRENT_TEAM));
+	delete_sem(id);
+	EXPECT_EQ(B_BAD_SEM_ID, set_sem_owner(id, B_CURRENT_TEAM));
+}

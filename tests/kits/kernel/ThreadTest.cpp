@@ -143,3 +143,37 @@ TEST(Time, RunsForwardAndSnoozeTakesAtLeastItsTime)
 	EXPECT_EQ(B_BAD_VALUE, snooze_until(end, 5));
 	EXPECT_LT(1600000000u, real_time_clock());
 }
+
+
+TEST(Thread, CanBeKilledBeforeItRuns)
+{
+	int32 number = 1;
+	const thread_id id = spawn_thread(double_it, "unborn", B_NORMAL_PRIORITY, &number);
+	EXPECT_EQ(B_OK, kill_thread(id));
+	EXPECT_EQ(B_BAD_THREAD_ID, kill_thread(id));
+	EXPECT_NE(B_OK, resume_thread(id));
+	EXPECT_EQ(B_NOT_ALLOWED, kill_thread(find_thread(nullptr)));
+}
+
+
+TEST(Thread, BelongsToItsTeam)
+{
+	const thread_id self = find_thread(nullptr);
+	thread_info info;
+	bool found = false;
+	for (int32 cookie = 0; get_next_thread_info(B_CURRENT_TEAM, &cookie, &info) == B_OK;)
+		found |= info.thread == self;
+	EXPECT_TRUE(found);
+
+	team_info team;
+	ASSERT_EQ(B_OK, get_team_info(B_CURRENT_TEAM, &team));
+	EXPECT_EQ(info.team, team.team);
+	EXPECT_LE(1, team.thread_count);
+	EXPECT_LE(1, team.image_count);
+	EXPECT_LE(1, team.argc);
+	EXPECT_NE('\0', team.args[0]);
+	EXPECT_EQ(B_BAD_TEAM_ID, get_team_info(-5, &team));
+	int32 cookie = 0;
+	EXPECT_EQ(B_OK, get_next_team_info(&cookie, &team));
+	EXPECT_EQ(B_BAD_VALUE, get_next_team_info(&cookie, &team));
+}

@@ -120,6 +120,47 @@ TEST(BNode, LockKeepsOthersOut)
 }
 
 
+TEST(BNode, IsLockedAndUnlockedOnce)
+{
+	TemporaryFolder folder;
+	WriteFile(folder / "file", "bytes");
+	BNode node((folder / "file").c_str());
+	EXPECT_EQ(B_BAD_VALUE, node.Unlock());
+	EXPECT_EQ(B_OK, node.Lock());
+	EXPECT_EQ(B_BUSY, node.Lock());
+	EXPECT_EQ(B_OK, node.Unlock());
+	EXPECT_EQ(B_BAD_VALUE, node.Unlock());
+	EXPECT_EQ(B_OK, node.Lock());
+}
+
+
+TEST(BNode, WithoutAFileNothingCanBeDone)
+{
+	BNode node;
+	BString text;
+	char buffer[B_ATTR_NAME_LENGTH + 1];
+	attr_info info;
+	EXPECT_EQ(B_FILE_ERROR, node.Lock());
+	EXPECT_EQ(B_FILE_ERROR, node.Unlock());
+	EXPECT_EQ(B_FILE_ERROR, node.Sync());
+	EXPECT_EQ(B_FILE_ERROR, node.WriteAttr("a", B_RAW_TYPE, 0, "x", 1));
+	EXPECT_EQ(B_FILE_ERROR, node.ReadAttr("a", B_RAW_TYPE, 0, buffer, 1));
+	EXPECT_EQ(B_FILE_ERROR, node.RemoveAttr("a"));
+	EXPECT_EQ(B_FILE_ERROR, node.RenameAttr("a", "b"));
+	EXPECT_EQ(B_FILE_ERROR, node.GetAttrInfo("a", &info));
+	EXPECT_EQ(B_FILE_ERROR, node.GetNextAttrName(buffer));
+	EXPECT_EQ(B_FILE_ERROR, node.RewindAttrs());
+	EXPECT_EQ(B_FILE_ERROR, node.ReadAttrString("a", &text));
+	EXPECT_EQ(B_BAD_VALUE, node.SetTo((const char*)NULL));
+
+	BDirectory directory;
+	entry_ref ref;
+	EXPECT_EQ(B_FILE_ERROR, directory.GetNextRef(&ref));
+	EXPECT_EQ(B_FILE_ERROR, directory.Rewind());
+	EXPECT_EQ(B_FILE_ERROR, directory.CountEntries());
+}
+
+
 TEST(BNode, StatFieldsCanBeSet)
 {
 	TemporaryFolder folder;
@@ -187,12 +228,16 @@ TEST(BFile, OpenModesDecide)
 	BFile file(path.c_str(), B_READ_ONLY);
 	EXPECT_TRUE(file.IsReadable());
 	EXPECT_FALSE(file.IsWritable());
-	EXPECT_GT(0, file.Write("x", 1));
+	EXPECT_EQ(B_NOT_ALLOWED, file.Write("x", 1));
+	EXPECT_EQ(B_NOT_ALLOWED, file.WriteAt(0, "x", 1));
 	EXPECT_EQ(
 		B_FILE_EXISTS, file.SetTo(path.c_str(), B_WRITE_ONLY | B_CREATE_FILE | B_FAIL_IF_EXISTS));
 	EXPECT_EQ(B_OK, file.SetTo(path.c_str(), B_WRITE_ONLY | B_OPEN_AT_END));
 	EXPECT_EQ(1, file.Write("!", 1));
 	EXPECT_EQ("bytes!", ReadFile(path));
+	char byte;
+	EXPECT_EQ(B_NOT_ALLOWED, file.Read(&byte, 1));
+	EXPECT_EQ(B_NOT_ALLOWED, file.ReadAt(0, &byte, 1));
 	BDirectory directory(folder.Path().c_str());
 	EXPECT_EQ(B_OK, file.SetTo(&directory, "file", B_READ_WRITE | B_ERASE_FILE));
 	EXPECT_EQ("", ReadFile(path));

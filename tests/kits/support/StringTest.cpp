@@ -218,3 +218,15 @@ TEST(String, IsAsAPlainStringAfterManyChanges)
 		ASSERT_EQ(int32(model.size()), text.Length());
 	}
 }
+
+
+TEST(String, IsNotSearchedFromBeforeItsBeginning)
+{
+	const BString string("hello");
+	EXPECT_EQ(B_ERROR, string.FindFirst("hello", -1));
+	EXPECT_EQ(B_ERROR, string.IFindFirst("hello", -1));
+	EXPECT_EQ(B_ERROR, string.FindFirst('h', -1));
+	EXPECT_EQ(B_ERROR, string.FindLast("hello", -1));
+	EXPECT_TRUE("hello" <= string && "hello" >= string);
+	EXPECT_FALSE("hellp" <= string || "helln" >= string);
+}
