@@ -123,3 +123,15 @@ enum {
 	B_ID_SPECIFIER = 7,
 	B_SPECIFIERS_END = 128,
 };
+
+#ifdef __cplusplus
+
+class BCursor;
+
+extern _EXPORT const BCursor* B_CURSOR_SYSTEM_DEFAULT;
+extern _EXPORT const BCursor* B_CURSOR_I_BEAM;
+// The classic data of the two.
+extern _EXPORT const unsigned char B_HAND_CURSOR[];
+extern _EXPORT const unsigned char B_I_BEAM_CURSOR[];
+
+#endif

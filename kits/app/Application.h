@@ -1,11 +1,14 @@
 // BApplication: the program, its connection to the desktop, and its main looper.
 #pragma once
 
+#include <AppDefs.h>
+#include <Cursor.h>
+#include <InterfaceDefs.h>
 #include <Looper.h>
 #include <Messenger.h>
 #include <Point.h>
+#include <Rect.h>
 
-class BCursor;
 class BMessageRunner;
 class BResources;
 class BWindow;

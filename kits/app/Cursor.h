@@ -3,6 +3,7 @@
 
 #include <memory>
 
+#include <AppDefs.h>
 #include <Archivable.h>
 #include <InterfaceDefs.h>
 
@@ -75,9 +76,3 @@ private:
 	std::shared_ptr<const BPrivate::CursorPicture> fPicture; // shared by copies
 	status_t fStatus = B_OK;
 };
-
-extern _EXPORT const BCursor* B_CURSOR_SYSTEM_DEFAULT;
-extern _EXPORT const BCursor* B_CURSOR_I_BEAM;
-// The classic data of the two.
-extern _EXPORT const unsigned char B_HAND_CURSOR[];
-extern _EXPORT const unsigned char B_I_BEAM_CURSOR[];

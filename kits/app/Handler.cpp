@@ -256,7 +256,9 @@ BHandler::GetSupportedSuites(BMessage* data)
 {
 	if (data == nullptr)
 		return B_BAD_VALUE;
-	return data->AddString("suites", "suite/vnd.Be-handler");
+	const status_t status = data->AddString("suites", "suite/vnd.Be-handler");
+	const BPropertyInfo properties(sHandlerProperties);
+	return status == B_OK ? data->AddFlat("messages", &properties) : status;
 }
 
 

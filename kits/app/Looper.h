@@ -4,6 +4,7 @@
 #include <memory>
 
 #include <Handler.h>
+#include <List.h>
 
 class BMessageQueue;
 

@@ -1,6 +1,10 @@
 // BMessage: a code and named fields, each a list of items of one type.
 #pragma once
 
+#include <AppDefs.h>
+#include <DataIO.h>
+#include <Entry.h>
+#include <Flattenable.h>
 #include <GraphicsDefs.h>
 #include <Messenger.h>
 #include <OS.h>
@@ -9,11 +13,8 @@
 #include <SupportDefs.h>
 #include <TypeConstants.h>
 
-class BDataIO;
-class BFlattenable;
 class BHandler;
 class BString;
-struct entry_ref;
 struct node_ref;
 
 namespace BPrivate {

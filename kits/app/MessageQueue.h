@@ -4,6 +4,7 @@
 #include <deque>
 #include <mutex>
 
+#include <Locker.h>
 #include <SupportDefs.h>
 
 class BMessage;

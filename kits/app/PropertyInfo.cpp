@@ -7,6 +7,8 @@
 #include <AppDefs.h>
 #include <Message.h>
 
+#include "app/private/PropertyForm.h"
+
 namespace {
 
 // A list without entries stands for everything.
@@ -35,10 +37,7 @@ BPropertyInfo::BPropertyInfo(property_info* properties, value_info* values, bool
 
 BPropertyInfo::~BPropertyInfo()
 {
-	if (!fFreeOnDelete)
-		return;
-	free(fProperties);
-	free(fValues);
+	_Release();
 }
 
 
@@ -106,4 +105,73 @@ BPropertyInfo::PrintToStream() const
 			fProperties[i].usage != nullptr ? fProperties[i].usage : "");
 	for (int32 i = 0; i < CountValues(); i++)
 		printf("%-20s 0x%08x\n", fValues[i].name, unsigned(fValues[i].value));
+}
+
+
+// #pragma mark - flattening
+
+
+bool
+BPropertyInfo::IsFixedSize() const
+{
+	return false;
+}
+
+
+type_code
+BPropertyInfo::TypeCode() const
+{
+	return B_PROPERTY_INFO_TYPE;
+}
+
+
+ssize_t
+BPropertyInfo::FlattenedSize() const
+{
+	return static_cast<ssize_t>(BPrivate::FlattenProperties(fProperties, fValues).size());
+}
+
+
+status_t
+BPropertyInfo::Flatten(void* buffer, ssize_t size) const
+{
+	const std::string bytes = BPrivate::FlattenProperties(fProperties, fValues);
+	if (buffer == nullptr || size < 0)
+		return B_BAD_VALUE;
+	if (static_cast<size_t>(size) < bytes.size())
+		return B_BUFFER_OVERFLOW;
+	memcpy(buffer, bytes.data(), bytes.size());
+	return B_OK;
+}
+
+
+status_t
+BPropertyInfo::Unflatten(type_code code, const void* buffer, ssize_t size)
+{
+	if (!AllowsTypeCode(code))
+		return B_BAD_TYPE;
+	if (buffer == nullptr || size < 0)
+		return B_BAD_VALUE;
+
+	_Release();
+	auto tables = BPrivate::UnflattenProperties({ static_cast<const char*>(buffer), size_t(size) });
+	if (tables == nullptr)
+		return B_BAD_DATA;
+	fUnflattened = std::move(tables);
+	fProperties = fUnflattened->properties.data();
+	fValues = fUnflattened->values.data();
+	return B_OK;
+}
+
+
+void
+BPropertyInfo::_Release()
+{
+	if (fFreeOnDelete && fUnflattened == nullptr) {
+		free(fProperties);
+		free(fValues);
+	}
+	fUnflattened.reset();
+	fProperties = nullptr;
+	fValues = nullptr;
 }

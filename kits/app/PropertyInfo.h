@@ -1,10 +1,17 @@
 // BPropertyInfo: which properties a class offers to scripting.
 #pragma once
 
+#include <memory>
+
+#include <Flattenable.h>
 #include <SupportDefs.h>
 #include <TypeConstants.h>
 
 class BMessage;
+
+namespace BPrivate {
+struct PropertyTables;
+}
 
 struct compound_type {
 	struct field_pair {
@@ -38,8 +45,9 @@ struct value_info {
 };
 
 
-// The lists are borrowed, and end with an entry without a name.
-class _EXPORT BPropertyInfo {
+// The lists are borrowed, and end with an entry without a name. Flattened it is B_PROPERTY_INFO_TYPE,
+// in a form of its own.
+class _EXPORT BPropertyInfo : public BFlattenable {
 public:
 	BPropertyInfo(
 		property_info* properties = NULL, value_info* values = NULL, bool freeOnDelete = false);
@@ -57,8 +65,18 @@ public:
 	int32 CountValues() const;
 	void PrintToStream() const;
 
+	bool IsFixedSize() const override;
+	type_code TypeCode() const override;
+	ssize_t FlattenedSize() const override;
+	status_t Flatten(void* buffer, ssize_t size) const override;
+	// The lists become its own. B_BAD_TYPE, or B_BAD_DATA and no lists.
+	status_t Unflatten(type_code code, const void* buffer, ssize_t size) override;
+
 private:
-	property_info* fProperties; // borrowed unless fFreeOnDelete
+	void _Release();
+
+	property_info* fProperties; // borrowed unless fFreeOnDelete or fUnflattened
 	value_info* fValues; // likewise
 	bool fFreeOnDelete;
+	std::unique_ptr<BPrivate::PropertyTables> fUnflattened; // owns the lists when they were read
 };

@@ -44,12 +44,28 @@ BRoster::IsRunning(const char* signature) const
 }
 
 
+bool
+BRoster::IsRunning(entry_ref* ref) const
+{
+	return TeamFor(ref) >= 0;
+}
+
+
 team_id
 BRoster::TeamFor(const char* signature) const
 {
 	const bool ours = be_app != nullptr && signature != nullptr
 		&& strcasecmp(signature, be_app->Signature()) == 0;
 	return ours ? getpid() : B_ERROR;
+}
+
+
+team_id
+BRoster::TeamFor(entry_ref* ref) const
+{
+	app_info info;
+	const bool known = ref != nullptr && GetRunningAppInfo(getpid(), &info) == B_OK;
+	return known && info.ref == *ref ? getpid() : B_ERROR;
 }
 
 
@@ -73,6 +89,13 @@ status_t
 BRoster::GetAppInfo(const char* signature, app_info* info) const
 {
 	return IsRunning(signature) ? GetRunningAppInfo(getpid(), info) : B_ERROR;
+}
+
+
+status_t
+BRoster::GetAppInfo(entry_ref* ref, app_info* info) const
+{
+	return IsRunning(ref) ? GetRunningAppInfo(getpid(), info) : B_ERROR;
 }
 
 
@@ -104,6 +127,13 @@ status_t
 BRoster::GetActiveAppInfo(app_info* info) const
 {
 	return GetRunningAppInfo(getpid(), info);
+}
+
+
+status_t
+BRoster::ActivateApp(team_id team) const
+{
+	return be_app != nullptr && team == getpid() ? B_NOT_SUPPORTED : B_BAD_TEAM_ID;
 }
 
 

@@ -2,12 +2,12 @@
 #pragma once
 
 #include <Entry.h>
+#include <Messenger.h>
 #include <OS.h>
 #include <SupportDefs.h>
 
 class BList;
 class BMessage;
-class BMessenger;
 
 struct _EXPORT app_info {
 	app_info();
@@ -28,6 +28,19 @@ struct _EXPORT app_info {
 #define B_BACKGROUND_APP 0x4
 #define B_ARGV_ONLY 0x8
 
+// What StartWatching() tells about, and the codes of what it sends.
+enum {
+	B_REQUEST_LAUNCHED = 0x1,
+	B_REQUEST_QUIT = 0x2,
+	B_REQUEST_ACTIVATED = 0x4,
+};
+
+enum {
+	B_SOME_APP_LAUNCHED = 'BRAS',
+	B_SOME_APP_QUIT = 'BRAQ',
+	B_SOME_APP_ACTIVATED = 'BRAW',
+};
+
 
 // Knows the applications of this team only: there is no registry of programs on this desktop.
 class _EXPORT BRoster {
@@ -36,12 +49,17 @@ public:
 	~BRoster();
 
 	bool IsRunning(const char* signature) const;
-	team_id TeamFor(const char* signature) const;
+	bool IsRunning(entry_ref* ref) const;
+	team_id TeamFor(const char* signature) const; // B_ERROR when it does not run
+	team_id TeamFor(entry_ref* ref) const;
 	void GetAppList(BList* teams) const;
 	void GetAppList(const char* signature, BList* teams) const;
 	status_t GetAppInfo(const char* signature, app_info* info) const;
+	status_t GetAppInfo(entry_ref* ref, app_info* info) const;
 	status_t GetRunningAppInfo(team_id team, app_info* info) const;
 	status_t GetActiveAppInfo(app_info* info) const;
+	// The window manager decides who is in front: B_NOT_SUPPORTED for the running application.
+	status_t ActivateApp(team_id team) const;
 	status_t Broadcast(BMessage* message) const;
 	status_t Broadcast(BMessage* message, BMessenger replyTo) const;
 	// Opens the file or address with the desktop's own program for it.

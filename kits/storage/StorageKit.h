@@ -18,3 +18,4 @@
 #include <StorageDefs.h>
 #include <SymLink.h>
 #include <Volume.h>
+#include <VolumeRoster.h>

@@ -12,6 +12,7 @@
 #include <SymLink.h>
 #include <TypeConstants.h>
 #include <Volume.h>
+#include <VolumeRoster.h>
 
 #include "TemporaryFolder.h"
 
@@ -290,4 +291,24 @@ TEST(BVolume, TellsAboutTheFileSystem)
 	BDirectory root;
 	EXPECT_EQ(B_OK, volume.GetRootDirectory(&root));
 	EXPECT_EQ(B_BAD_VALUE, BVolume(static_cast<dev_t>(-2)).InitCheck());
+}
+
+
+TEST(BVolumeRoster, GivesEachVolumeOnce)
+{
+	BVolumeRoster roster;
+	BVolume boot;
+	ASSERT_EQ(B_OK, roster.GetBootVolume(&boot));
+	std::set<dev_t> devices;
+	BVolume volume;
+	while (roster.GetNextVolume(&volume) == B_OK) {
+		EXPECT_EQ(B_OK, volume.InitCheck());
+		EXPECT_TRUE(devices.insert(volume.Device()).second);
+	}
+	EXPECT_EQ(1u, devices.count(boot.Device()));
+	EXPECT_EQ(B_BAD_VALUE, roster.GetNextVolume(&volume));
+	roster.Rewind();
+	EXPECT_EQ(B_OK, roster.GetNextVolume(&volume));
+	EXPECT_EQ(B_BAD_VALUE, roster.GetNextVolume(NULL));
+	EXPECT_EQ(B_BAD_VALUE, roster.GetBootVolume(NULL));
 }
