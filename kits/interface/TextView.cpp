@@ -126,6 +126,7 @@ BTextView::_Init(BRect textRect, const BFont* font, const rgb_color* color)
 	fTabWidth = kDefaultTabWidth;
 	fAlignment = B_ALIGN_LEFT;
 	fColorSpace = B_CMAP8;
+	fCaretBehind = false;
 	fCaretVisible = false;
 	fActive = false;
 	fStylable = false;

@@ -19,6 +19,7 @@ class ArchiveWriter;
 class TextHistory;
 class TextLayout;
 class TextModel;
+struct TextPlace;
 struct TextRun;
 } // namespace BPrivate
 
@@ -242,14 +243,19 @@ private:
 	float _WrapWidth() const;
 	float _LineLeft(int32 line) const;
 	BRect _ExtentOf(int32 offset) const;
+	void _AddSpans(int32 line, int32 from, int32 to, BRegion* region) const;
 	void _InvalidateLines(int32 from, int32 to);
 	void _InvalidateRange(int32 from, int32 to);
 
 	// Selection and caret
 	int32 _Start() const { return fAnchor < fCaret ? fAnchor : fCaret; }
 	int32 _End() const { return fAnchor < fCaret ? fCaret : fAnchor; }
-	void _SetSelection(int32 anchor, int32 caret);
-	void _MoveCaret(int32 to, bool extend);
+	void _SetSelection(int32 anchor, int32 caret, bool isBehind = false);
+	void _SetCaretBehind(bool isBehind);
+	BPrivate::TextPlace _CaretPlace() const;
+	BPrivate::TextPlace _PlaceAt(BPoint point) const;
+	BPrivate::TextPlace _PlaceBesideCaret(bool toRight, bool extend, bool byWord) const;
+	void _MoveCaret(BPrivate::TextPlace to, bool extend);
 	void _MoveByLines(int32 lines, bool extend);
 	int32 _WordEdge(int32 from, bool forward) const;
 	void _SetActive(bool active);
@@ -314,6 +320,7 @@ private:
 	float fTabWidth;
 	alignment fAlignment;
 	color_space fColorSpace;
+	bool fCaretBehind; // at the character before it, where letters run both ways
 	bool fCaretVisible; // the phase of its blinking
 	bool fActive; // has the focus, in an active window
 	bool fStylable;

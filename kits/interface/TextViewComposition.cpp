@@ -154,11 +154,15 @@ BTextView::_DrawComposition(BRect)
 	const int32 from = fComposition->offset;
 	const int32 to = from + fComposition->length;
 	for (int32 line = LineAt(from); line <= LineAt(to); line++) {
-		const int32 start = std::max(from, fLayout->LineStart(line));
 		const int32 end = std::min(to, fLayout->VisibleEnd(line));
 		const float y = fTextRect.top + fLayout->Top(line) + fLayout->Ascent(line) + 1;
 		const float left = _LineLeft(line);
-		StrokeLine(
-			BPoint(left + fLayout->XAt(line, start), y), BPoint(left + fLayout->XAt(line, end), y));
+		std::vector<TextLayout::Span> spans;
+		fLayout->GetSpans(line, from, end, spans);
+		for (const TextLayout::Span& span : spans) {
+			const float right = std::min(span.right, fLayout->Width(line));
+			if (span.left < right)
+				StrokeLine(BPoint(left + span.left, y), BPoint(left + right, y));
+		}
 	}
 }

@@ -49,7 +49,7 @@ BTextView::_DrawLine(int32 line, BRect updateRect)
 	const float left = _LineLeft(line);
 	const float baseline = fTextRect.top + fLayout->Top(line) + fLayout->Ascent(line);
 	const rgb_color faded = tint_color(ViewColor(), B_DISABLED_LABEL_TINT);
-	std::string bullets;
+	std::string text;
 	for (const TextLayout::Piece& piece : pieces) {
 		// Slanted letters reach a little beyond their place.
 		const float overhang = piece.style->font.Size();
@@ -58,16 +58,18 @@ BTextView::_DrawLine(int32 line, BRect updateRect)
 			continue;
 		SetFont(&piece.style->font);
 		SetHighColor(fFaded ? faded : piece.style->color);
-		if (!fHidesTyping) {
-			const int32 length = piece.end - piece.start;
-			DrawString(
-				fModel->Buffer().Contiguous(piece.start, length), length, BPoint(x, baseline));
+		const int32 length = piece.end - piece.start;
+		const char* bytes = fModel->Buffer().Contiguous(piece.start, length);
+		if (!fHidesTyping && piece.order == TextLayout::PieceOrder::OfItself) {
+			DrawString(bytes, length, BPoint(x, baseline));
 			continue;
 		}
-		bullets.clear();
-		for (int32 at = piece.start; at < piece.end; at = fModel->NextCharacter(at))
-			bullets += B_UTF8_BULLET;
-		DrawString(bullets.data(), static_cast<int32>(bullets.size()), BPoint(x, baseline));
+		text = TextLayout::OrderMark(piece.order);
+		if (!fHidesTyping)
+			text.append(bytes, length);
+		for (int32 at = piece.start; fHidesTyping && at < piece.end; at = fModel->NextCharacter(at))
+			text += B_UTF8_BULLET;
+		DrawString(text.data(), static_cast<int32>(text.size()), BPoint(x, baseline));
 	}
 }
 

@@ -48,15 +48,18 @@ BTextView::GetSelection(int32* _start, int32* _end) const
 
 
 void
-BTextView::_SetSelection(int32 anchor, int32 caret)
+BTextView::_SetSelection(int32 anchor, int32 caret, bool isBehind)
 {
-	if (anchor == fAnchor && caret == fCaret)
+	if (anchor == fAnchor && caret == fCaret) {
+		_SetCaretBehind(isBehind);
 		return;
+	}
 	const int32 oldStart = _Start();
 	const int32 oldEnd = _End();
 	const BRect oldCaret = _CaretRect(fCaret);
 	fAnchor = anchor;
 	fCaret = caret;
+	fCaretBehind = isBehind;
 	if (fHistory != nullptr && !fHistory->IsOpen())
 		fHistory->BreakTyping();
 	if (fAnchor != fCaret || fAnchor != oldStart)
@@ -72,6 +75,20 @@ BTextView::_SetSelection(int32 anchor, int32 caret)
 		_InvalidateRange(oldStart, oldEnd);
 		_InvalidateRange(_Start(), _End());
 	}
+	Invalidate(oldCaret);
+	_RestartBlinking();
+}
+
+
+void
+BTextView::_SetCaretBehind(bool isBehind)
+{
+	if (isBehind == fCaretBehind)
+		return;
+	const BRect oldCaret = _CaretRect(fCaret);
+	fCaretBehind = isBehind;
+	if (Window() == NULL || !fActive)
+		return;
 	Invalidate(oldCaret);
 	_RestartBlinking();
 }
@@ -147,18 +164,9 @@ BTextView::_HandleNavigation(char key, uint32 modifiers)
 	const bool far = (modifiers & (B_COMMAND_KEY | B_CONTROL_KEY)) != 0;
 	switch (key) {
 		case B_LEFT_ARROW:
-		case B_RIGHT_ARROW: {
-			const bool forward = key == B_RIGHT_ARROW;
-			int32 to = fCaret;
-			if (!extend && !far && _Start() != _End())
-				to = forward ? _End() : _Start();
-			else if (far)
-				to = _WordEdge(fCaret, forward);
-			else
-				to = forward ? fLayout->NextPlace(fCaret) : fLayout->PreviousPlace(fCaret);
-			_MoveCaret(to, extend);
+		case B_RIGHT_ARROW:
+			_MoveCaret(_PlaceBesideCaret(key == B_RIGHT_ARROW, extend, far), extend);
 			return true;
-		}
 
 		case B_UP_ARROW:
 		case B_DOWN_ARROW:
@@ -193,12 +201,35 @@ BTextView::_HandleNavigation(char key, uint32 modifiers)
 }
 
 
-void
-BTextView::_MoveCaret(int32 to, bool extend)
+TextPlace
+BTextView::_CaretPlace() const
 {
-	_SetSelection(extend ? fAnchor : to, to);
+	return { fCaret, fCaretBehind };
+}
+
+
+// As it is seen: a selection ends at that side of it, and a line that starts at the right goes on
+// to the left.
+TextPlace
+BTextView::_PlaceBesideCaret(bool toRight, bool extend, bool byWord) const
+{
+	if (byWord)
+		return _WordEdge(fCaret, toRight != fLayout->StartsAtRight(LineAt(fCaret)));
+	if (extend || _Start() == _End())
+		return fLayout->PlaceBeside(_CaretPlace(), toRight);
+	const int32 line = LineAt(_Start());
+	const bool endIsRight = line != LineAt(_End())
+		|| fLayout->XAt(line, _Start()) <= fLayout->XAt(line, { _End(), true });
+	return toRight == endIsRight ? TextPlace(_End(), true) : TextPlace(_Start());
+}
+
+
+void
+BTextView::_MoveCaret(TextPlace to, bool extend)
+{
+	_SetSelection(extend ? fAnchor : to.offset, to.offset, to.behind);
 	fCaretX = -1;
-	ScrollToOffset(to);
+	ScrollToOffset(to.offset);
 	_RestartBlinking();
 }
 
@@ -209,16 +240,16 @@ BTextView::_MoveByLines(int32 lines, bool extend)
 {
 	const int32 line = LineAt(fCaret);
 	if (fCaretX < 0)
-		fCaretX = PointAt(fCaret).x;
+		fCaretX = _LineLeft(line) + fLayout->XAt(line, _CaretPlace());
 	const float x = fCaretX;
 	const int32 target = line + lines;
-	int32 to;
+	TextPlace to;
 	if (target < 0)
 		to = 0;
 	else if (target >= CountLines())
 		to = TextLength();
 	else
-		to = fLayout->OffsetAtX(target, x - _LineLeft(target));
+		to = fLayout->PlaceAtX(target, x - _LineLeft(target));
 	_MoveCaret(to, extend);
 	fCaretX = x;
 }
@@ -298,8 +329,11 @@ BTextView::_HandleTyping(const char* bytes, int32 numBytes)
 	}
 	const int32 from = _Start();
 	const int32 to = _End();
-	_SetSelection(to, to);
+	if (from < to)
+		_SetSelection(to, to);
 	_Edit(B_UNDO_TYPING, from, to, text.data(), static_cast<int32>(text.size()), NULL);
+	// Where letters run both ways, it stays at what was typed.
+	_SetCaretBehind(true);
 	ScrollToOffset(fCaret);
 }
 

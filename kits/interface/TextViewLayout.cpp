@@ -73,12 +73,7 @@ BTextView::PointAt(int32 offset, float* _height) const
 int32
 BTextView::OffsetAt(BPoint point) const
 {
-	if (point.y < fTextRect.top)
-		return fLayout->OffsetAtX(0, point.x - _LineLeft(0));
-	if (point.y >= fTextRect.top + fLayout->TotalHeight() && CountLines() > 1)
-		return TextLength();
-	const int32 line = LineAt(point);
-	return fLayout->OffsetAtX(line, point.x - _LineLeft(line));
+	return _PlaceAt(point).offset;
 }
 
 
@@ -117,7 +112,8 @@ BTextView::TextHeight(int32 startLine, int32 endLine) const
 }
 
 
-// At most three rectangles: the rest of the first line, whole lines, the start of the last one.
+// The rest of the first line, whole lines, the start of the last one. Where letters run both ways a
+// part of a line may be in several places.
 void
 BTextView::GetTextRegion(int32 startOffset, int32 endOffset, BRegion* _region) const
 {
@@ -131,22 +127,34 @@ BTextView::GetTextRegion(int32 startOffset, int32 endOffset, BRegion* _region) c
 
 	const int32 first = fLayout->LineAtOffset(from);
 	const int32 last = fLayout->LineAtOffset(to);
-	const float left = fTextRect.left;
-	const float right = std::max(fTextRect.right, Bounds().right);
-	const float top = fTextRect.top;
-	const float start = std::floor(_LineLeft(first) + fLayout->XAt(first, from));
-	const float end = std::ceil(_LineLeft(last) + fLayout->XAt(last, to)) - 1;
-	const float firstBottom = top + fLayout->Top(first + 1) - 1;
-	const float lastTop = top + fLayout->Top(last);
-	if (first == last) {
-		_region->Set(BRect(start, lastTop, end, firstBottom));
+	_AddSpans(first, from, to, _region);
+	if (first == last)
 		return;
+	const float top = fTextRect.top;
+	if (last > first + 1) {
+		_region->Include(BRect(fTextRect.left, top + fLayout->Top(first + 1),
+			std::max(fTextRect.right, Bounds().right), top + fLayout->Top(last) - 1));
 	}
-	_region->Include(BRect(start, top + fLayout->Top(first), right, firstBottom));
-	if (last > first + 1)
-		_region->Include(BRect(left, firstBottom + 1, right, lastTop - 1));
-	if (end >= left)
-		_region->Include(BRect(left, lastTop, end, top + fLayout->Top(last + 1) - 1));
+	_AddSpans(last, from, to, _region);
+}
+
+
+// What of the range is in the line.
+void
+BTextView::_AddSpans(int32 line, int32 from, int32 to, BRegion* region) const
+{
+	const float top = fTextRect.top + fLayout->Top(line);
+	const float bottom = fTextRect.top + fLayout->Top(line + 1) - 1;
+	const float end = std::max(fTextRect.right, Bounds().right);
+	const float lineLeft = _LineLeft(line);
+	std::vector<TextLayout::Span> spans;
+	fLayout->GetSpans(line, from, to, spans);
+	for (const TextLayout::Span& span : spans) {
+		const float left = std::floor(lineLeft + span.left);
+		const float right = std::isinf(span.right) ? end : std::ceil(lineLeft + span.right) - 1;
+		if (right >= left)
+			region->Include(BRect(left, top, right, bottom));
+	}
 }
 
 
@@ -444,10 +452,24 @@ BTextView::_LineLeft(int32 line) const
 BRect
 BTextView::_ExtentOf(int32 offset) const
 {
-	float height;
-	const BPoint point = PointAt(offset, &height);
-	const float x = std::floor(point.x);
-	return BRect(x, point.y, x, point.y + height - 1);
+	offset = _Clamp(offset);
+	const int32 line = fLayout->LineAtOffset(offset);
+	const TextPlace place = { offset, fCaretBehind && offset == fCaret };
+	const float x = std::floor(_LineLeft(line) + fLayout->XAt(line, place));
+	const float top = fTextRect.top + fLayout->Top(line);
+	return BRect(x, top, x, top + fLayout->Height(line) - 1);
+}
+
+
+TextPlace
+BTextView::_PlaceAt(BPoint point) const
+{
+	if (point.y < fTextRect.top)
+		return fLayout->PlaceAtX(0, point.x - _LineLeft(0));
+	if (point.y >= fTextRect.top + fLayout->TotalHeight() && CountLines() > 1)
+		return TextLength();
+	const int32 line = LineAt(point);
+	return fLayout->PlaceAtX(line, point.x - _LineLeft(line));
 }
 
 

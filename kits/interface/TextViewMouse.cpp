@@ -44,7 +44,8 @@ BTextView::MouseDown(BPoint where)
 	int32 clicks;
 	if (message == NULL || message->FindInt32("clicks", &clicks) != B_OK)
 		clicks = 1;
-	const int32 offset = OffsetAt(where);
+	const TextPlace place = _PlaceAt(where);
+	const int32 offset = place.offset;
 	const bool extend = (_CurrentModifiers() & B_SHIFT_KEY) != 0;
 
 	fTracking = std::make_unique<Tracking>();
@@ -66,7 +67,7 @@ BTextView::MouseDown(BPoint where)
 		return;
 	}
 	_SelectAround(offset, fTracking->clicks, &fTracking->from, &fTracking->to);
-	_SetSelection(fTracking->from, fTracking->to);
+	_SetSelection(fTracking->from, fTracking->to, place.behind);
 	_RestartBlinking();
 }
 
@@ -101,8 +102,8 @@ BTextView::MouseUp(BPoint where)
 		_TrackTo(where);
 	_StopTracking();
 	if (clicked) {
-		const int32 offset = OffsetAt(where);
-		_SetSelection(offset, offset);
+		const TextPlace place = _PlaceAt(where);
+		_SetSelection(place.offset, place.offset, place.behind);
 	}
 }
 
@@ -140,13 +141,14 @@ BTextView::_TrackTo(BPoint where)
 	}
 
 	int32 from, to;
-	_SelectAround(OffsetAt(where), tracking.clicks, &from, &to);
+	const TextPlace place = _PlaceAt(where);
+	_SelectAround(place.offset, tracking.clicks, &from, &to);
 	const int32 limitFrom = std::min(tracking.from, TextLength());
 	const int32 limitTo = std::min(tracking.to, TextLength());
 	if (from < limitFrom)
-		_SetSelection(limitTo, from);
+		_SetSelection(limitTo, from, place.behind);
 	else
-		_SetSelection(limitFrom, std::max(limitTo, to));
+		_SetSelection(limitFrom, std::max(limitTo, to), place.behind);
 
 	const bool outside = !Bounds().Contains(where);
 	if (!outside) {

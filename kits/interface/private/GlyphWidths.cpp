@@ -5,7 +5,9 @@
 #include <memory>
 #include <span>
 
+#include "interface/private/FontAccess.h"
 #include "interface/private/TextModel.h"
+#include "server/paint/FontEngine.h"
 
 namespace BPrivate {
 
@@ -107,10 +109,15 @@ GlyphWidths::GlyphWidths(const BFont& font) : fFont(font)
 }
 
 
-float
-GlyphWidths::StringWidth(const char* text, int32 length) const
+std::vector<float>
+GlyphWidths::Advances(const char* text, int32 length) const
 {
-	return fFont.StringWidth(text, length);
+	const auto run = FontEngine::Get().Run(
+		ToFontSpec(fFont), std::string_view(text, static_cast<size_t>(length)));
+	std::vector<float> advances(run->glyphs.size());
+	for (const PlacedGlyph& glyph : run->glyphs)
+		advances[glyph.index] = glyph.advance;
+	return advances;
 }
 
 

@@ -4,6 +4,7 @@
 #include <array>
 #include <mutex>
 #include <unordered_map>
+#include <vector>
 
 #include <Font.h>
 
@@ -23,7 +24,7 @@ public:
 		return character < fCommon.size() ? fCommon[character] : _OtherWidth(character);
 	}
 	// Of characters that may change with their neighbours; asks the font each time.
-	float StringWidth(const char* text, int32 length) const;
+	std::vector<float> Advances(const char* text, int32 length) const;
 
 	// Whole pixels.
 	float Ascent() const { return fAscent; }

@@ -7,119 +7,18 @@
 #include <TextView.h>
 
 #include "interface/private/GlyphWidths.h"
+#include "interface/private/TextWalker.h"
 
 namespace BPrivate {
 
 namespace {
 
-constexpr uint32 kBullet = 0x2022;
 // A text with more lines is measured as far as it is shown.
 constexpr int32 kMeasureAllLines = 2000;
-constexpr int32 kLongestChunk = 96; // bytes of joining letters that are measured together
 
 std::atomic<int64> sLaidOut = 0; // lines
 
 } // namespace
-
-
-// Goes through the text character by character and says how wide each is.
-class TextLayout::Walker {
-public:
-	Walker(const TextLayout& layout, int32 offset) :
-		fLayout(layout), fModel(layout.fModel), fRun(fModel.RunIndexAt(offset)), fOffset(offset)
-	{
-		_EnterRun();
-	}
-
-	int32 Offset() const { return fOffset; }
-	int32 RunIndex() const { return fRun; }
-	uint32 Character() const { return fCharacter; }
-
-	// The width of the character at the offset, when the line has reached `x`; goes on behind it.
-	float Step(float x)
-	{
-		const uchar byte = static_cast<uchar>(fModel.Buffer().ByteAt(fOffset));
-		if (fOffset >= fRunEnd)
-			_NextRun();
-		if (fLayout.fHidden && byte != '\n')
-			return _StepOver(fWidths->Width(kBullet));
-		if (byte < 0x80) {
-			fCharacter = byte;
-			fOffset++;
-			return byte == '\t' ? _TabWidth(x) : fWidths->Width(byte);
-		}
-		const uint32 character = fModel.CharacterAt(fOffset);
-		if (is_simple_character(character)) {
-			fCharacter = character;
-			fOffset = fModel.NextCharacter(fOffset);
-			return fWidths->Width(character);
-		}
-		return _StepInChunk();
-	}
-
-private:
-	void _EnterRun()
-	{
-		fRunEnd = fModel.RunEnd(fRun);
-		fWidths = &GlyphWidths::For(fModel.Runs()[fRun].style.font);
-		fChunkEnd = -1;
-	}
-
-	void _NextRun()
-	{
-		while (fOffset >= fRunEnd && fRun + 1 < static_cast<int32>(fModel.Runs().size())) {
-			fRun++;
-			_EnterRun();
-		}
-	}
-
-	float _StepOver(float width)
-	{
-		fCharacter = fModel.CharacterAt(fOffset);
-		fOffset = fModel.NextCharacter(fOffset);
-		return width;
-	}
-
-	float _TabWidth(float x) const
-	{
-		const float width = fLayout.fTabWidth;
-		if (width <= 0)
-			return 0;
-		return (std::floor(x / width) + 1) * width - x;
-	}
-
-	// Letters that join are measured from where their group begins.
-	float _StepInChunk()
-	{
-		if (fOffset >= fChunkEnd) {
-			fChunkStart = fChunkEnd = fOffset;
-			while (fChunkEnd < fRunEnd && fChunkEnd - fChunkStart < kLongestChunk
-				&& !is_simple_character(fModel.CharacterAt(fChunkEnd)))
-				fChunkEnd = fModel.NextCharacter(fChunkEnd);
-			fChunkEnd = std::min(fChunkEnd, fRunEnd);
-			fBefore = 0;
-		}
-		fCharacter = fModel.CharacterAt(fOffset);
-		fOffset = std::min(fModel.NextCharacter(fOffset), fChunkEnd);
-		const int32 length = fOffset - fChunkStart;
-		const float width =
-			fWidths->StringWidth(fModel.Buffer().Contiguous(fChunkStart, length), length);
-		const float step = std::max(0.0f, width - fBefore);
-		fBefore = std::max(fBefore, width);
-		return step;
-	}
-
-	const TextLayout& fLayout;
-	TextModel& fModel;
-	const GlyphWidths* fWidths = nullptr;
-	int32 fRun;
-	int32 fRunEnd = 0;
-	int32 fOffset;
-	uint32 fCharacter = 0;
-	int32 fChunkStart = 0;
-	int32 fChunkEnd = -1;
-	float fBefore = 0;
-};
 
 
 int64
@@ -254,7 +153,7 @@ float
 TextLayout::Width(int32 line) const
 {
 	if (fLines[line].width < 0)
-		fLines[line].width = XAt(line, VisibleEnd(line));
+		fLines[line].width = _Measure(line);
 	return fLines[line].width;
 }
 
@@ -302,102 +201,6 @@ TextLayout::LineAtY(float y) const
 			high = middle - 1;
 	}
 	return low;
-}
-
-
-float
-TextLayout::XAt(int32 line, int32 offset) const
-{
-	const int32 end = std::min(offset, VisibleEnd(line));
-	Walker walker(*this, LineStart(line));
-	float x = 0;
-	while (walker.Offset() < end)
-		x += walker.Step(x);
-	return x;
-}
-
-
-int32
-TextLayout::OffsetAtX(int32 line, float x) const
-{
-	const int32 start = LineStart(line);
-	int32 end = VisibleEnd(line);
-	// Behind the last character of a wrapped line is the start of the next.
-	if (end == LineEnd(line) && line + 1 < CountLines())
-		end = PreviousPlace(end);
-
-	Walker walker(*this, start);
-	int32 place = start;
-	float left = 0;
-	while (walker.Offset() < end) {
-		const int32 next = std::min(NextPlace(walker.Offset()), end);
-		float right = left;
-		while (walker.Offset() < next)
-			right += walker.Step(right);
-		if (x < (left + right) / 2)
-			return place;
-		place = next;
-		left = right;
-	}
-	return place;
-}
-
-
-void
-TextLayout::GetPieces(int32 line, std::vector<Piece>& pieces) const
-{
-	pieces.clear();
-	const int32 end = VisibleEnd(line);
-	Walker walker(*this, LineStart(line));
-	float x = 0;
-	int32 run = -1;
-	while (walker.Offset() < end) {
-		const int32 offset = walker.Offset();
-		const float width = walker.Step(x);
-		const bool isTab = walker.Character() == '\t' && !fHidden;
-		if (isTab) {
-			run = -1;
-		} else if (walker.RunIndex() != run) {
-			run = walker.RunIndex();
-			pieces.push_back({ offset, walker.Offset(), &fModel.Runs()[run].style, x, width });
-		} else {
-			pieces.back().end = walker.Offset();
-			pieces.back().width += width;
-		}
-		x += width;
-	}
-	fLines[line].width = x;
-}
-
-
-int32
-TextLayout::NextPlace(int32 offset) const
-{
-	const int32 length = fModel.Length();
-	if (offset >= length)
-		return length;
-	bool joined = fModel.CharacterAt(offset) == 0x200d;
-	int32 next = fModel.NextCharacter(offset);
-	while (next < length) {
-		const uint32 character = fModel.CharacterAt(next);
-		if (!joined && !is_mark_character(character))
-			break;
-		joined = character == 0x200d;
-		next = fModel.NextCharacter(next);
-	}
-	return next;
-}
-
-
-int32
-TextLayout::PreviousPlace(int32 offset) const
-{
-	int32 previous = fModel.PreviousCharacter(offset);
-	while (previous > 0
-		&& (is_mark_character(fModel.CharacterAt(previous))
-			|| fModel.CharacterAt(fModel.PreviousCharacter(previous)) == 0x200d))
-		previous = fModel.PreviousCharacter(previous);
-	return previous;
 }
 
 

@@ -10,6 +10,17 @@ class BTextView;
 namespace BPrivate {
 
 class GlyphWidths;
+class VisualLine;
+
+
+// A place for a caret. Where letters run both ways, the end of one and the start of the next may
+// be far apart: the place is then at the one or at the other.
+struct TextPlace {
+	int32 offset;
+	bool behind; // at the end of the character before the offset
+
+	TextPlace(int32 offset = 0, bool behind = false) : offset(offset), behind(behind) {}
+};
 
 
 // A line is what is shown as one: up to a line break of the text, or to the place where it was
@@ -28,6 +39,7 @@ public:
 	// Need LayOut() afterwards.
 	void SetWrapWidth(float width) { fWrapWidth = width; } // negative: no wrapping
 	void SetTabWidth(float width) { fTabWidth = width; }
+	float TabWidth() const { return fTabWidth; }
 	void SetHidden(bool hidden) { fHidden = hidden; } // every character is shown as a bullet
 
 	float WrapWidth() const { return fWrapWidth; }
@@ -54,17 +66,33 @@ public:
 
 	int32 LineAtOffset(int32 offset) const;
 	int32 LineAtY(float y) const;
-	float XAt(int32 line, int32 offset) const;
-	// The offset whose place is nearest.
-	int32 OffsetAtX(int32 line, float x) const;
+	// Whether some of its letters run from the right.
+	bool RunsBothWays(int32 line) const;
+	bool StartsAtRight(int32 line) const;
+	float XAt(int32 line, TextPlace place) const;
+	// The nearest one.
+	TextPlace PlaceAtX(int32 line, float x) const;
+	// One character further to that side, as it is seen.
+	TextPlace PlaceBeside(TextPlace place, bool toRight) const;
 
-	// A part of a line in one look and without tabs, at `x`.
+	// What a part of a line covers, from left to right. Its line break reaches to infinity.
+	struct Span {
+		float left, right;
+	};
+	void GetSpans(int32 line, int32 from, int32 to, std::vector<Span>& spans) const;
+
+	// A part of a line in one look, without tabs, at `x`. Its letters run as drawing finds them to
+	// run, or all to one side, whatever they are.
+	enum class PieceOrder : uint8 { OfItself, AllFromTheLeft, AllFromTheRight };
 	struct Piece {
 		int32 start, end;
 		const TextStyle* style;
 		float x, width;
+		PieceOrder order;
 	};
 	void GetPieces(int32 line, std::vector<Piece>& pieces) const;
+	// What makes drawing take that order, when the text follows it. UTF-8.
+	static const char* OrderMark(PieceOrder order);
 
 	// How many lines the program has laid out so far; for tests of growth.
 	static int64 CountLaidOut();
@@ -82,6 +110,9 @@ private:
 	};
 	class Walker;
 
+	VisualLine _Visual(int32 line) const;
+	float _WidthUpTo(int32 line, int32 offset) const;
+	float _Measure(int32 line) const;
 	void _MoveStep(int32 line);
 	int32 _FindEnd(int32 start, float* _width);
 	Line _MakeLine(int32 start, int32 end, float width, float* _height) const;

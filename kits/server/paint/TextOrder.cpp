@@ -412,8 +412,6 @@ Line::_MirrorAndMoveMarks(size_t from, size_t to)
 bool
 RunsFromTheRight(std::string_view text)
 {
-	if (text.starts_with("\xe2\x80\xae")) // kAllFromTheRight
-		return true;
 	for (size_t at = 0; at < text.size();) {
 		const uint8 first = text[at];
 		// Nothing from the right is below U+0590 in UTF-8.
@@ -421,11 +419,18 @@ RunsFromTheRight(std::string_view text)
 			at++;
 			continue;
 		}
-		const Kind kind = KindOf(NextCharacter(text, &at));
-		if (IsRightward(kind) || kind == Kind::ArabicNumber)
+		if (RunsFromTheRight(NextCharacter(text, &at)))
 			return true;
 	}
 	return false;
+}
+
+
+bool
+RunsFromTheRight(uint32 character)
+{
+	const Kind kind = KindOf(character);
+	return IsRightward(kind) || kind == Kind::ArabicNumber || character == kAllFromTheRight;
 }
 
 
@@ -439,16 +444,23 @@ IsMarkFromTheRight(uint32 character)
 LineStart
 StartOf(const std::vector<uint32>& characters)
 {
-	if (!characters.empty() && characters[0] == kAllFromTheLeft)
-		return LineStart::Left;
-	if (!characters.empty() && characters[0] == kAllFromTheRight)
-		return LineStart::Right;
 	for (const uint32 character : characters) {
-		const Kind kind = KindOf(character);
-		if (kind == Kind::Left || IsRightward(kind))
-			return kind == Kind::Left ? LineStart::Left : LineStart::Right;
+		const LineStart side = SideOf(character);
+		if (side != LineStart::OfItself)
+			return side;
 	}
 	return LineStart::OfItself;
+}
+
+
+LineStart
+SideOf(uint32 character)
+{
+	const Kind kind = KindOf(character);
+	if (kind == Kind::Left || character == kAllFromTheLeft)
+		return LineStart::Left;
+	const bool isRight = IsRightward(kind) || character == kAllFromTheRight;
+	return isRight ? LineStart::Right : LineStart::OfItself;
 }
 
 

@@ -13,6 +13,7 @@ namespace BPrivate {
 // Whether any character is of a script that is written from the right, or the text as a whole is
 // said to be.
 bool RunsFromTheRight(std::string_view text);
+bool RunsFromTheRight(uint32 character);
 
 // An accent or a vowel sign of such a script, which stands above or below the letter before it.
 bool IsMarkFromTheRight(uint32 character);
@@ -20,6 +21,7 @@ bool IsMarkFromTheRight(uint32 character);
 // Where a line starts. Of itself: at the side of its first letter, or left without letters.
 enum class LineStart : uint8 { OfItself, Left, Right };
 LineStart StartOf(const std::vector<uint32>& characters); // OfItself when there is no letter
+LineStart SideOf(uint32 character); // OfItself of what is no letter
 
 // Before a text: all of it runs from the left, or from the right, whatever its characters are.
 constexpr uint32 kAllFromTheLeft = 0x202d;

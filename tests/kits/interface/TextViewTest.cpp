@@ -91,10 +91,9 @@ TEST(TextView, ArrowsStepOverWholeCharactersOfEveryScript)
 	editor.driver.Type(text);
 	EXPECT_EQ(text, editor.view->Text());
 
-	int32 offset = static_cast<int32>(text.size());
-	for (int32 i = static_cast<int32>(std::size(characters)) - 1; i >= 0; i--) {
+	// The Hebrew and the Arabic letter run from the right: the Hebrew one, the first, comes first.
+	for (const int32 offset : { 17, 14, 11, 9, 11, 5, 3, 1, 0 }) {
 		editor.driver.Key("Left");
-		offset -= static_cast<int32>(strlen(characters[i]));
 		expect_selection(editor.view, offset, offset);
 	}
 	editor.driver.Key("Delete");
