@@ -34,8 +34,8 @@ public:
 	status_t CopyFrom(int fd, off_t position, off_t size);
 	off_t Written() const { return fWritten; }
 
-	// B_NOT_SUPPORTED when extended attributes could not be kept. An error after the rename means that the new file is there but may not survive a power
-	// failure: see IsReplaced().
+	// B_NOT_SUPPORTED when extended attributes could not be kept. An error after the rename means
+	// that the new file is there but may not survive a power failure: see IsReplaced().
 	status_t Commit();
 	bool IsReplaced() const { return fReplaced; }
 

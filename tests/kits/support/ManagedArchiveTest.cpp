@@ -212,6 +212,29 @@ TEST(ManagedArchive, TokensThatNameNothingOrTwiceAreRefused)
 }
 
 
+// Nobody could say which of the two holds the objects.
+TEST(ManagedArchive, AmbiguousObjectsAreRefusedAndOtherTwinsKeepTheirPlaces)
+{
+	for (const char* name : { "_managed_archive", "_managed_archivable", "_views" }) {
+		SCOPED_TRACE(name);
+		BMessage archive = managed_tree();
+		archive.AddInt32("its twin", 7);
+		ASSERT_EQ(B_OK, archive.Rename("its twin", name));
+		const BMessage original(archive);
+		EXPECT_EQ(B_BAD_DATA, unmanage_archive(&archive));
+		EXPECT_TRUE(original.HasSameData(archive, false, true));
+	}
+
+	BMessage archive = managed_tree();
+	archive.Rename("before", "BView:layout");
+	archive.Rename("after", "class");
+	const BMessage original(archive);
+	ASSERT_EQ(B_OK, unmanage_archive(&archive));
+	ASSERT_EQ(B_OK, manage_archive(&archive));
+	EXPECT_EQ("", test::first_difference(original, archive));
+}
+
+
 TEST(ManagedArchive, AChainWithoutEndIsRefused)
 {
 	BMessage root = object("BView", { 1 });

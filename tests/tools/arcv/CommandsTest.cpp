@@ -35,6 +35,23 @@ Flatten(const BMessage& message)
 }
 
 
+// Twice two fields of one name, the second of which has that text.
+BMessage
+WithTwinFields(const char* text)
+{
+	BMessage inner;
+	inner.AddBool("twin", true);
+	inner.AddString("other", text);
+	EXPECT_EQ(B_OK, inner.Rename("other", "twin"));
+	BMessage message('ABCD');
+	message.AddInt32("twin", 5);
+	message.AddString("other", text);
+	EXPECT_EQ(B_OK, message.Rename("other", "twin"));
+	message.AddMessage("inner", &inner);
+	return message;
+}
+
+
 // A copy of the dialog whose first archive has one field changed.
 std::string
 ChangedDialog(const TemporaryFolder& folder)
@@ -350,6 +367,59 @@ TEST(Arcv, ConvertChangesTheFormOnly)
 	EXPECT_THAT(list, Not(HasSubstr(" r5 ")));
 	EXPECT_THAT(list, HasSubstr(" haiku "));
 	EXPECT_THAT(RunArcv({ "diff", kTypes, copy }).output, Not(HasSubstr("    ")));
+}
+
+
+TEST(Arcv, FieldsOfOneNameAreKeptApart)
+{
+	TemporaryFolder folder;
+	WriteFile(folder / "message", Flatten(WithTwinFields("second")));
+	WriteFile(folder / "other", Flatten(WithTwinFields("changed")));
+	EXPECT_EQ("what ABCD\nLONG twin = 5\nCSTR twin = \"second\"\nMSGG inner\n"
+			  "  BOOL twin = true\n  CSTR twin = \"second\"\n",
+		RunArcv({ "dump", folder / "message" }).output);
+	JsonValue json;
+	ASSERT_TRUE(ParseJson(RunArcv({ "dump", "--json", folder / "message" }).output, &json));
+	EXPECT_EQ("5", json["fields"].items[0]["values"].items[0].text);
+	EXPECT_EQ("second", json["fields"].items[1]["values"].items[0].text);
+
+	EXPECT_EQ(0, RunArcv({ "diff", folder / "message", folder / "message" }).status);
+	const ProgramResult diff = RunArcv({ "diff", folder / "message", folder / "other" });
+	EXPECT_EQ(1, diff.status);
+	EXPECT_THAT(diff.output, HasSubstr("twin#2: \"second\" -> \"changed\""));
+	EXPECT_THAT(diff.output, HasSubstr("inner.twin#2: \"second\" -> \"changed\""));
+	EXPECT_THAT(diff.output, Not(HasSubstr("twin: ")));
+	const ProgramResult check = RunArcv({ "check", folder / "message" });
+	EXPECT_EQ(1, check.status);
+	EXPECT_THAT(check.output, HasSubstr("several fields have the name \"twin\""));
+}
+
+
+TEST(Arcv, FieldsOfOneNameGoThroughEveryForm)
+{
+	TemporaryFolder folder;
+	const std::string bytes = Flatten(WithTwinFields("second"));
+	const std::string file = folder / "file.rsrc";
+	{
+		BFile made(file.c_str(), B_READ_WRITE | B_CREATE_FILE);
+		BResources resources(&made, true);
+		resources.AddResource('ARCV', 1, bytes.data(), bytes.size(), "twins");
+	}
+	const std::string text = RunArcv({ "rdef", file }).output;
+	WriteFile(folder / "text", text);
+	ASSERT_EQ(0, RunArcv({ "compile", folder / "text", "-o", folder / "compiled" }).status);
+	EXPECT_EQ(0, RunArcv({ "diff", file, folder / "compiled" }).status);
+	const auto item = [](const std::string& path) {
+		BResources resources(path.c_str());
+		size_t size = 0;
+		const void* data = resources.LoadResource('ARCV', 1, &size);
+		return std::string(static_cast<const char*>(data), size);
+	};
+	EXPECT_TRUE(bytes == item(folder / "compiled"));
+	ASSERT_EQ(0, RunArcv({ "convert", "--form", "haiku", file }).status);
+	EXPECT_FALSE(bytes == item(file));
+	ASSERT_EQ(0, RunArcv({ "convert", "--form", "r5", file }).status);
+	EXPECT_TRUE(bytes == item(file));
 }
 
 

@@ -7,10 +7,13 @@
 
 #include <set>
 
+#include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
 #include "Program.h"
 #include "kits/storage/TemporaryFolder.h"
+
+using testing::HasSubstr;
 
 namespace {
 
@@ -37,10 +40,7 @@ struct Interruption {
 	{
 		for (int call = 1; call < kMostCalls; call++) {
 			const std::string target = _Prepare();
-			unlink((folder / "report").c_str());
-			const ProgramResult result = _Save(target,
-				{ _Preload(), _SanitizerOptions(), "FAILING_CALL=" + std::to_string(call),
-					"FAILING_HOW=" + how, "FAILING_REPORT=" + (folder / "report") });
+			const ProgramResult result = _SaveWith(target, call, how);
 			const std::string report = ReadFile(folder / "report");
 			if (report.empty())
 				return;
@@ -50,6 +50,34 @@ struct Interruption {
 				return;
 		}
 		ADD_FAILURE() << "the saves have no end";
+	}
+
+	// Saves with the call of that name failing; the file is old and has its attribute then.
+	ProgramResult FailAt(const std::string& name, int error)
+	{
+		for (int call = 1; call < kMostCalls; call++) {
+			const std::string target = _Prepare();
+			const ProgramResult result = _SaveWith(target, call, std::to_string(error));
+			const std::string report = ReadFile(folder / "report");
+			if (report == name) {
+				EXPECT_TRUE(ReadFile(target) == before);
+				char value[8] = {};
+				EXPECT_EQ(5, getxattr(target.c_str(), "user.test", value, sizeof(value)));
+				EXPECT_STREQ("value", value);
+				return result;
+			}
+			if (report.empty())
+				break;
+		}
+		ADD_FAILURE() << "no save calls " << name;
+		return {};
+	}
+
+	// Whether the file system of the tests has such attributes at all.
+	bool HasAttributes()
+	{
+		const std::string target = _Prepare();
+		return getxattr(target.c_str(), "user.test", NULL, 0) == 5;
 	}
 
 private:
@@ -82,6 +110,14 @@ private:
 	ProgramResult _Save(const std::string& target, const std::vector<std::string>& environment)
 	{
 		return RunArcv({ "insert", target, "NEW!:1", folder / "data" }, environment);
+	}
+
+	ProgramResult _SaveWith(const std::string& target, int call, const std::string& how)
+	{
+		unlink((folder / "report").c_str());
+		return _Save(target,
+			{ _Preload(), _SanitizerOptions(), "FAILING_CALL=" + std::to_string(call),
+				"FAILING_HOW=" + how, "FAILING_REPORT=" + (folder / "report") });
 	}
 
 	void _Judge(const std::string& target, const std::string& how, const std::string& call,
@@ -160,4 +196,22 @@ TEST(InterruptedSave, ShortTransfersAreContinued)
 	interruption.Run("short");
 	EXPECT_GT(interruption.points, 30);
 	RecordProperty("points", interruption.points);
+}
+
+
+// As on file systems, or for files, that take no attributes from this user.
+TEST(InterruptedSave, AttributesThatCannotBeKeptAreToldAndTheFileIsLeftAlone)
+{
+	Interruption interruption;
+	if (!interruption.HasAttributes())
+		GTEST_SKIP() << "the file system has no attributes";
+	for (const int error : { EPERM, EACCES, ENOTSUP }) {
+		SCOPED_TRACE(error);
+		const ProgramResult result = interruption.FailAt("fsetxattr", error);
+		EXPECT_EQ(3, result.status);
+		EXPECT_EQ("arcv: " + (interruption.folder / "place/file.rsrc")
+				+ ": the file's attributes could not be kept\n",
+			result.errors);
+	}
+	EXPECT_THAT(interruption.FailAt("fsetxattr", ENOSPC).errors, HasSubstr("no space is left"));
 }
