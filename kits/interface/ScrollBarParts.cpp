@@ -21,6 +21,15 @@ namespace {
 
 constexpr float kMinThumb = 14; // right - left of the smallest thumb
 
+
+// An inactive window only shows its bars flat; they work all the same. One that never becomes active
+// always shows what they are.
+bool
+shows_flat_bars(const BWindow* window)
+{
+	return window == nullptr || (!window->IsActive() && (window->Flags() & B_AVOID_FOCUS) == 0);
+}
+
 } // namespace
 
 
@@ -224,8 +233,7 @@ BScrollBar::_Step(Part part, bool large)
 void
 BScrollBar::Draw(BRect updateRect)
 {
-	// An inactive window only shows its bars flat; they work all the same.
-	const bool flat = !_IsUsable() || Window() == nullptr || !Window()->IsActive();
+	const bool flat = !_IsUsable() || shows_flat_bars(Window());
 	const uint32 state = flat ? Look::kDisabled : Look::kNormal;
 	const rgb_color base = Look::PanelColor();
 	Look::DrawScrollBarFrame(this, Bounds(), base, state);
@@ -259,7 +267,7 @@ BScrollBar::Draw(BRect updateRect)
 void
 BScrollBar::_DrawArrow(Part part)
 {
-	const bool flat = !_IsUsable() || Window() == nullptr || !Window()->IsActive();
+	const bool flat = !_IsUsable() || shows_flat_bars(Window());
 	uint32 state = flat ? Look::kDisabled : Look::kNormal;
 	if (fPressed == part)
 		state |= Look::kPressed;

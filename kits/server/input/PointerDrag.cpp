@@ -42,6 +42,7 @@ PointerInput::_BeginSession(const DragReference& session)
 	const ScreenPicture picture = session->Picture(fDesktop.Scale());
 	if (picture.width > 0)
 		fDesktop.GetBackend().SetDragPicture(&picture, session->Offset());
+	UpdateGrab();
 }
 
 
@@ -79,6 +80,7 @@ PointerInput::_EndSession()
 	fSession = nullptr;
 	fOnDesktop = false;
 	fDesktop.GetBackend().SetDragPicture(nullptr, BPoint());
+	UpdateGrab();
 }
 
 

@@ -286,7 +286,10 @@ PointerInput::WindowHidden(const WindowReference& window)
 		fUnder = nullptr;
 	if (fCaptured == window)
 		fCaptured = nullptr;
-	UpdateGrab();
+	if (_NeedsHolder() && _DragHolder() == nullptr)
+		_EndSession();
+	else
+		UpdateGrab();
 }
 
 
@@ -320,8 +323,30 @@ PointerInput::WindowsRearranged()
 void
 PointerInput::UpdateGrab()
 {
-	const WindowReference menu = _OpenMenu();
-	fDesktop.GetBackend().SetPointerGrab(menu != nullptr ? menu->native.get() : nullptr);
+	WindowReference holder = _OpenMenu();
+	if (holder == nullptr && _NeedsHolder())
+		holder = _DragHolder();
+	fDesktop.GetBackend().SetPointerGrab(holder != nullptr ? holder->native.get() : nullptr);
+}
+
+
+// The desktop tells the window of the press where the pointer is, also outside of all windows. When
+// that window has gone during a drag, another one is to hear of the release.
+bool
+PointerInput::_NeedsHolder() const
+{
+	return fSession != nullptr && !fSession->IsForeign() && !fOnDesktop && fCaptured == nullptr;
+}
+
+
+WindowReference
+PointerInput::_DragHolder() const
+{
+	for (const WindowReference& window : fDesktop.Windows()) {
+		if (window->nativeShown && window->native != nullptr)
+			return window;
+	}
+	return nullptr;
 }
 
 

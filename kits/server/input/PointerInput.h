@@ -35,7 +35,7 @@ public:
 	void WindowGone(const WindowReference& window);
 	// Something may have come to be under the resting pointer.
 	void WindowsRearranged();
-	// Menus want the presses outside all windows too.
+	// Menus want the presses outside all windows too, and a drag its release.
 	void UpdateGrab();
 	void SetCursorHidden(bool hidden);
 	void ObscureCursor();
@@ -57,6 +57,8 @@ private:
 
 	WindowReference _UnderPointer(const BackendEvent& event) const;
 	WindowReference _OpenMenu() const;
+	bool _NeedsHolder() const;
+	WindowReference _DragHolder() const; // NULL when no window is shown
 	std::vector<Recipient> _MoveRecipients(const WindowReference& under) const;
 	void _AddWatchers(std::vector<Recipient>& recipients) const;
 	void _DeliverMove(const Recipient& recipient, const BackendEvent& event, bool transitOnly,

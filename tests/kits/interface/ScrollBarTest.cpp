@@ -61,6 +61,27 @@ TEST(ScrollBar, HasTheDocumentedDefaults)
 }
 
 
+// As the palettes of programs.
+TEST(ScrollBar, ShowsItsThumbWhereTheWindowIsActiveOrNeverBecomesSo)
+{
+	TestWindow active(BRect(400, 400, 500, 500));
+	for (const uint32 flags : { uint32(0), uint32(B_AVOID_FOCUS) }) {
+		BWindow* window = new BWindow(BRect(50, 50, 149, 249), "bar", B_TITLED_WINDOW, flags);
+		Bar* bar = new Bar(BRect(0, 0, 14, 199), NULL);
+		window->AddChild(bar);
+		window->Show();
+		Driver::WaitUntilIdle();
+		active.driver.ActivateWindow(active.Window());
+		ASSERT_FALSE(window->IsActive());
+		const rgb_color thumb = active.driver.PixelAt(bar, BPoint(7, 20));
+		const rgb_color track = active.driver.PixelAt(bar, BPoint(7, 150));
+		EXPECT_EQ(flags == B_AVOID_FOCUS, thumb != track);
+		window->Lock();
+		window->Quit();
+	}
+}
+
+
 TEST(ScrollBar, ScrollsItsTargetAndFollowsIt)
 {
 	BarWindow window;
