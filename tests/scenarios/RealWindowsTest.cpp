@@ -180,6 +180,36 @@ TEST_F(RealWindows, ADragToAnotherWindowShowsItsPictureUnderThePointer)
 }
 
 
+// Nobody tells of a release that no window of the program is under, but for the one of the press.
+TEST_F(RealWindows, ADragEndsWhenItsWindowWasClosedMeanwhile)
+{
+	const ScratchFolder folder;
+	const std::string file =
+		folder.Copy(ARCHWAY_TEST_DATA "/resources/22-nestedboxes.rsrc", "design.rsrc");
+	Start({ ARCHWAY_BINARIES "/archway", "--open", "ARCV:2", file });
+	const std::string editor = screen->WaitForWindow("ARCV 2");
+	const std::string palette = screen->WaitForWindow("^Widgets$");
+	screen->Do({ "windowmove", "--sync", palette, "1000", "500" });
+	screen->Do({ "windowactivate", "--sync", editor });
+	const std::string ground = screen->PixelOfScreen(1300, 900);
+
+	PointAt(palette, { 40, 28 });
+	screen->Do({ "mousedown", "1" });
+	ASSERT_TRUE(screen->WaitForPixel(palette, 150, 28, kSelected));
+	PointAt(palette, { 50, 28 });
+	PointAt(palette, { 60, 40 });
+	const Place pointer = Pointer();
+	Keys({ "ctrl+w" });
+	ASSERT_TRUE(screen->WaitForCount("^Widgets$", 0));
+	// Beside the pointer, for the picture has a hole there.
+	const std::string picture = screen->PixelOfScreen(pointer.x - 8, pointer.y);
+	ASSERT_NE(ground, picture);
+	screen->Do({ "mouseup", "1" });
+	EXPECT_TRUE(screen->WaitForChange(pointer.x - 8, pointer.y, picture));
+	EXPECT_EQ(ground, screen->PixelOfScreen(pointer.x - 8, pointer.y));
+}
+
+
 TEST_F(RealWindows, ThePaletteLeavesWithItsProgramAndComesBackToItsPlace)
 {
 	const ScratchFolder folder;
