@@ -12,6 +12,7 @@
 #include <Node.h>
 #include <NodeInfo.h>
 #include <Path.h>
+#include <Query.h>
 #include <ResourceStrings.h>
 #include <Resources.h>
 #include <Statable.h>

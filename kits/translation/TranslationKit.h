@@ -5,5 +5,6 @@
 #include <TranslationDefs.h>
 #include <TranslationErrors.h>
 #include <TranslationUtils.h>
+#include <Translator.h>
 #include <TranslatorFormats.h>
 #include <TranslatorRoster.h>

@@ -7,9 +7,11 @@
 
 #include <BitmapStream.h>
 #include <TranslationErrors.h>
+#include <Translator.h>
 
 #include "interface/private/BitmapAccess.h"
 #include "server/paint/ImageDecoder.h"
+#include "translation/private/AddedTranslators.h"
 
 using namespace BPrivate;
 
@@ -225,134 +227,10 @@ ReadBitmap(const std::string& bytes, std::unique_ptr<BBitmap>* _bitmap)
 		surface.BytesPerRow(), 0, B_RGBA32);
 }
 
-} // namespace
-
-
-BTranslatorRoster::BTranslatorRoster()
-{
-}
-
-
-BTranslatorRoster::~BTranslatorRoster()
-{
-}
-
-
-BTranslatorRoster*
-BTranslatorRoster::Default()
-{
-	static BTranslatorRoster sRoster;
-	return &sRoster;
-}
-
 
 status_t
-BTranslatorRoster::Identify(BPositionIO* source, BMessage* ioExtension, translator_info* _info,
-	uint32 hintType, const char* hintMIME, uint32 wantType)
+TranslateImage(BPositionIO* source, BPositionIO* destination, uint32 wantType)
 {
-	if (source == NULL || _info == NULL)
-		return B_BAD_VALUE;
-	std::string bytes;
-	const status_t status = ReadAll(source, &bytes);
-	if (status != B_OK)
-		return status;
-	if (wantType != 0 && wantType != B_TRANSLATOR_BITMAP && FindFormat(wantType) == nullptr)
-		return B_NO_TRANSLATOR;
-	return IdentifyBytes(bytes, _info);
-}
-
-
-status_t
-BTranslatorRoster::GetTranslators(BPositionIO* source, BMessage* ioExtension,
-	translator_info** _info, int32* _count, uint32 hintType, const char* hintMIME, uint32 wantType)
-{
-	if (_info == NULL || _count == NULL)
-		return B_BAD_VALUE;
-	translator_info info;
-	const status_t status = Identify(source, ioExtension, &info, hintType, hintMIME, wantType);
-	if (status != B_OK)
-		return status;
-	*_info = new translator_info[1];
-	(*_info)[0] = info;
-	*_count = 1;
-	return B_OK;
-}
-
-
-status_t
-BTranslatorRoster::GetAllTranslators(translator_id** _list, int32* _count)
-{
-	if (_list == NULL || _count == NULL)
-		return B_BAD_VALUE;
-	*_list = new translator_id[1];
-	(*_list)[0] = kImageTranslator;
-	*_count = 1;
-	return B_OK;
-}
-
-
-status_t
-BTranslatorRoster::GetTranslatorInfo(
-	translator_id id, const char** _name, const char** _info, int32* _version)
-{
-	if (id != kImageTranslator)
-		return B_NO_TRANSLATOR;
-	if (_name != NULL)
-		*_name = "Images";
-	if (_info != NULL)
-		*_info = "The image formats of this system";
-	if (_version != NULL)
-		*_version = 100;
-	return B_OK;
-}
-
-
-status_t
-BTranslatorRoster::GetInputFormats(
-	translator_id id, const translation_format** _formats, int32* _count)
-{
-	if (_formats == NULL || _count == NULL)
-		return B_BAD_VALUE;
-	if (id != kImageTranslator)
-		return B_NO_TRANSLATOR;
-	*_formats = InputFormats().data();
-	*_count = InputFormats().size();
-	return B_OK;
-}
-
-
-status_t
-BTranslatorRoster::GetOutputFormats(
-	translator_id id, const translation_format** _formats, int32* _count)
-{
-	if (_formats == NULL || _count == NULL)
-		return B_BAD_VALUE;
-	if (id != kImageTranslator)
-		return B_NO_TRANSLATOR;
-	*_formats = OutputFormats().data();
-	*_count = OutputFormats().size();
-	return B_OK;
-}
-
-
-status_t
-BTranslatorRoster::Translate(BPositionIO* source, const translator_info* info,
-	BMessage* ioExtension, BPositionIO* destination, uint32 wantType, uint32 hintType,
-	const char* hintMIME)
-{
-	return Translate(info != NULL ? info->translator : kImageTranslator, source, ioExtension,
-		destination, wantType);
-}
-
-
-status_t
-BTranslatorRoster::Translate(translator_id translator, BPositionIO* source, BMessage* ioExtension,
-	BPositionIO* destination, uint32 wantType)
-{
-	if (source == NULL || destination == NULL)
-		return B_BAD_VALUE;
-	if (translator != kImageTranslator)
-		return B_NO_TRANSLATOR;
 	const KnownFormat* wanted = NULL;
 	if (wantType != 0 && wantType != B_TRANSLATOR_BITMAP) {
 		wanted = FindFormat(wantType);
@@ -384,4 +262,225 @@ BTranslatorRoster::Translate(translator_id translator, BPositionIO* source, BMes
 	if (status == B_OK)
 		status = WriteAll(destination, pixels.Bits(), pixels.BitsLength());
 	return status;
+}
+
+} // namespace
+
+
+BTranslatorRoster::BTranslatorRoster() : fAdded(std::make_unique<AddedTranslators>())
+{
+}
+
+
+BTranslatorRoster::~BTranslatorRoster()
+{
+}
+
+
+BTranslatorRoster*
+BTranslatorRoster::Default()
+{
+	static BTranslatorRoster sRoster;
+	return &sRoster;
+}
+
+
+status_t
+BTranslatorRoster::AddTranslator(BTranslator* translator)
+{
+	if (translator == NULL)
+		return B_BAD_VALUE;
+	fAdded->Add(translator);
+	return B_OK;
+}
+
+
+status_t
+BTranslatorRoster::Identify(BPositionIO* source, BMessage* ioExtension, translator_info* _info,
+	uint32 hintType, const char* hintMIME, uint32 wantType)
+{
+	if (source == NULL || _info == NULL)
+		return B_BAD_VALUE;
+	std::vector<translator_info> infos;
+	const status_t status = _Identify(source, ioExtension, wantType, &infos);
+	if (status == B_OK)
+		*_info = infos[0];
+	return status;
+}
+
+
+status_t
+BTranslatorRoster::GetTranslators(BPositionIO* source, BMessage* ioExtension,
+	translator_info** _info, int32* _count, uint32 hintType, const char* hintMIME, uint32 wantType)
+{
+	if (source == NULL || _info == NULL || _count == NULL)
+		return B_BAD_VALUE;
+	std::vector<translator_info> infos;
+	const status_t status = _Identify(source, ioExtension, wantType, &infos);
+	if (status != B_OK)
+		return status;
+	*_info = new translator_info[infos.size()];
+	std::copy(infos.begin(), infos.end(), *_info);
+	*_count = static_cast<int32>(infos.size());
+	return B_OK;
+}
+
+
+status_t
+BTranslatorRoster::GetAllTranslators(translator_id** _list, int32* _count)
+{
+	if (_list == NULL || _count == NULL)
+		return B_BAD_VALUE;
+	std::vector<translator_id> ids = fAdded->IDs();
+	ids.insert(ids.begin(), kImageTranslator);
+	*_list = new translator_id[ids.size()];
+	std::copy(ids.begin(), ids.end(), *_list);
+	*_count = static_cast<int32>(ids.size());
+	return B_OK;
+}
+
+
+status_t
+BTranslatorRoster::GetTranslatorInfo(
+	translator_id id, const char** _name, const char** _info, int32* _version)
+{
+	const AddedTranslators::Reference added = fAdded->Get(id);
+	if (id != kImageTranslator && added == nullptr)
+		return B_NO_TRANSLATOR;
+	if (_name != NULL)
+		*_name = added != nullptr ? added->TranslatorName() : "Images";
+	if (_info != NULL)
+		*_info = added != nullptr ? added->TranslatorInfo() : "The image formats of this system";
+	if (_version != NULL)
+		*_version = added != nullptr ? added->TranslatorVersion() : 100;
+	return B_OK;
+}
+
+
+status_t
+BTranslatorRoster::GetInputFormats(
+	translator_id id, const translation_format** _formats, int32* _count)
+{
+	if (_formats == NULL || _count == NULL)
+		return B_BAD_VALUE;
+	if (const AddedTranslators::Reference added = fAdded->Get(id)) {
+		*_formats = added->InputFormats(_count);
+		return B_OK;
+	}
+	if (id != kImageTranslator)
+		return B_NO_TRANSLATOR;
+	*_formats = InputFormats().data();
+	*_count = InputFormats().size();
+	return B_OK;
+}
+
+
+status_t
+BTranslatorRoster::GetOutputFormats(
+	translator_id id, const translation_format** _formats, int32* _count)
+{
+	if (_formats == NULL || _count == NULL)
+		return B_BAD_VALUE;
+	if (const AddedTranslators::Reference added = fAdded->Get(id)) {
+		*_formats = added->OutputFormats(_count);
+		return B_OK;
+	}
+	if (id != kImageTranslator)
+		return B_NO_TRANSLATOR;
+	*_formats = OutputFormats().data();
+	*_count = OutputFormats().size();
+	return B_OK;
+}
+
+
+status_t
+BTranslatorRoster::Translate(BPositionIO* source, const translator_info* info,
+	BMessage* ioExtension, BPositionIO* destination, uint32 wantType, uint32 hintType,
+	const char* hintMIME)
+{
+	if (source == NULL || destination == NULL)
+		return B_BAD_VALUE;
+	// Nobody else to ask, so the image translator finds out by itself.
+	if (info == NULL && fAdded->IDs().empty())
+		return Translate(kImageTranslator, source, ioExtension, destination, wantType);
+	translator_info found;
+	if (info == NULL) {
+		const status_t status = Identify(source, ioExtension, &found, hintType, hintMIME, wantType);
+		if (status != B_OK)
+			return status;
+		info = &found;
+	}
+	if (const AddedTranslators::Reference added = fAdded->Get(info->translator)) {
+		source->Seek(0, SEEK_SET);
+		return added->Translate(source, info, ioExtension, wantType, destination);
+	}
+	return Translate(info->translator, source, ioExtension, destination, wantType);
+}
+
+
+status_t
+BTranslatorRoster::Translate(translator_id translator, BPositionIO* source, BMessage* ioExtension,
+	BPositionIO* destination, uint32 wantType)
+{
+	if (source == NULL || destination == NULL)
+		return B_BAD_VALUE;
+	if (const AddedTranslators::Reference added = fAdded->Get(translator)) {
+		translator_info info;
+		const status_t status =
+			IdentifyBy(*added, translator, source, ioExtension, wantType, &info);
+		return status == B_OK ? Translate(source, &info, ioExtension, destination, wantType)
+							  : status;
+	}
+	return translator == kImageTranslator ? TranslateImage(source, destination, wantType)
+										  : (status_t)B_NO_TRANSLATOR;
+}
+
+
+status_t
+BTranslatorRoster::MakeConfigurationView(
+	translator_id id, BMessage* ioExtension, BView** _view, BRect* _extent)
+{
+	if (_view == NULL || _extent == NULL)
+		return B_BAD_VALUE;
+	if (const AddedTranslators::Reference added = fAdded->Get(id))
+		return added->MakeConfigurationView(ioExtension, _view, _extent);
+	return id == kImageTranslator ? B_ERROR : (status_t)B_NO_TRANSLATOR;
+}
+
+
+status_t
+BTranslatorRoster::GetConfigurationMessage(translator_id id, BMessage* ioExtension)
+{
+	if (ioExtension == NULL)
+		return B_BAD_VALUE;
+	if (const AddedTranslators::Reference added = fAdded->Get(id))
+		return added->GetConfigurationMessage(ioExtension);
+	return id == kImageTranslator ? B_ERROR : (status_t)B_NO_TRANSLATOR;
+}
+
+
+// #pragma mark - private
+
+
+// What is known about the data, best first; at least one when the result is B_OK.
+status_t
+BTranslatorRoster::_Identify(BPositionIO* source, BMessage* ioExtension, uint32 wantType,
+	std::vector<translator_info>* _infos)
+{
+	std::string bytes;
+	status_t status = ReadAll(source, &bytes);
+	if (status != B_OK)
+		return status;
+
+	translator_info image;
+	status = B_NO_TRANSLATOR;
+	if (wantType == 0 || wantType == B_TRANSLATOR_BITMAP || FindFormat(wantType) != nullptr)
+		status = IdentifyBytes(bytes, &image);
+	if (status == B_OK)
+		_infos->push_back(image);
+	fAdded->Identify(source, ioExtension, wantType, _infos);
+	std::stable_sort(_infos->begin(), _infos->end(), [](const auto& a, const auto& b) {
+		return a.quality * a.capability > b.quality * b.capability;
+	});
+	return _infos->empty() ? status : B_OK;
 }

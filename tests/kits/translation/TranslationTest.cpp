@@ -1,6 +1,8 @@
 #include <TranslationKit.h>
 
 #include <File.h>
+#include <Message.h>
+#include <algorithm>
 #include <gtest/gtest.h>
 #include <memory>
 #include <random>
@@ -184,4 +186,157 @@ TEST(BitmapStream, BytewiseWritingMakesTheBitmap)
 	ASSERT_EQ(B_OK, stream.DetachBitmap(&bitmap));
 	const std::unique_ptr<BBitmap> owner(bitmap);
 	EXPECT_EQ(0, memcmp(bitmap->Bits(), bytes.data() + 32, 24));
+}
+
+
+// #pragma mark - added translators
+
+namespace {
+
+constexpr uint32 kTestFormat = 'tstf';
+constexpr char kTestData[] = "test data";
+
+// Knows data that begins with a word of its own, and writes the word reversed.
+class TestTranslator : public BTranslator {
+public:
+	TestTranslator(bool* _deleted) : fDeleted(_deleted) {}
+
+	const char* TranslatorName() const override { return "Test"; }
+	const char* TranslatorInfo() const override { return "For the test"; }
+	int32 TranslatorVersion() const override { return 123; }
+
+	const translation_format* InputFormats(int32* _count) const override
+	{
+		*_count = 1;
+		return &kFormat;
+	}
+
+	const translation_format* OutputFormats(int32* _count) const override
+	{
+		return InputFormats(_count);
+	}
+
+	status_t Identify(BPositionIO* source, const translation_format*, BMessage*,
+		translator_info* _info, uint32 outType) override
+	{
+		char word[sizeof(kTestData) - 1];
+		if (source->Read(word, sizeof(word)) != ssize_t(sizeof(word))
+			|| memcmp(word, kTestData, sizeof(word)) != 0
+			|| (outType != 0 && outType != kTestFormat))
+			return B_NO_TRANSLATOR;
+		_info->type = kTestFormat;
+		_info->group = B_TRANSLATOR_TEXT;
+		_info->quality = _info->capability = 0.5;
+		strcpy(_info->name, "Test format");
+		strcpy(_info->MIME, "text/x-test");
+		return B_OK;
+	}
+
+	status_t Translate(BPositionIO* source, const translator_info*, BMessage*, uint32,
+		BPositionIO* destination) override
+	{
+		char word[sizeof(kTestData) - 1];
+		source->Read(word, sizeof(word));
+		std::reverse(word, word + sizeof(word));
+		destination->Write(word, sizeof(word));
+		return B_OK;
+	}
+
+protected:
+	~TestTranslator() override { *fDeleted = true; }
+
+private:
+	static constexpr translation_format kFormat = { kTestFormat, B_TRANSLATOR_TEXT, 0.5, 0.5,
+		"text/x-test", "Test format" };
+
+	bool* fDeleted; // borrowed
+};
+
+} // namespace
+
+
+TEST(Translator, IsAskedWhenItWasAdded)
+{
+	bool deleted = false;
+	BTranslatorRoster roster;
+	BTranslator* translator = new TestTranslator(&deleted);
+	ASSERT_EQ(B_OK, roster.AddTranslator(translator));
+	BMemoryIO source(kTestData, strlen(kTestData));
+	translator_info info;
+	ASSERT_EQ(B_OK, roster.Identify(&source, NULL, &info));
+	EXPECT_EQ(kTestFormat, info.type);
+	EXPECT_STREQ("text/x-test", info.MIME);
+	EXPECT_EQ(B_NO_TRANSLATOR, roster.Identify(&source, NULL, &info, 0, NULL, B_PNG_FORMAT));
+
+	for (const bool byInfo : { true, false }) {
+		BMallocIO destination;
+		ASSERT_EQ(B_OK,
+			byInfo ? roster.Translate(&source, NULL, NULL, &destination, kTestFormat)
+				   : roster.Translate(info.translator, &source, NULL, &destination, kTestFormat));
+		EXPECT_EQ("atad tset",
+			std::string(
+				static_cast<const char*>(destination.Buffer()), destination.BufferLength()));
+	}
+	EXPECT_EQ(B_NO_TRANSLATOR,
+		BTranslatorRoster::Default()->Translate(
+			info.translator, &source, NULL, &source, kTestFormat));
+	translator->Release();
+	EXPECT_FALSE(deleted);
+}
+
+
+TEST(Translator, IsListedAndToldAbout)
+{
+	bool deleted = false;
+	{
+		BTranslatorRoster roster;
+		BTranslator* translator = new TestTranslator(&deleted);
+		EXPECT_EQ(B_BAD_VALUE, roster.AddTranslator(NULL));
+		roster.AddTranslator(translator);
+		EXPECT_EQ(2, translator->ReferenceCount());
+		EXPECT_EQ(translator, translator->Release());
+
+		translator_id* ids;
+		int32 count;
+		ASSERT_EQ(B_OK, roster.GetAllTranslators(&ids, &count));
+		ASSERT_EQ(2, count);
+		const translator_id id = ids[1];
+		delete[] ids;
+		const char* name;
+		const char* text;
+		int32 version;
+		ASSERT_EQ(B_OK, roster.GetTranslatorInfo(id, &name, &text, &version));
+		EXPECT_STREQ("Test", name);
+		EXPECT_STREQ("For the test", text);
+		EXPECT_EQ(123, version);
+		const translation_format* formats;
+		ASSERT_EQ(B_OK, roster.GetInputFormats(id, &formats, &count));
+		ASSERT_EQ(1, count);
+		EXPECT_EQ(kTestFormat, formats[0].type);
+		ASSERT_EQ(B_OK, roster.GetOutputFormats(id, &formats, &count));
+		BMessage settings;
+		EXPECT_EQ(B_ERROR, roster.GetConfigurationMessage(id, &settings));
+		EXPECT_EQ(B_NO_TRANSLATOR, roster.GetConfigurationMessage(99, &settings));
+	}
+	EXPECT_TRUE(deleted);
+}
+
+
+TEST(Translator, TheBetterOneIsTaken)
+{
+	bool deleted = false;
+	BTranslatorRoster roster;
+	BTranslator* translator = new TestTranslator(&deleted);
+	roster.AddTranslator(translator);
+	translator->Release();
+	const std::string png = Encode(B_PNG_FORMAT, 3, 3);
+	BMemoryIO image(static_cast<const void*>(png.data()), png.size());
+	translator_info* infos;
+	int32 count;
+	ASSERT_EQ(B_OK, roster.GetTranslators(&image, NULL, &infos, &count));
+	ASSERT_EQ(1, count);
+	EXPECT_EQ(uint32(B_PNG_FORMAT), infos[0].type);
+	delete[] infos;
+	BBitmapStream stream;
+	EXPECT_EQ(B_OK, roster.Translate(&image, NULL, NULL, &stream, B_TRANSLATOR_BITMAP));
 }
