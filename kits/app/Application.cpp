@@ -60,7 +60,7 @@ BApplication::BApplication(const char* signature) : BLooper("application")
 	status_t status = B_OK;
 	_Init(signature, &status);
 	if (status != B_OK) {
-		fprintf(stderr, "%s: cannot start the desktop: %s\n", signature, strerror(-status));
+		fprintf(stderr, "%s: cannot start the desktop: %s\n", signature, strerror(status));
 		exit(1);
 	}
 }

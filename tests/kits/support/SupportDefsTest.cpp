@@ -1,3 +1,6 @@
+#include <cerrno>
+#include <cstring>
+
 #include <gtest/gtest.h>
 
 #include <BlockCache.h>
@@ -83,4 +86,15 @@ TEST(Debug, PrintingCanBeSwitchedOff)
 	EXPECT_EQ("seen 2", testing::internal::GetCapturedStdout());
 	ASSERT_WITH_MESSAGE(true, "not said");
 	STATIC_ASSERT(sizeof(int32) == 4);
+}
+
+
+TEST(Errors, HaveTexts)
+{
+	EXPECT_STREQ("No error", strerror(B_OK));
+	EXPECT_STREQ("Invalid argument", strerror(B_BAD_VALUE));
+	EXPECT_STREQ("No such file or directory", strerror(B_ENTRY_NOT_FOUND));
+	EXPECT_STREQ("General error", strerror(B_ERROR));
+	EXPECT_STREQ("Operation not permitted", strerror(EPERM)); // the host's own
+	EXPECT_NE(nullptr, strstr(strerror(-4711), "-4711"));
 }
