@@ -1,23 +1,16 @@
 #include <Roster.h>
 
 #include <limits.h>
-#include <spawn.h>
 #include <string.h>
-#include <string>
 #include <strings.h>
-#include <sys/wait.h>
-#include <thread>
 #include <unistd.h>
 
 #include <Application.h>
 #include <List.h>
 #include <Message.h>
 #include <Messenger.h>
-#include <Path.h>
 
 #include "app/private/LooperCore.h"
-
-extern char** environ;
 
 namespace {
 
@@ -148,26 +141,4 @@ status_t
 BRoster::Broadcast(BMessage* message, BMessenger replyTo) const
 {
 	return be_app_messenger.SendMessage(message, replyTo);
-}
-
-
-status_t
-BRoster::Launch(const entry_ref* ref, const BMessage* initialMessage, team_id* _team) const
-{
-	if (ref == nullptr)
-		return B_BAD_VALUE;
-	BPath path;
-	if (const status_t status = path.SetTo(ref); status != B_OK)
-		return status;
-
-	std::string program = "xdg-open";
-	std::string file = path.Path();
-	char* arguments[] = { program.data(), file.data(), NULL };
-	pid_t child = -1;
-	if (posix_spawnp(&child, "xdg-open", NULL, NULL, arguments, environ) != 0)
-		return B_LAUNCH_FAILED;
-	if (_team != nullptr)
-		*_team = child;
-	std::thread([child] { waitpid(child, NULL, 0); }).detach();
-	return B_OK;
 }

@@ -62,6 +62,14 @@ public:
 	status_t ActivateApp(team_id team) const;
 	status_t Broadcast(BMessage* message) const;
 	status_t Broadcast(BMessage* message, BMessenger replyTo) const;
+	// The program for a type, or for a file: that of the type's or file's preferred signature.
+	// B_LAUNCH_FAILED_NO_PREFERRED_APP or B_LAUNCH_FAILED_APP_NOT_FOUND when there is none.
+	status_t FindApp(const char* mimeType, entry_ref* _app) const;
+	status_t FindApp(entry_ref* ref, entry_ref* _app) const;
+	// Starts the program for the type. It gets the files in "refs" of the message as arguments.
+	status_t Launch(
+		const char* mimeType, BMessage* initialMessage = NULL, team_id* _team = NULL) const;
+	status_t Launch(const char* mimeType, int argc, char** arguments, team_id* _team = NULL) const;
 	// Opens the file or address with the desktop's own program for it.
 	status_t Launch(
 		const entry_ref* ref, const BMessage* initialMessage = NULL, team_id* _team = NULL) const;

@@ -1,4 +1,6 @@
+#include <sched.h>
 #include <stdlib.h>
+#include <sys/stat.h>
 #include <unistd.h>
 
 #include <AppFileInfo.h>
@@ -9,6 +11,7 @@
 #include <NodeInfo.h>
 #include <ResourceStrings.h>
 #include <Resources.h>
+#include <Roster.h>
 #include <String.h>
 
 #include "TemporaryFolder.h"
@@ -219,4 +222,39 @@ TEST_F(BAppFileInfoTest, StringsComeFromResources)
 	std::unique_ptr<BString> copy(strings.NewString(1));
 	ASSERT_NE(nullptr, copy);
 	EXPECT_STREQ("hello", copy->String());
+}
+
+
+TEST_F(BMimeTypeTest, LeadsToTheProgramForIt)
+{
+	const std::string program = fFolder / "program.sh";
+	WriteFile(program, "#!/bin/sh\nprintf '%s ' \"$@\" > \"$0.new\" && mv \"$0.new\" \"$0.out\"\n");
+	chmod(program.c_str(), 0755);
+	WriteFile(fFolder / "file.txt", "text");
+	entry_ref programRef;
+	entry_ref fileRef;
+	ASSERT_EQ(B_OK, get_ref_for_path(program.c_str(), &programRef));
+	ASSERT_EQ(B_OK, get_ref_for_path((fFolder / "file.txt").c_str(), &fileRef));
+	entry_ref found;
+	EXPECT_EQ(B_LAUNCH_FAILED_NO_PREFERRED_APP, be_roster->FindApp("text/plain", &found));
+	EXPECT_EQ(B_BAD_VALUE, be_roster->FindApp("no type/", &found));
+	EXPECT_EQ(B_BAD_VALUE, be_roster->FindApp((entry_ref*)NULL, &found));
+
+	// The supertype's program is taken when the type has none.
+	ASSERT_EQ(B_OK, BMimeType("text").SetPreferredApp("application/x-vnd.Program"));
+	EXPECT_EQ(B_LAUNCH_FAILED_APP_NOT_FOUND, be_roster->FindApp("text/plain", &found));
+	ASSERT_EQ(B_OK, BMimeType("application/x-vnd.Program").SetAppHint(&programRef));
+	EXPECT_EQ(B_OK, be_roster->FindApp("text/plain", &found));
+	EXPECT_TRUE(programRef == found);
+	EXPECT_EQ(B_OK, be_roster->FindApp(&fileRef, &found));
+	EXPECT_TRUE(programRef == found);
+
+	BMessage message(B_REFS_RECEIVED);
+	message.AddRef("refs", &fileRef);
+	team_id team = -1;
+	ASSERT_EQ(B_OK, be_roster->Launch("text/plain", &message, &team));
+	EXPECT_LT(0, team);
+	while (access((program + ".out").c_str(), F_OK) != 0)
+		sched_yield();
+	EXPECT_EQ(fFolder / "file.txt" + std::string(" "), ReadFile(program + ".out"));
 }
