@@ -123,6 +123,8 @@ find_last(const char* text, int32 textLength, const char* pattern, int32 before,
 {
 	if (pattern == nullptr)
 		return B_BAD_VALUE;
+	if (before < 0)
+		return B_ERROR;
 	const int32 length = safe_length(pattern);
 	for (int32 at = min_c(before, textLength) - length; at >= 0; at--) {
 		if (matches(text + at, pattern, length, ignoreCase))
@@ -381,7 +383,7 @@ BString::MoveInto(BString& into, int32 fromOffset, int32 length)
 bool
 BString::MoveInto(char* into, int32 fromOffset, int32 length)
 {
-	if (into == nullptr || fromOffset < 0 || length < 0 || fromOffset + length > Length())
+	if (into == nullptr || fromOffset < 0 || length < 0 || length > Length() - fromOffset)
 		return false;
 	CopyInto(into, fromOffset, length);
 	into[length] = '\0';
@@ -497,7 +499,7 @@ BString::Insert(const char* string, int32 length, int32 position)
 {
 	length = safe_length(string, length);
 	if (position < 0) {
-		const int32 cut = min_c(-position, length);
+		const int32 cut = position > -length ? -position : length;
 		string += cut;
 		length -= cut;
 		position = 0;
@@ -798,7 +800,7 @@ BString::FindLast(char character) const
 int32
 BString::FindLast(char character, int32 beforeOffset) const
 {
-	for (int32 i = min_c(beforeOffset, Length()) - 1; i >= 0; i--) {
+	for (int32 i = min_c(max_c(beforeOffset, 0), Length()) - 1; i >= 0; i--) {
 		if (fData[i] == character)
 			return i;
 	}

@@ -1,5 +1,7 @@
 #include <string>
 
+#include <climits>
+
 #include <gtest/gtest.h>
 
 #include <String.h>
@@ -229,4 +231,26 @@ TEST(String, IsNotSearchedFromBeforeItsBeginning)
 	EXPECT_EQ(B_ERROR, string.FindLast("hello", -1));
 	EXPECT_TRUE("hello" <= string && "hello" >= string);
 	EXPECT_FALSE("hellp" <= string || "helln" >= string);
+}
+
+
+TEST(String, ExtremeNumbersDoNoHarm)
+{
+	BString string("hello");
+	char buffer[8] = "kept";
+	EXPECT_FALSE(string.MoveInto(buffer, 3, INT_MAX));
+	EXPECT_FALSE(string.MoveInto(buffer, INT_MAX, 1));
+	EXPECT_STREQ("kept", buffer);
+	EXPECT_EQ(B_ERROR, string.FindLast("h", INT_MIN));
+	EXPECT_EQ(B_ERROR, string.FindLast('h', INT_MIN));
+	EXPECT_EQ(B_ERROR, string.FindFirst("h", INT_MAX));
+	string.Insert("xyz", INT_MIN);
+	string.Insert("xyz", INT_MAX, INT_MIN);
+	string.Remove(INT_MIN, INT_MAX);
+	EXPECT_STREQ("hello", string.String());
+	string.Insert("xyz", INT_MAX);
+	string.Truncate(INT_MAX);
+	EXPECT_STREQ("helloxyz", string.String());
+	string.Remove(3, INT_MAX);
+	EXPECT_STREQ("hel", string.String());
 }
