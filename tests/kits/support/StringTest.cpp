@@ -1,6 +1,5 @@
-#include <string>
-
 #include <climits>
+#include <string>
 
 #include <gtest/gtest.h>
 
