@@ -73,10 +73,9 @@ BColorControl::KeyDown(const char* bytes, int32 numBytes)
 	}
 
 	int32 repeats = 0;
-	if (const BMessage* message = Window()->CurrentMessage()) {
-		if (message->FindInt32("be:key_repeat", &repeats) != B_OK)
-			repeats = 0;
-	}
+	const BMessage* message = Window() != nullptr ? Window()->CurrentMessage() : nullptr;
+	if (message != nullptr && message->FindInt32("be:key_repeat", &repeats) != B_OK)
+		repeats = 0;
 	const int32 step = repeats > kRepeatsBeforeFast ? kFastStep : 1;
 	// From a colour that is no grey, the grey ramp starts at its red.
 	int32 amount = _RampValue(fFocusedRamp);

@@ -113,6 +113,9 @@ BMenu::BMenu(BMessage* archive) : BView(archive)
 BMenu::~BMenu()
 {
 	_EndTracking();
+	// An item that was taken out of its menu does not keep its submenu alive.
+	if (fSuperitem != NULL)
+		fSuperitem->fSubmenu = NULL;
 	for (BMenuItem* item : fItems) {
 		item->fSuper = NULL;
 		delete item;

@@ -133,9 +133,9 @@ BMenuBar::MessageReceived(BMessage* message)
 void
 BMenuBar::MouseDown(BPoint where)
 {
-	if (fTracker != NULL || !IsEnabled())
-		return;
 	BWindow* window = Window();
+	if (window == NULL || fTracker != NULL || !IsEnabled())
+		return;
 	if (!window->IsActive()) {
 		window->Activate();
 		window->UpdateIfNeeded();

@@ -22,44 +22,6 @@ using namespace BPrivate;
 
 namespace {
 
-struct TypeTraits {
-	window_type type;
-	window_look look;
-	window_feel feel;
-};
-
-constexpr TypeTraits kTypes[] = {
-	{ B_TITLED_WINDOW, B_TITLED_WINDOW_LOOK, B_NORMAL_WINDOW_FEEL },
-	{ B_DOCUMENT_WINDOW, B_DOCUMENT_WINDOW_LOOK, B_NORMAL_WINDOW_FEEL },
-	{ B_MODAL_WINDOW, B_MODAL_WINDOW_LOOK, B_MODAL_APP_WINDOW_FEEL },
-	{ B_FLOATING_WINDOW, B_FLOATING_WINDOW_LOOK, B_FLOATING_APP_WINDOW_FEEL },
-	{ B_BORDERED_WINDOW, B_BORDERED_WINDOW_LOOK, B_NORMAL_WINDOW_FEEL },
-	{ B_UNTYPED_WINDOW, B_TITLED_WINDOW_LOOK, B_NORMAL_WINDOW_FEEL },
-};
-
-
-const TypeTraits&
-traits_of(window_type type)
-{
-	for (const TypeTraits& traits : kTypes) {
-		if (traits.type == type)
-			return traits;
-	}
-	return kTypes[0];
-}
-
-
-window_type
-type_of(window_look look, window_feel feel)
-{
-	for (const TypeTraits& traits : kTypes) {
-		if (traits.look == look && traits.feel == feel)
-			return traits.type;
-	}
-	return B_UNTYPED_WINDOW;
-}
-
-
 BRect
 whole_frame(BRect frame)
 {
@@ -68,23 +30,6 @@ whole_frame(BRect frame)
 }
 
 } // namespace
-
-
-BWindow::BWindow(
-	BRect frame, const char* title, window_type type, uint32 flags, uint32 workspaces) :
-	BLooper(title, B_DISPLAY_PRIORITY)
-{
-	const TypeTraits& traits = traits_of(type);
-	_Init(frame, title, traits.look, traits.feel, flags, workspaces, type);
-}
-
-
-BWindow::BWindow(BRect frame, const char* title, window_look look, window_feel feel, uint32 flags,
-	uint32 workspaces) :
-	BLooper(title, B_DISPLAY_PRIORITY)
-{
-	_Init(frame, title, look, feel, flags, workspaces, type_of(look, feel));
-}
 
 
 BWindow::BWindow(BRect frame, BBitmap* bitmap, Surface* surface) :

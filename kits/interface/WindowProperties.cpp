@@ -1,4 +1,4 @@
-// Frame, title, kind and archive of windows.
+// Frame, title and archive of windows.
 #include <Window.h>
 
 #include <algorithm>
@@ -207,76 +207,6 @@ BWindow::SetTitle(const char* title)
 	if (fInternals->server != nullptr)
 		fInternals->server->SetTitle(fInternals->title.c_str());
 	WindowList::SetTitle(this, fInternals->title.c_str());
-}
-
-
-status_t
-BWindow::SetType(window_type type)
-{
-	window_look look = B_TITLED_WINDOW_LOOK;
-	window_feel feel = B_NORMAL_WINDOW_FEEL;
-	switch (type) {
-		case B_TITLED_WINDOW:
-		case B_UNTYPED_WINDOW:
-			break;
-		case B_DOCUMENT_WINDOW:
-			look = B_DOCUMENT_WINDOW_LOOK;
-			break;
-		case B_MODAL_WINDOW:
-			look = B_MODAL_WINDOW_LOOK;
-			feel = B_MODAL_APP_WINDOW_FEEL;
-			break;
-		case B_FLOATING_WINDOW:
-			look = B_FLOATING_WINDOW_LOOK;
-			feel = B_FLOATING_APP_WINDOW_FEEL;
-			break;
-		case B_BORDERED_WINDOW:
-			look = B_BORDERED_WINDOW_LOOK;
-			break;
-		default:
-			return B_BAD_VALUE;
-	}
-	fInternals->type = type;
-	fInternals->look = look;
-	fInternals->feel = feel;
-	return fInternals->ApplyKind();
-}
-
-
-window_type
-BWindow::Type() const
-{
-	return fInternals->type;
-}
-
-
-status_t
-BWindow::SetLook(window_look look)
-{
-	fInternals->look = look;
-	return fInternals->ApplyKind();
-}
-
-
-window_look
-BWindow::Look() const
-{
-	return fInternals->look;
-}
-
-
-status_t
-BWindow::SetFeel(window_feel feel)
-{
-	fInternals->feel = feel;
-	return fInternals->ApplyKind();
-}
-
-
-window_feel
-BWindow::Feel() const
-{
-	return fInternals->feel;
 }
 
 
