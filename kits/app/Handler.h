@@ -4,6 +4,7 @@
 #include <atomic>
 
 #include <Archivable.h>
+#include <Message.h>
 #include <OS.h>
 #include <SupportDefs.h>
 

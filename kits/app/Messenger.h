@@ -62,3 +62,6 @@ private:
 };
 
 _EXPORT bool operator<(const BMessenger& a, const BMessenger& b);
+
+// Programs name messages wherever they send them.
+#include <Message.h>

@@ -2,6 +2,7 @@
 #pragma once
 
 #include <InterfaceDefs.h>
+#include <Invoker.h>
 #include <Window.h>
 
 #include <memory>

@@ -6,6 +6,7 @@
 #include <vector>
 
 #include <Invoker.h>
+#include <List.h>
 #include <ListItem.h>
 #include <View.h>
 

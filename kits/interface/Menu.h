@@ -5,6 +5,7 @@
 #include <vector>
 
 #include <InterfaceDefs.h>
+#include <List.h>
 #include <View.h>
 
 class BList;

@@ -4,6 +4,7 @@
 #include <string>
 
 #include <Control.h>
+#include <TextView.h>
 
 class BTextView;
 class _BTextInput_;

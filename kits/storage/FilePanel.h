@@ -4,6 +4,7 @@
 #include <sys/stat.h>
 
 #include <BeBuild.h>
+#include <Directory.h>
 #include <Entry.h>
 #include <Messenger.h>
 #include <StorageDefs.h>

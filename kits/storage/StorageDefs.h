@@ -21,6 +21,9 @@
 #define B_MIME_TYPE_LENGTH 239
 #define B_DEV_NAME_LENGTH 128
 #define B_MAX_SYMLINKS 16
+#ifndef B_DEV_NAME_LENGTH
+#define B_DEV_NAME_LENGTH 128
+#endif
 
 // The host's own values, so that both families of names may be mixed.
 #define B_READ_ONLY O_RDONLY

@@ -54,3 +54,17 @@ enum {
 	B_MIME_STRING_TYPE = 'MIMS',
 	B_ASCII_TYPE = 'TEXT',
 };
+
+// Types of the texts that are addresses.
+#define B_URL_HTTP "application/x-vnd.Be.URL.http"
+#define B_URL_HTTPS "application/x-vnd.Be.URL.https"
+#define B_URL_FTP "application/x-vnd.Be.URL.ftp"
+#define B_URL_GOPHER "application/x-vnd.Be.URL.gopher"
+#define B_URL_MAILTO "application/x-vnd.Be.URL.mailto"
+#define B_URL_NEWS "application/x-vnd.Be.URL.news"
+#define B_URL_NNTP "application/x-vnd.Be.URL.nntp"
+#define B_URL_TELNET "application/x-vnd.Be.URL.telnet"
+#define B_URL_RLOGIN "application/x-vnd.Be.URL.rlogin"
+#define B_URL_TN3270 "application/x-vnd.Be.URL.tn3270"
+#define B_URL_WAIS "application/x-vnd.Be.URL.wais"
+#define B_URL_FILE "application/x-vnd.Be.URL.file"
