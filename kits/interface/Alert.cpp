@@ -206,6 +206,7 @@ BAlert::_Init(const char* text, const char* const labels[])
 		last->MakeFocus(true);
 	}
 	_LayOut();
+	MoveTo(AlertPosition(Frame().Width(), Frame().Height()));
 }
 
 
@@ -321,7 +322,6 @@ BAlert::Go()
 	// An open menu of the caller would wait for its lock, and the user for the menu.
 	if (caller != NULL && caller->LockingThread() == find_thread(NULL))
 		BPrivate::MenuTracker::EndMenusOf(caller);
-	MoveTo(AlertPosition(Frame().Width(), Frame().Height()));
 	Show();
 	while (!wait->WaitForEnd(caller != NULL ? kRedrawInterval : B_INFINITE_TIMEOUT)) {
 		if (caller != NULL)
@@ -338,7 +338,6 @@ status_t
 BAlert::Go(BInvoker* invoker)
 {
 	fInvoker.reset(invoker);
-	MoveTo(AlertPosition(Frame().Width(), Frame().Height()));
 	Show();
 	return B_OK;
 }

@@ -203,7 +203,9 @@ BListView::KeyDown(const char* bytes, int32 numBytes)
 {
 	const bool extend =
 		(_CurrentModifiers() & B_SHIFT_KEY) != 0 && fType == B_MULTIPLE_SELECTION_LIST;
-	const int32 at = fFocusItem >= 0 && fFocusItem < CountItems() ? fFocusItem : fFirstSelected;
+	// Where nothing is selected, the keys begin with the first item.
+	const bool moved = fFirstSelected >= 0 && fFocusItem >= 0 && fFocusItem < CountItems();
+	const int32 at = moved ? fFocusItem : fFirstSelected;
 	const bool typing = fTypeAhead != nullptr && system_time() - fTypeAhead->when < kTypeAheadTime;
 	switch (numBytes > 0 ? bytes[0] : '\0') {
 		case B_UP_ARROW:

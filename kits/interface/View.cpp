@@ -13,6 +13,7 @@
 #include "app/private/HandlerPrivate.h"
 #include "interface/private/ViewArchive.h"
 #include "interface/private/ViewPrivate.h"
+#include "interface/private/ViewScripting.h"
 #include "interface/private/ViewState.h"
 #include "interface/private/ViewWalk.h"
 #include "interface/private/WindowInternals.h"
@@ -167,6 +168,13 @@ BView::MessageReceived(BMessage* message)
 				Invalidate();
 			break;
 		}
+
+		case B_GET_PROPERTY:
+		case B_SET_PROPERTY:
+		case B_COUNT_PROPERTIES:
+			if (!handle_view_property(this, message))
+				BHandler::MessageReceived(message);
+			break;
 
 		default:
 			BHandler::MessageReceived(message);
@@ -418,35 +426,6 @@ BView::ToolTip() const
 
 
 // #pragma mark - scripting
-
-
-BHandler*
-BView::ResolveSpecifier(
-	BMessage* message, int32 index, BMessage* specifier, int32 form, const char* property)
-{
-	if (property != nullptr && std::strcmp(property, "View") == 0) {
-		BView* child = nullptr;
-		const char* name;
-		int32 childIndex;
-		if (form == B_NAME_SPECIFIER && specifier->FindString("name", &name) == B_OK) {
-			for (ServerView* node = fNode->FirstChild(); node && !child; node = node->Next())
-				child = node->Owner()->FindView(name);
-		} else if (form == B_INDEX_SPECIFIER && specifier->FindInt32("index", &childIndex) == B_OK)
-			child = ChildAt(childIndex);
-		if (child != nullptr) {
-			message->PopSpecifier();
-			return child;
-		}
-	}
-	return BHandler::ResolveSpecifier(message, index, specifier, form, property);
-}
-
-
-status_t
-BView::GetSupportedSuites(BMessage* data)
-{
-	return BHandler::GetSupportedSuites(data);
-}
 
 
 status_t

@@ -16,6 +16,7 @@
 #include "interface/private/MenuTracker.h"
 #include "interface/private/ViewInspector.h"
 #include "interface/private/ViewPrivate.h"
+#include "interface/private/ViewScripting.h"
 #include "interface/private/WindowInternals.h"
 
 using namespace BPrivate;
@@ -24,7 +25,10 @@ using namespace BPrivate;
 void
 BWindow::MessageReceived(BMessage* message)
 {
-	BLooper::MessageReceived(message);
+	const bool asks = message->what == B_GET_PROPERTY || message->what == B_SET_PROPERTY
+		|| message->what == B_COUNT_PROPERTIES;
+	if (!asks || !handle_window_property(this, message))
+		BLooper::MessageReceived(message);
 }
 
 

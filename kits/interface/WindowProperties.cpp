@@ -395,37 +395,6 @@ BWindow::Archive(BMessage* archive, bool deep) const
 }
 
 
-// #pragma mark - scripting
-
-
-BHandler*
-BWindow::ResolveSpecifier(
-	BMessage* message, int32 index, BMessage* specifier, int32 form, const char* property)
-{
-	if (property != nullptr && std::strcmp(property, "View") == 0) {
-		BView* view = nullptr;
-		const char* name;
-		int32 childIndex;
-		if (form == B_NAME_SPECIFIER && specifier->FindString("name", &name) == B_OK)
-			view = FindView(name);
-		else if (form == B_INDEX_SPECIFIER && specifier->FindInt32("index", &childIndex) == B_OK)
-			view = ChildAt(childIndex);
-		if (view != nullptr) {
-			message->PopSpecifier();
-			return view;
-		}
-	}
-	return BLooper::ResolveSpecifier(message, index, specifier, form, property);
-}
-
-
-status_t
-BWindow::GetSupportedSuites(BMessage* data)
-{
-	return BLooper::GetSupportedSuites(data);
-}
-
-
 status_t
 BWindow::Perform(perform_code code, void* argument)
 {

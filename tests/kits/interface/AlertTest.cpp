@@ -297,3 +297,18 @@ TEST(Alert, IsArchivedWithItsPartsAndWhatItDoesNotKnow)
 	EXPECT_EQ(0, ArchiveOf(*revived).GetInt8("_but_key", 2, 1));
 	EXPECT_STREQ("kept", ArchiveOf(*revived).GetString("unknown", ""));
 }
+
+
+TEST(Alert, StandsInItsPlaceBeforeItIsShown)
+{
+	ControlFixture fixture;
+	BAlert* alert = NewAlert();
+	const BRect frame = alert->Frame();
+	EXPECT_EQ(BAlert::AlertPosition(frame.Width(), frame.Height()), frame.LeftTop());
+	alert->MoveTo(17, 19);
+	EXPECT_EQ(B_OK, alert->Go(NULL));
+	Driver::WaitUntilIdle();
+	ASSERT_TRUE(alert->Lock());
+	EXPECT_EQ(BPoint(17, 19), alert->Frame().LeftTop()) << "where the program has moved it";
+	alert->Quit();
+}

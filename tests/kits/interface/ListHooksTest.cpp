@@ -374,3 +374,25 @@ TEST(ListHooks, RearrangementsOfABOutlineListViewGoThroughDoMiscellaneous)
 	EXPECT_EQ(&items.all[1], list.ItemAt(0));
 	list.MakeEmpty();
 }
+
+
+TEST(ListView, TheKeysBeginWithTheFirstItemWhereNothingIsSelected)
+{
+	ControlFixture fixture;
+	BListView* list = fixture.Add(new BListView(kFrame, "list"));
+	NotingItem items[3];
+	fixture.Locked([&] {
+		for (NotingItem& item : items)
+			list->AddItem(&item);
+		list->MakeFocus();
+	});
+	for (const char* key : { "Down", "Up" }) {
+		fixture.Locked([&] {
+			list->Select(1);
+			list->DeselectAll();
+		});
+		fixture.driver.Key(key);
+		fixture.Locked([&] { EXPECT_EQ(0, list->CurrentSelection()) << key; });
+	}
+	fixture.Locked([&] { list->MakeEmpty(); });
+}

@@ -236,3 +236,18 @@ TEST_F(MenuTest, ItemsOfUnknownClassesAreCarriedAlong)
 	ASSERT_EQ(B_OK, revived->Archive(&again));
 	EXPECT_TRUE(again.HasSameData(archive));
 }
+
+
+TEST_F(MenuTest, ASubmenuThatIsDeletedLeavesItsItem)
+{
+	BMenu menu("menu");
+	BMenu* submenu = new BMenu("submenu");
+	menu.AddItem(submenu);
+	BMenuItem* item = menu.ItemAt(0);
+	ASSERT_TRUE(menu.RemoveItem(submenu));
+	delete submenu;
+	EXPECT_EQ(nullptr, item->Submenu());
+	EXPECT_EQ(nullptr, item->Menu());
+	EXPECT_STREQ("submenu", item->Label());
+	delete item;
+}

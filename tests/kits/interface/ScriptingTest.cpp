@@ -41,6 +41,36 @@ SuitesOf(BHandler& handler)
 	return suites;
 }
 
+// A script's message: the property is asked of the view, which the window holds.
+BMessage
+Ask(BWindow* window, BMessage message, const char* property, const char* view = NULL)
+{
+	message.AddSpecifier(property);
+	if (view != NULL)
+		message.AddSpecifier("View", view);
+	BMessage answer;
+	EXPECT_EQ(B_OK, BMessenger(window).SendMessage(&message, &answer));
+	return answer;
+}
+
+
+BMessage
+Setting(const BRect& value)
+{
+	BMessage message(B_SET_PROPERTY);
+	message.AddRect("data", value);
+	return message;
+}
+
+
+BMessage
+Setting(bool value)
+{
+	BMessage message(B_SET_PROPERTY);
+	message.AddBool("data", value);
+	return message;
+}
+
 } // namespace
 
 
@@ -84,7 +114,7 @@ TEST(Scripting, EveryClassNamesItsSuites)
 	for (BView* each : plain)
 		EXPECT_EQ(base, SuitesOf(*each)) << typeid(*each).name();
 	BHandler handler;
-	EXPECT_EQ(SuitesOf(handler), base);
+	EXPECT_EQ("suite/vnd.Be-view " + SuitesOf(handler), base);
 }
 
 
@@ -187,4 +217,61 @@ TEST(Scripting, AnAlertIsAWindow)
 	EXPECT_EQ(alert->TextView(), alert->ResolveSpecifier(&ask, index, &specifier, form, property));
 	alert->Quit();
 	window->Quit();
+}
+
+
+TEST(Scripting, ViewsTellAndChangeTheirFrameAndVisibility)
+{
+	ControlFixture fixture;
+	BView* view = fixture.Add(new BView(kFrame, "view", B_FOLLOW_NONE, B_WILL_DRAW));
+	BWindow* window = fixture.window;
+	BRect frame;
+	EXPECT_EQ(B_OK, Ask(window, B_GET_PROPERTY, "Frame", "view").FindRect("result", &frame));
+	EXPECT_EQ(kFrame, frame);
+	EXPECT_FALSE(Ask(window, B_GET_PROPERTY, "Hidden", "view").GetBool("result", true));
+	EXPECT_EQ(1, Ask(window, B_COUNT_PROPERTIES, "View", "ground").GetInt32("result", -1));
+
+	const BRect other(3, 4, 50, 60);
+	EXPECT_EQ(B_OK, Ask(window, Setting(other), "Frame", "view").GetInt32("error", B_ERROR));
+	EXPECT_EQ(other, fixture.Locked([&] { return view->Frame(); }));
+	EXPECT_EQ(B_OK, Ask(window, Setting(true), "Hidden", "view").GetInt32("error", B_ERROR));
+	EXPECT_EQ(B_OK, Ask(window, Setting(true), "Hidden", "view").GetInt32("error", B_ERROR));
+	EXPECT_TRUE(fixture.Locked([&] { return view->IsHidden(); }));
+	EXPECT_EQ(B_OK, Ask(window, Setting(false), "Hidden", "view").GetInt32("error", B_ERROR));
+	EXPECT_FALSE(fixture.Locked([&] { return view->IsHidden(); })) << "hidden once";
+
+	EXPECT_EQ(B_BAD_VALUE, Ask(window, Setting(true), "Frame", "view").GetInt32("error", B_OK));
+	EXPECT_EQ(uint32(B_MESSAGE_NOT_UNDERSTOOD), Ask(window, B_GET_PROPERTY, "Bogus").what);
+}
+
+
+TEST(Scripting, WindowsTellAndChangeTheirProperties)
+{
+	ControlFixture fixture;
+	BWindow* window = fixture.window;
+	const auto number = [&](const char* property) {
+		return Ask(window, B_GET_PROPERTY, property).GetInt32("result", -1);
+	};
+	EXPECT_STREQ("Controls", Ask(window, B_GET_PROPERTY, "Title").GetString("result", ""));
+	EXPECT_EQ(B_TITLED_WINDOW_LOOK, number("Look"));
+	EXPECT_EQ(B_NORMAL_WINDOW_FEEL, number("Feel"));
+	EXPECT_EQ(B_ASYNCHRONOUS_CONTROLS, number("Flags"));
+	EXPECT_EQ(1, Ask(window, B_COUNT_PROPERTIES, "View").GetInt32("result", -1));
+	EXPECT_FALSE(Ask(window, B_GET_PROPERTY, "Hidden").GetBool("result", true));
+
+	BMessage title(B_SET_PROPERTY);
+	title.AddString("data", "Renamed");
+	EXPECT_EQ(B_OK, Ask(window, title, "Title").GetInt32("error", B_ERROR));
+	BMessage look(B_SET_PROPERTY);
+	look.AddInt32("data", B_DOCUMENT_WINDOW_LOOK);
+	EXPECT_EQ(B_OK, Ask(window, look, "Look").GetInt32("error", B_ERROR));
+	const BRect frame(20, 30, 220, 180);
+	EXPECT_EQ(B_OK, Ask(window, Setting(frame), "Frame").GetInt32("error", B_ERROR));
+	EXPECT_EQ(B_OK, Ask(window, Setting(true), "Hidden").GetInt32("error", B_ERROR));
+	fixture.Locked([&] {
+		EXPECT_STREQ("Renamed", window->Title());
+		EXPECT_EQ(B_DOCUMENT_WINDOW_LOOK, window->Look());
+		EXPECT_EQ(frame, window->Frame());
+		EXPECT_TRUE(window->IsHidden());
+	});
 }

@@ -154,3 +154,22 @@ TEST(WindowProperties, NumbersAreKept)
 		EXPECT_FALSE(window->InViewTransaction());
 	});
 }
+
+
+TEST(WindowProperties, TheTypeNamesTheLookAndFeel)
+{
+	TestWindow test;
+	OtherWindow* window = new OtherWindow;
+	EXPECT_EQ(B_OK, window->SetLook(B_DOCUMENT_WINDOW_LOOK));
+	EXPECT_EQ(B_DOCUMENT_WINDOW, window->Type());
+	EXPECT_EQ(B_OK, window->SetType(B_FLOATING_WINDOW));
+	EXPECT_EQ(B_FLOATING_WINDOW_LOOK, window->Look());
+	EXPECT_EQ(B_FLOATING_APP_WINDOW_FEEL, window->Feel());
+	EXPECT_EQ(B_OK, window->SetFeel(B_NORMAL_WINDOW_FEEL));
+	EXPECT_EQ(B_UNTYPED_WINDOW, window->Type()) << "no type looks like a palette and is none";
+	EXPECT_EQ(B_OK, window->SetLook(B_BORDERED_WINDOW_LOOK));
+	EXPECT_EQ(B_BORDERED_WINDOW, window->Type());
+	EXPECT_EQ(B_BAD_VALUE, window->SetType(static_cast<window_type>(7)));
+	EXPECT_EQ(B_BORDERED_WINDOW, window->Type());
+	window->Quit();
+}
