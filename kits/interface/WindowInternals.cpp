@@ -278,19 +278,21 @@ WindowInternals::Present()
 }
 
 
-// What the window's own thread has drawn is shown together with the update that is about to come.
+// What the window's own thread has drawn is shown with the update that is about to come.
 void
 WindowInternals::Flush()
 {
 	const bool updateFollows = server != nullptr && tree.IsDirty() && updatesDisabled == 0
-		&& window.Thread() == find_thread(nullptr) && LooperPrivate(&window).UpdateWaits();
-	if (!updateFollows)
+		&& window.Thread() == find_thread(nullptr);
+	if (updateFollows)
+		_PresentSoon();
+	else
 		Present();
 }
 
 
 // A message of the window's own thread has been handled: what it has drawn becomes visible, together
-// with what the messages that wait draw, and with the update that they have caused, if there is one.
+// with what the messages that wait draw and with the updates that they cause, but soon in any case.
 void
 WindowInternals::MessageHandled()
 {
@@ -298,10 +300,18 @@ WindowInternals::MessageHandled()
 		return;
 	if (tree.IsDirty() && updatesDisabled == 0)
 		return;
-	if (!window.IsMessageWaiting())
+	if (window.IsMessageWaiting())
+		_PresentSoon();
+	else
 		Present();
-	else if (presentDue == 0)
-		presentDue = system_time() + LooperPrivate::UpdateDelay();
+}
+
+
+void
+WindowInternals::_PresentSoon()
+{
+	if (presentDue == 0)
+		presentDue = system_time() + presentDelay;
 	else if (system_time() >= presentDue)
 		Present();
 }

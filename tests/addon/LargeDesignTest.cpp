@@ -6,7 +6,7 @@
 #include <gtest/gtest.h>
 
 #include "addon/EditorScene.h"
-#include "app/private/LooperPrivate.h"
+#include "interface/private/WindowInternals.h"
 #include "support/PaintCounter.h"
 
 namespace {
@@ -109,7 +109,7 @@ class LargeDesign : public testing::TestWithParam<bool> {};
 TEST_P(LargeDesign, TakesNoMoreForOneViewThanASmallOne)
 {
 	constexpr bigtime_t kMinute = 60000000;
-	BPrivate::LooperPrivate::SetUpdateDelay(kMinute); // a busy machine counts alike
+	BPrivate::WindowInternals::presentDelay = kMinute; // a busy machine counts alike
 	constexpr int64 kSomeDozens = 160; // of children that are looked at one by one
 	constexpr size_t kDragStart = 2;
 	const std::vector<Counts> small = CountsOf(100, GetParam());

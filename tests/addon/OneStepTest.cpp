@@ -12,7 +12,7 @@
 #include <StringView.h>
 
 #include "addon/EditorScene.h"
-#include "app/private/LooperPrivate.h"
+#include "interface/private/WindowInternals.h"
 #include "support/PaintCounter.h"
 
 namespace {
@@ -49,7 +49,7 @@ class OneStep : public testing::TestWithParam<const char*> {
 protected:
 	OneStep()
 	{
-		BPrivate::LooperPrivate::SetUpdateDelay(kMinute); // a busy machine counts alike
+		BPrivate::WindowInternals::presentDelay = kMinute; // a busy machine counts alike
 		scene.Open(Design());
 		view = scene.Root()->FindView(GetParam());
 		scene.Input().Click(view, BPoint(3, 3));

@@ -10,7 +10,6 @@
 #include <Message.h>
 
 #include "app/private/Delivery.h"
-#include "app/private/LooperPrivate.h"
 #include "app/private/MessengerPrivate.h"
 
 namespace BPrivate {
@@ -232,19 +231,10 @@ LooperCore::RequestUpdate()
 		return;
 
 	fUpdateWaits = true;
-	fUpdateDue = system_time() + LooperPrivate::UpdateDelay();
 	auto* message = new BMessage(_UPDATE_);
 	Delivery::Of(*message).target = fOwnToken;
 	fQueue.fMessages.push_front(message);
 	_Added();
-}
-
-
-bool
-LooperCore::UpdateWaits()
-{
-	std::unique_lock lock(fQueue.fLock);
-	return fUpdateWaits && system_time() < fUpdateDue;
 }
 
 
@@ -304,12 +294,8 @@ LooperCore::Take()
 	if (fQueue.fMessages.empty())
 		return nullptr;
 
-	auto& messages = fQueue.fMessages;
-	auto next = messages.begin();
-	if (messages.size() > 1 && (*next)->what == _UPDATE_ && system_time() < fUpdateDue)
-		++next;
-	BMessage* message = *next;
-	messages.erase(next);
+	BMessage* message = fQueue.fMessages.front();
+	fQueue.fMessages.pop_front();
 	if (message->what == _UPDATE_)
 		fUpdateWaits = false;
 

@@ -42,14 +42,11 @@ public:
 	// Without regard to the capacity; false when the looper is gone.
 	bool Put(std::unique_ptr<BMessage> message, bool ahead);
 	void RequestUpdate();
-	bool UpdateWaits();
 	bool CancelUpdate();
 	BMessage* TakeMatching(const std::function<bool(const BMessage&)>& wanted);
 	bool WaitForArrival(bigtime_t timeout);
 
-	// For the loop: waits, takes the next one, and tells that its work is done. An update comes when
-	// nothing else waits, so that all that one step of the user causes is painted at once, but in a
-	// flood of messages not later than it is due.
+	// For the loop: waits, takes the first one, and tells that its work is done.
 	void WaitForMessage();
 	BMessage* Take();
 	void WorkDone();
@@ -107,7 +104,6 @@ private:
 	uint64 fArrivals = 0;
 	int32 fInPort = 0; // arrived since the loop last took a message
 	bool fUpdateWaits = false;
-	bigtime_t fUpdateDue = 0; // when it stops to let others pass
 	bool fClosed = false;
 	bool fCounting = false;
 	int32 fInWork = 0; // taken by the loop, not done yet

@@ -1,7 +1,5 @@
 #include "app/private/LooperPrivate.h"
 
-#include <atomic>
-
 #include <Message.h>
 
 #include "app/private/Delivery.h"
@@ -10,9 +8,6 @@
 
 namespace BPrivate {
 namespace {
-
-std::atomic<bigtime_t> sUpdateDelay { 20000 };
-
 
 std::unique_ptr<BMessage>
 Addressed(BMessage* message, int32 token)
@@ -63,30 +58,9 @@ LooperPrivate::RequestUpdate()
 
 
 bool
-LooperPrivate::UpdateWaits()
-{
-	return fLooper->fCore->UpdateWaits();
-}
-
-
-bool
 LooperPrivate::CancelUpdate()
 {
 	return fLooper->fCore->CancelUpdate();
-}
-
-
-bigtime_t
-LooperPrivate::UpdateDelay()
-{
-	return sUpdateDelay;
-}
-
-
-void
-LooperPrivate::SetUpdateDelay(bigtime_t delay)
-{
-	sUpdateDelay = delay;
 }
 
 

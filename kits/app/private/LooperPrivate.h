@@ -30,17 +30,10 @@ public:
 	void PostSystemTo(BMessage* message, const BHandler* handler);
 	// The same, ahead of everything that waits.
 	void PostAhead(BMessage* message);
-	// Queues _UPDATE_ for the looper, unless one is waiting already. It is handled when no other
-	// message waits, or after the delay. Any thread.
+	// Queues _UPDATE_ for the looper ahead of everything, unless one is waiting already. Any thread.
 	void RequestUpdate();
-	// Whether one is waiting that lets other messages pass.
-	bool UpdateWaits();
 	// Takes the waiting _UPDATE_ out, as when the update is done at once; false when none waits.
 	bool CancelUpdate();
-	// How long the painting of windows may be put off while messages wait, in microseconds. Set by
-	// tests that count, for a busy machine makes no difference to them.
-	static bigtime_t UpdateDelay();
-	static void SetUpdateDelay(bigtime_t delay);
 
 	// Takes the first waiting message out for which the function says so; NULL when there is
 	// none. The caller owns it. Walks the queue from the oldest on, with its lock.

@@ -1,6 +1,7 @@
 // WindowInternals: a window's views, its input and its updates.
 #pragma once
 
+#include <atomic>
 #include <deque>
 #include <memory>
 #include <string>
@@ -58,8 +59,8 @@ public:
 	void UpdatePulse();
 	void Pulse();
 
-	// What was painted is shown when no message waits any more, or soon: by a message of its own
-	// when another thread draws outside of an update.
+	// What was painted is shown when no message waits any more, or after the delay: by a message of
+	// its own when another thread draws outside of an update.
 	void NoteDrawing();
 	void Present();
 	void Flush();
@@ -112,6 +113,8 @@ public:
 	int32 updatesDisabled = 0;
 	int32 transactions = 0;
 	bool presentPosted = false;
+	// Microseconds. Longer for tests that count, which a busy machine must not disturb.
+	static inline std::atomic<bigtime_t> presentDelay { 20000 };
 	bigtime_t presentDue = 0; // when what is painted is shown though messages wait; 0 for nothing
 	float surfaceScale = 0; // of what the tree paints on
 	BRegion toPresent; // painted and not yet shown
@@ -146,6 +149,7 @@ public:
 	std::unique_ptr<ArchiveSource> source;
 
 private:
+	void _PresentSoon();
 	bool _KeepBack(BMessage* message);
 	void _DragDecided();
 	void _RoutePress(BMessage* message);

@@ -1,4 +1,4 @@
-// When a window paints: once for all that its messages change, however many wait.
+// When a window paints, and when it shows what it has painted.
 #include <atomic>
 
 #include <gtest/gtest.h>
@@ -6,7 +6,7 @@
 #include <Message.h>
 #include <View.h>
 
-#include "app/private/LooperPrivate.h"
+#include "interface/private/WindowInternals.h"
 #include "support/PaintCounter.h"
 #include "support/TestWindow.h"
 
@@ -15,6 +15,7 @@ namespace {
 
 constexpr bigtime_t kMinute = 60000000;
 constexpr uint32 kStep = 'step';
+constexpr int kSteps = 100;
 
 
 // Each step does something and posts the next one, until there are none left.
@@ -54,7 +55,7 @@ protected:
 		stepper->draws = 0;
 	}
 
-	~UpdateOrder() override { LooperPrivate::SetUpdateDelay(delay); }
+	~UpdateOrder() override { BPrivate::WindowInternals::presentDelay = delay; }
 
 	void Start(int steps)
 	{
@@ -62,9 +63,7 @@ protected:
 		window.Window()->PostMessage(kStep, stepper);
 	}
 
-	using LooperPrivate = BPrivate::LooperPrivate;
-
-	const bigtime_t delay = LooperPrivate::UpdateDelay();
+	const bigtime_t delay = BPrivate::WindowInternals::presentDelay;
 	TestWindow window;
 	Stepper* stepper;
 };
@@ -75,13 +74,13 @@ protected:
 
 TEST_P(UpdateOrder, MessagesThatFollowEachOtherAreShownOnce)
 {
-	LooperPrivate::SetUpdateDelay(kMinute);
+	BPrivate::WindowInternals::presentDelay = kMinute;
 	PaintCounter counter(window.Window());
-	Start(100);
+	Start(kSteps);
 	Driver::WaitUntilIdle();
 	EXPECT_EQ(0, stepper->stepsLeft);
 	EXPECT_EQ(1, counter.Flushes());
-	EXPECT_EQ(GetParam() ? 0 : 1, stepper->draws);
+	EXPECT_EQ(GetParam() ? 0 : kSteps, stepper->draws);
 	EXPECT_EQ(11 * 11, counter.FlushedPixels());
 }
 
