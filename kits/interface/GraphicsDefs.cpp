@@ -49,8 +49,13 @@ mix_color(rgb_color color1, rgb_color color2, uint8 amount)
 
 namespace {
 
-// 32 grays, ten shades each of blue, red and green, then mixed colours in even steps, and the
-// transparent entry last.
+constexpr int kGrays = 32;
+constexpr int kWhite = 63;
+
+
+// Programs may count on these entries: 0 to 31 are the grays from 0 to 248 in steps of 8, 63 is
+// white, 255 is transparent. The others spread over all colours in an order of this system's own:
+// ten shades each of blue, red and green, then mixed colours in even steps.
 class Palette : public color_map {
 public:
 	Palette();
@@ -67,7 +72,7 @@ private:
 Palette::Palette()
 {
 	id = 0;
-	for (int i = 0; i < 32; i++)
+	for (int i = 0; i < kGrays; i++)
 		_Add(i * 8, i * 8, i * 8);
 	for (int axis = 0; axis < 3; axis++) {
 		for (int i = 0; i < 10; i++) {
@@ -93,6 +98,8 @@ Palette::Palette()
 void
 Palette::_Add(int red, int green, int blue)
 {
+	if (fCount == kWhite)
+		color_list[fCount++] = make_color(255, 255, 255);
 	if (fCount < B_TRANSPARENT_8_BIT)
 		color_list[fCount++] = make_color(red, green, blue);
 }
@@ -103,7 +110,6 @@ Palette::_AddMixedColors()
 {
 	static constexpr int kLevels[] = { 255, 203, 152, 102, 51, 0 };
 
-	_Add(255, 255, 255);
 	for (int red : kLevels) {
 		for (int green : kLevels) {
 			for (int blue : kLevels) {

@@ -216,7 +216,13 @@ enum {
 	B_OVERLAY_TRANSFER_CHANNEL = 0x00080000
 };
 
-enum join_mode : uint32 { B_ROUND_JOIN = 0, B_MITER_JOIN, B_BEVEL_JOIN, B_BUTT_JOIN, B_SQUARE_JOIN };
+enum join_mode : uint32 {
+	B_ROUND_JOIN = 0,
+	B_MITER_JOIN,
+	B_BEVEL_JOIN,
+	B_BUTT_JOIN,
+	B_SQUARE_JOIN
+};
 
 enum cap_mode : uint32 {
 	B_ROUND_CAP = B_ROUND_JOIN,

@@ -164,7 +164,6 @@ private:
 	void _Press(int32 index, uint32 modifiers);
 	void _TrackTo(BPoint where);
 	void _AutoScroll();
-	uint32 _CurrentModifiers() const;
 	void _MoveByKey(int32 to, bool extend);
 	int32 _NextEnabled(int32 from, int32 step) const;
 	int32 _PageStep(int32 from, bool down) const;

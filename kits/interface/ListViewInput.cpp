@@ -11,6 +11,7 @@
 #include <Messenger.h>
 #include <Window.h>
 
+#include "interface/private/EventModifiers.h"
 #include "interface/private/ListViewPrivate.h"
 
 using namespace BPrivate;
@@ -22,17 +23,6 @@ constexpr bigtime_t kScrollInterval = 50000;
 constexpr bigtime_t kTypeAheadTime = 1000000; // a longer pause begins a new word
 
 } // namespace
-
-
-uint32
-BListView::_CurrentModifiers() const
-{
-	const BMessage* message = Window() != NULL ? Window()->CurrentMessage() : NULL;
-	int32 held;
-	if (message != NULL && message->FindInt32("modifiers", &held) == B_OK)
-		return static_cast<uint32>(held);
-	return modifiers();
-}
 
 
 bool
@@ -51,7 +41,7 @@ BListView::MouseDown(BPoint where)
 	int32 clicks;
 	if (message == NULL || message->FindInt32("clicks", &clicks) != B_OK)
 		clicks = 1;
-	const uint32 held = _CurrentModifiers();
+	const uint32 held = event_modifiers(*this);
 	const int32 index = IndexOf(where);
 
 	if (index < 0) {
@@ -202,7 +192,7 @@ void
 BListView::KeyDown(const char* bytes, int32 numBytes)
 {
 	const bool extend =
-		(_CurrentModifiers() & B_SHIFT_KEY) != 0 && fType == B_MULTIPLE_SELECTION_LIST;
+		(event_modifiers(*this) & B_SHIFT_KEY) != 0 && fType == B_MULTIPLE_SELECTION_LIST;
 	// Where nothing is selected, the keys begin with the first item.
 	const bool moved = fFirstSelected >= 0 && fFocusItem >= 0 && fFocusItem < CountItems();
 	const int32 at = moved ? fFocusItem : fFirstSelected;

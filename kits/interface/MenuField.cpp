@@ -124,6 +124,19 @@ BMenuField::_CreateBar(BMenu* menu)
 }
 
 
+BMenuBar*
+BMenuField::MenuBar() const
+{
+	// The bar is a view like others: it may be taken out, and another one put in its place.
+	for (BView* child = ChildAt(0); child != NULL; child = child->NextSibling()) {
+		BMenuBar* bar = dynamic_cast<BMenuBar*>(child);
+		if (bar != NULL && bar->Name() != NULL && strcmp(bar->Name(), kBarName) == 0)
+			return bar;
+	}
+	return NULL;
+}
+
+
 // #pragma mark - geometry
 
 
@@ -379,130 +392,4 @@ void
 BMenuField::AllDetached()
 {
 	BView::AllDetached();
-}
-
-
-// #pragma mark - properties
-
-
-BMenu*
-BMenuField::Menu() const
-{
-	const BMenuBar* bar = MenuBar();
-	return bar != NULL ? bar->SubmenuAt(0) : NULL;
-}
-
-
-BMenuBar*
-BMenuField::MenuBar() const
-{
-	// The bar is a view like others: it may be taken out, and another one put in its place.
-	for (BView* child = ChildAt(0); child != NULL; child = child->NextSibling()) {
-		BMenuBar* bar = dynamic_cast<BMenuBar*>(child);
-		if (bar != NULL && bar->Name() != NULL && strcmp(bar->Name(), kBarName) == 0)
-			return bar;
-	}
-	return NULL;
-}
-
-
-BMenuItem*
-BMenuField::MenuItem() const
-{
-	const BMenuBar* bar = MenuBar();
-	return bar != NULL ? bar->ItemAt(0) : NULL;
-}
-
-
-void
-BMenuField::SetLabel(const char* label)
-{
-	if (fLabel != NULL && label != NULL && strcmp(fLabel, label) == 0)
-		return;
-	char* copy = label != NULL ? strdup(label) : NULL;
-	free(fLabel);
-	fLabel = copy;
-	Invalidate();
-}
-
-
-const char*
-BMenuField::Label() const
-{
-	return fLabel;
-}
-
-
-void
-BMenuField::SetEnabled(bool enabled)
-{
-	if (fEnabled == enabled)
-		return;
-	fEnabled = enabled;
-	if (BMenuBar* bar = MenuBar()) {
-		bar->SetEnabled(enabled);
-		bar->Invalidate();
-	}
-	Invalidate();
-}
-
-
-bool
-BMenuField::IsEnabled() const
-{
-	return fEnabled;
-}
-
-
-void
-BMenuField::SetAlignment(alignment label)
-{
-	fAlignment = label;
-}
-
-
-alignment
-BMenuField::Alignment() const
-{
-	return fAlignment;
-}
-
-
-void
-BMenuField::ShowPopUpMarker()
-{
-	fPopUpMarker = true;
-	if (BMenuBar* bar = MenuBar())
-		bar->Invalidate();
-}
-
-
-void
-BMenuField::HidePopUpMarker()
-{
-	fPopUpMarker = false;
-	if (BMenuBar* bar = MenuBar())
-		bar->Invalidate();
-}
-
-
-BHandler*
-BMenuField::ResolveSpecifier(
-	BMessage* message, int32 index, BMessage* specifier, int32 form, const char* property)
-{
-	return BView::ResolveSpecifier(message, index, specifier, form, property);
-}
-
-
-status_t
-BMenuField::GetSupportedSuites(BMessage* data)
-{
-	return BView::GetSupportedSuites(data);
-}
-
-
-status_t
-BMenuField::Perform(perform_code code, void* data)
-{
-	return BView::Perform(code, data);
 }

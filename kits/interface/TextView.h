@@ -265,7 +265,6 @@ private:
 	bool _ShowsSelection() const;
 
 	// Keys
-	uint32 _CurrentModifiers() const;
 	bool _HandleNavigation(char key, uint32 modifiers);
 	void _HandleErasing(bool forward, bool word);
 	void _HandleEnter();

@@ -10,6 +10,7 @@
 #include <ScrollBar.h>
 #include <Window.h>
 
+#include "interface/private/EventModifiers.h"
 #include "interface/private/TextHistory.h"
 #include "interface/private/TextLayout.h"
 #include "interface/private/TextViewPrivate.h"
@@ -103,7 +104,7 @@ BTextView::KeyDown(const char* bytes, int32 numBytes)
 	if (numBytes <= 0)
 		return;
 	const char key = bytes[0];
-	const uint32 modifiers = _CurrentModifiers();
+	const uint32 modifiers = event_modifiers(*this);
 
 	if (!fEditable && !fSelectable) {
 		if (!_ScrollByKey(key))
@@ -142,18 +143,6 @@ BTextView::KeyDown(const char* bytes, int32 numBytes)
 			_HandleTyping(bytes, numBytes);
 			break;
 	}
-}
-
-
-// Those of the event in work, or those held now when the program calls a hook by itself.
-uint32
-BTextView::_CurrentModifiers() const
-{
-	const BMessage* message = Window() != NULL ? Window()->CurrentMessage() : NULL;
-	int32 held;
-	if (message != NULL && message->FindInt32("modifiers", &held) == B_OK)
-		return static_cast<uint32>(held);
-	return modifiers();
 }
 
 

@@ -11,6 +11,7 @@
 #include <Region.h>
 #include <Window.h>
 
+#include "interface/private/EventModifiers.h"
 #include "interface/private/TextHistory.h"
 #include "interface/private/TextLayout.h"
 #include "interface/private/TextViewPrivate.h"
@@ -46,7 +47,7 @@ BTextView::MouseDown(BPoint where)
 		clicks = 1;
 	const TextPlace place = _PlaceAt(where);
 	const int32 offset = place.offset;
-	const bool extend = (_CurrentModifiers() & B_SHIFT_KEY) != 0;
+	const bool extend = (event_modifiers(*this) & B_SHIFT_KEY) != 0;
 
 	fTracking = std::make_unique<Tracking>();
 	fTracking->press = where;

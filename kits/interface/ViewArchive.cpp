@@ -6,6 +6,7 @@
 #include <Message.h>
 
 #include "app/private/MessagePrivate.h"
+#include "interface/private/ArchivedState.h"
 #include "interface/private/FontAccess.h"
 #include "interface/private/StandInView.h"
 #include "interface/private/ViewArchive.h"
@@ -22,156 +23,7 @@ namespace {
 // submenu by its item) is a root by itself, wherever that happens.
 thread_local const BView* sArchivedAsChild = nullptr;
 
-constexpr int32 kColors = 3; // high, low, view
 constexpr int32 kMaxEntry = (1 << 23) - 2;
-
-
-// What the fields of a view say, by the rules for missing and strange ones.
-struct ReadState {
-	BRect frame { 0, 0, -1, -1 };
-	uint32 mode = 0;
-	uint32 flags = 0;
-	uint32 eventMask = 0;
-	uint32 eventOptions = 0;
-	rgb_color colors[kColors] = { { 0, 0, 0, 255 }, { 255, 255, 255, 255 },
-		{ 255, 255, 255, 255 } };
-	int16 hideCount = 0;
-	DrawState draw;
-};
-
-
-uint32
-packed(rgb_color color)
-{
-	return static_cast<uint32>(color.red) << 24 | static_cast<uint32>(color.green) << 16
-		| static_cast<uint32>(color.blue) << 8 | color.alpha;
-}
-
-
-rgb_color
-unpacked(uint32 value)
-{
-	return { static_cast<uint8>(value >> 24), static_cast<uint8>(value >> 16),
-		static_cast<uint8>(value >> 8), static_cast<uint8>(value) };
-}
-
-
-void
-read_font(const BMessage& archive, FontSpec* _font)
-{
-	const char* family;
-	const char* style;
-	if (archive.FindString("_fname", 0, &family) == B_OK
-		&& archive.FindString("_fname", 1, &style) == B_OK) {
-		// A family that is not installed does not lose the style: what was bold stays bold.
-		BFont font;
-		if (font.SetFamilyAndStyle(family, style) == B_OK
-			|| font.SetFamilyAndStyle(NULL, style) == B_OK) {
-			const FontSpec spec = ToFontSpec(font);
-			_font->familyAndStyle = spec.familyAndStyle;
-			_font->face = spec.face;
-		}
-	}
-	float value;
-	if (archive.FindFloat("_fflt", 0, &value) == B_OK && value > 0)
-		_font->size = value;
-	if (archive.FindFloat("_fflt", 1, &value) == B_OK && value >= 45 && value <= 135)
-		_font->shear = value;
-	if (archive.FindFloat("_fflt", 2, &value) == B_OK && value >= 0 && value <= 360)
-		_font->rotation = value;
-}
-
-
-void
-read_colors(const BMessage& archive, rgb_color colors[kColors])
-{
-	for (int32 i = 0; i < kColors; i++) {
-		int32 value;
-		if (archive.FindInt32("_color", i, &value) == B_OK)
-			colors[i] = unpacked(value);
-		int32 which;
-		if (archive.FindInt32("_uicolor", i, &which) == B_OK && which != B_NO_COLOR) {
-			float tint;
-			if (archive.FindFloat("_uitint", i, &tint) != B_OK)
-				tint = B_NO_TINT;
-			colors[i] = tint_color(ui_color(static_cast<color_which>(which)), tint);
-		}
-	}
-}
-
-
-void
-read_modes(const BMessage& archive, DrawState* _draw)
-{
-	_draw->origin = archive.GetPoint("_origin", _draw->origin);
-	_draw->scale = archive.GetFloat("_scale", _draw->scale);
-	_draw->penSize = archive.GetFloat("_psize", _draw->penSize);
-	_draw->penLocation = archive.GetPoint("_ploc", _draw->penLocation);
-
-	int16 cap, join, source, function;
-	float miter;
-	if (archive.FindInt16("_lmcapjoin", 0, &cap) == B_OK
-		&& archive.FindInt16("_lmcapjoin", 1, &join) == B_OK
-		&& archive.FindFloat("_lmmiter", &miter) == B_OK) {
-		_draw->lineCap = static_cast<cap_mode>(cap);
-		_draw->lineJoin = static_cast<join_mode>(join);
-		_draw->miterLimit = miter;
-	}
-	if (archive.FindInt16("_blend", 0, &source) == B_OK
-		&& archive.FindInt16("_blend", 1, &function) == B_OK) {
-		_draw->sourceAlpha = static_cast<source_alpha>(source);
-		_draw->alphaFunction = static_cast<alpha_function>(function);
-	}
-	_draw->mode = static_cast<drawing_mode>(archive.GetInt32("_dmod", _draw->mode));
-	_draw->combinedOrigin = _draw->origin;
-	_draw->combinedScale = _draw->scale;
-}
-
-
-ReadState
-read_state(const BMessage& archive)
-{
-	ReadState state;
-	const BRect frame = archive.GetRect("_frame", state.frame);
-	state.frame.Set(std::round(frame.left), std::round(frame.top), std::round(frame.right),
-		std::round(frame.bottom));
-	state.mode = static_cast<uint32>(archive.GetInt32("_resize_mode", 0)) & _RESIZE_MASK_;
-	state.flags = static_cast<uint32>(archive.GetInt32("_flags", 0)) & ~_RESIZE_MASK_;
-	int32 mask, options;
-	if (archive.FindInt32("_evmask", 0, &mask) == B_OK
-		&& archive.FindInt32("_evmask", 1, &options) == B_OK) {
-		state.eventMask = mask;
-		state.eventOptions = options;
-	}
-	read_font(archive, &state.draw.font);
-	read_colors(archive, state.colors);
-	state.draw.highColor = state.colors[0];
-	state.draw.lowColor = state.colors[1];
-	read_modes(archive, &state.draw);
-	state.hideCount = archive.GetInt16("_show", 0);
-	return state;
-}
-
-
-bool
-same_font(const FontSpec& a, const FontSpec& b)
-{
-	return a.familyAndStyle == b.familyAndStyle && a.size == b.size && a.shear == b.shear
-		&& a.rotation == b.rotation;
-}
-
-
-bool
-is_default(const DrawState& draw)
-{
-	const DrawState usual;
-	return draw.highColor == usual.highColor && draw.lowColor == usual.lowColor
-		&& draw.mode == usual.mode && draw.sourceAlpha == usual.sourceAlpha
-		&& draw.alphaFunction == usual.alphaFunction && draw.penSize == usual.penSize
-		&& draw.lineCap == usual.lineCap && draw.lineJoin == usual.lineJoin
-		&& draw.miterLimit == usual.miterLimit && draw.penLocation == usual.penLocation
-		&& draw.origin == usual.origin && draw.scale == usual.scale && draw.font == usual.font;
-}
 
 
 bool
@@ -293,7 +145,7 @@ BView::_InitFromArchive(BMessage* archive)
 	for (const char* name : { "class", "_name", "_views" })
 		fSource->SetKnown(name);
 
-	const ReadState state = read_state(*archive);
+	const ArchivedState state = read_archived_state(*archive);
 	fNode->SetFrame(state.frame);
 	fNode->SetWord(state.flags | state.mode);
 	fRevivedWord = fNode->Word();
@@ -354,7 +206,7 @@ status_t
 BView::_ArchiveOwnFields(BMessage* archive) const
 {
 	ArchiveWriter writer(archive);
-	const ReadState read = read_state(writer.Source());
+	const ArchivedState read = read_archived_state(writer.Source());
 	const BRect frame = Frame();
 	if (!writer.Keep("_frame", frame == read.frame))
 		archive->AddRect("_frame", frame);
@@ -390,7 +242,8 @@ BView::_ArchiveOwnFields(BMessage* archive) const
 		archive->AddFloat("_fflt", draw.font.rotation);
 	}
 
-	const rgb_color colors[kColors] = { draw.highColor, draw.lowColor, fNode->Color() };
+	const rgb_color colors[ArchivedState::kColors] = { draw.highColor, draw.lowColor,
+		fNode->Color() };
 	_ArchiveColors(archive, colors, read.colors);
 	_ArchiveModes(archive, draw, read.draw);
 	const int16 hideCount = fNode->HideCount();
@@ -412,7 +265,7 @@ BView::_ArchiveColors(BMessage* archive, const rgb_color now[], const rgb_color 
 		return;
 	}
 	const BMessage& source = writer.Source();
-	for (int32 i = 0; i < kColors; i++) {
+	for (int32 i = 0; i < ArchivedState::kColors; i++) {
 		int32 value;
 		const bool keeps = now[i] == read[i] && source.FindInt32("_color", i, &value) == B_OK;
 		archive->AddInt32("_color", keeps ? value : static_cast<int32>(packed(now[i])));
@@ -420,7 +273,7 @@ BView::_ArchiveColors(BMessage* archive, const rgb_color now[], const rgb_color 
 	int32 which;
 	if (source.FindInt32("_uicolor", &which) == B_OK) {
 		writer.Keep("_uicolor", false);
-		for (int32 i = 0; i < kColors; i++) {
+		for (int32 i = 0; i < ArchivedState::kColors; i++) {
 			if (now[i] != read[i] || source.FindInt32("_uicolor", i, &which) != B_OK)
 				which = B_NO_COLOR;
 			archive->AddInt32("_uicolor", which);

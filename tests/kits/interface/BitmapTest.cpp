@@ -263,6 +263,34 @@ TEST(Bitmap, CopyIsItsOwn)
 }
 
 
+TEST(ColorMap, GraysWhiteAndTheTransparentEntryAreInTheirPlaces)
+{
+	const color_map* map = system_colors();
+	for (int i = 0; i < 32; i++)
+		EXPECT_EQ(make_color(i * 8, i * 8, i * 8), map->color_list[i]);
+	EXPECT_EQ(make_color(255, 255, 255), map->color_list[63]);
+	EXPECT_EQ(0, map->color_list[B_TRANSPARENT_8_BIT].alpha);
+	EXPECT_EQ(63, map->index_map[32767]) << "white";
+	EXPECT_EQ(0, map->index_map[0]) << "black";
+	EXPECT_EQ(63, map->inversion_map[0]);
+	EXPECT_EQ(0, map->inversion_map[63]);
+	for (int i = 0; i < 32768; i++)
+		ASSERT_NE(B_TRANSPARENT_8_BIT, map->index_map[i]) << "no colour is transparent";
+}
+
+
+TEST(ColorMap, BitmapsUseIt)
+{
+	BBitmap bitmap(BRect(0, 0, 2, 0), B_CMAP8);
+	const uint32 pixels[] = { 0xffffffff, 0xff000000, 0x00123456 };
+	ASSERT_EQ(B_OK, bitmap.ImportBits(pixels, sizeof(pixels), sizeof(pixels), 0, B_RGBA32));
+	const uint8* bits = static_cast<const uint8*>(bitmap.Bits());
+	EXPECT_EQ(63, bits[0]);
+	EXPECT_EQ(0, bits[1]);
+	EXPECT_EQ(B_TRANSPARENT_MAGIC_CMAP8, bits[2]);
+}
+
+
 TEST(ColorMap, EveryColourFindsItself)
 {
 	const color_map* map = system_colors();
