@@ -15,23 +15,27 @@ constexpr int32 kLongRow = 1024;
 #if defined(__x86_64__)
 
 // At the small sizes of controls a call of the library for every row costs more than its pixels.
-// The last piece of a row may overlap the one before it.
+// Pieces between the first and the last stand on their own boundaries, so that none lies in two
+// lines of the cache; those two may overlap their neighbours.
 template<int kBytes>
 [[gnu::always_inline]] inline void
 FillWide(uint32* row, int32 stride, int32 rows, int32 count, uint32 pixel)
 {
 	typedef uint32 Piece __attribute__((vector_size(kBytes), aligned(4), may_alias));
+	typedef uint32 WholePiece __attribute__((vector_size(kBytes), may_alias));
 	constexpr int32 kPixels = kBytes / sizeof(uint32);
 	if (count < kPixels || count > kLongRow) {
 		FillRowsPlainly(row, stride, rows, count, pixel);
 		return;
 	}
 	const Piece piece = Piece {} + pixel;
-	const int32 last = count - kPixels;
 	for (; rows > 0; rows--, row += stride) {
-		for (int32 at = 0; at < last; at += kPixels)
-			*reinterpret_cast<Piece*>(row + at) = piece;
-		*reinterpret_cast<Piece*>(row + last) = piece;
+		*reinterpret_cast<Piece*>(row) = piece;
+		uint32* const last = row + count - kPixels;
+		const uintptr_t boundary = reinterpret_cast<uintptr_t>(row + kPixels) & -uintptr_t(kBytes);
+		for (uint32* at = reinterpret_cast<uint32*>(boundary); at < last; at += kPixels)
+			*reinterpret_cast<WholePiece*>(at) = piece;
+		*reinterpret_cast<Piece*>(last) = piece;
 	}
 }
 
