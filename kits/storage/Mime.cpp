@@ -4,7 +4,6 @@
 #include <string.h>
 #include <strings.h>
 
-#include <mutex>
 #include <set>
 #include <string>
 #include <vector>
@@ -15,9 +14,7 @@
 #include <Message.h>
 #include <NodeInfo.h>
 #include <Path.h>
-#include <TypeConstants.h>
 
-#include "storage/private/IconData.h"
 #include "storage/private/MimeDatabase.h"
 #include "storage/private/MimeSettings.h"
 
@@ -25,91 +22,11 @@ using namespace BPrivate;
 
 namespace {
 
-constexpr char kShortDescription[] = "short_description";
-constexpr char kLongDescription[] = "long_description";
-constexpr char kExtensions[] = "extensions";
-constexpr char kPreferredApp[] = "preferred_app";
-constexpr char kAttrInfo[] = "attr_info";
-constexpr char kAppHint[] = "app_hint";
-
-std::mutex sSettingsLock; // a change is read, changed and written back
-
-
-std::string
-LowerCase(const char* text)
-{
-	std::string lower(text);
-	for (char& character : lower) {
-		if (character >= 'A' && character <= 'Z')
-			character += 'a' - 'A';
-	}
-	return lower;
-}
-
-
 bool
 IsTypeCharacter(char character)
 {
 	return static_cast<unsigned char>(character) > 0x20
 		&& strchr("/<>@,;:\"()[]?=\\", character) == NULL && character != 0x7f;
-}
-
-
-// The type's settings; an empty message when it has none.
-BMessage
-SettingsOf(const char* type)
-{
-	BMessage settings;
-	if (ReadMimeSettings(LowerCase(type), &settings) != B_OK)
-		settings.MakeEmpty();
-	return settings;
-}
-
-
-// Lets `change` work on the settings and writes them back.
-template<typename Change>
-status_t
-ChangeSettings(const char* type, Change change)
-{
-	std::lock_guard<std::mutex> guard(sSettingsLock);
-	BMessage settings = SettingsOf(type);
-	const status_t status = change(settings);
-	return status == B_OK ? WriteMimeSettings(LowerCase(type), settings) : status;
-}
-
-
-status_t
-SetText(const char* type, const char* field, const char* text)
-{
-	if (text != NULL && strlen(text) > B_MIME_TYPE_LENGTH)
-		return B_BAD_VALUE;
-	return ChangeSettings(type, [&](BMessage& settings) -> status_t {
-		settings.RemoveName(field);
-		return text != NULL ? settings.AddString(field, text) : B_OK;
-	});
-}
-
-
-status_t
-GetText(const char* type, const char* field, const std::string& standard, char* buffer)
-{
-	const BMessage settings = SettingsOf(type);
-	const char* text = NULL;
-	if (settings.FindString(field, &text) != B_OK)
-		text = standard.c_str();
-	if (text[0] == '\0')
-		return B_ENTRY_NOT_FOUND;
-	strncpy(buffer, text, B_MIME_TYPE_LENGTH);
-	buffer[B_MIME_TYPE_LENGTH] = '\0';
-	return B_OK;
-}
-
-
-std::string
-IconField(const char* type, icon_size size)
-{
-	const std::string prefix = size == B_LARGE_ICON ? "large_icon" : "mini_icon";
-	return type == NULL ? prefix : prefix + ":" + LowerCase(type);
 }
 
 
@@ -197,7 +114,7 @@ BMimeType::IsInstalled() const
 {
 	if (fType == NULL)
 		return false;
-	const std::string type = LowerCase(fType);
+	const std::string type = LowerCaseType(fType);
 	BMessage settings;
 	if (MimeDatabase::Get().IsKnown(type) || ReadMimeSettings(type, &settings) == B_OK)
 		return true;
@@ -256,7 +173,7 @@ BMimeType::Install()
 {
 	if (fCStatus != B_OK)
 		return fCStatus;
-	return ChangeSettings(fType, [](BMessage&) -> status_t { return B_OK; });
+	return ChangeMimeSettings(fType, [](BMessage&) -> status_t { return B_OK; });
 }
 
 
@@ -265,210 +182,7 @@ BMimeType::Delete()
 {
 	if (fCStatus != B_OK)
 		return fCStatus;
-	std::lock_guard<std::mutex> guard(sSettingsLock);
-	return RemoveMimeSettings(LowerCase(fType));
-}
-
-
-// #pragma mark - properties
-
-
-status_t
-BMimeType::GetShortDescription(char* description) const
-{
-	if (description == NULL)
-		return B_BAD_VALUE;
-	if (fCStatus != B_OK)
-		return fCStatus;
-	const std::string standard = MimeDatabase::Get().DescriptionOf(LowerCase(fType));
-	return GetText(fType, kShortDescription, standard, description);
-}
-
-
-status_t
-BMimeType::SetShortDescription(const char* description)
-{
-	return fCStatus != B_OK ? fCStatus : SetText(fType, kShortDescription, description);
-}
-
-
-status_t
-BMimeType::GetLongDescription(char* description) const
-{
-	if (description == NULL)
-		return B_BAD_VALUE;
-	if (fCStatus != B_OK)
-		return fCStatus;
-	const std::string standard = MimeDatabase::Get().DescriptionOf(LowerCase(fType));
-	return GetText(fType, kLongDescription, standard, description);
-}
-
-
-status_t
-BMimeType::SetLongDescription(const char* description)
-{
-	return fCStatus != B_OK ? fCStatus : SetText(fType, kLongDescription, description);
-}
-
-
-status_t
-BMimeType::GetFileExtensions(BMessage* _extensions) const
-{
-	if (_extensions == NULL)
-		return B_BAD_VALUE;
-	if (fCStatus != B_OK)
-		return fCStatus;
-	_extensions->MakeEmpty();
-	const BMessage settings = SettingsOf(fType);
-	if (settings.FindMessage(kExtensions, _extensions) == B_OK)
-		return B_OK;
-	for (const std::string& extension : MimeDatabase::Get().ExtensionsOf(LowerCase(fType)))
-		_extensions->AddString("extensions", extension.c_str());
-	return _extensions->HasString("extensions") ? B_OK : B_ENTRY_NOT_FOUND;
-}
-
-
-namespace {
-
-status_t
-SetMessage(const char* type, const char* field, const BMessage* message)
-{
-	return ChangeSettings(type, [&](BMessage& settings) -> status_t {
-		settings.RemoveName(field);
-		return message != NULL ? settings.AddMessage(field, message) : B_OK;
-	});
-}
-
-} // namespace
-
-
-status_t
-BMimeType::SetFileExtensions(const BMessage* extensions)
-{
-	return fCStatus != B_OK ? fCStatus : SetMessage(fType, kExtensions, extensions);
-}
-
-
-status_t
-BMimeType::GetPreferredApp(char* signature, app_verb) const
-{
-	if (signature == NULL)
-		return B_BAD_VALUE;
-	return fCStatus != B_OK ? fCStatus : GetText(fType, kPreferredApp, "", signature);
-}
-
-
-status_t
-BMimeType::SetPreferredApp(const char* signature, app_verb)
-{
-	return fCStatus != B_OK ? fCStatus : SetText(fType, kPreferredApp, signature);
-}
-
-
-status_t
-BMimeType::GetAttrInfo(BMessage* _info) const
-{
-	if (_info == NULL)
-		return B_BAD_VALUE;
-	if (fCStatus != B_OK)
-		return fCStatus;
-	return SettingsOf(fType).FindMessage(kAttrInfo, _info) == B_OK
-		? static_cast<status_t>(B_OK)
-		: static_cast<status_t>(B_ENTRY_NOT_FOUND);
-}
-
-
-status_t
-BMimeType::SetAttrInfo(const BMessage* info)
-{
-	return fCStatus != B_OK ? fCStatus : SetMessage(fType, kAttrInfo, info);
-}
-
-
-// A path is kept: the numbers of a folder mean nothing to another program.
-status_t
-BMimeType::GetAppHint(entry_ref* _ref) const
-{
-	if (_ref == NULL)
-		return B_BAD_VALUE;
-	if (fCStatus != B_OK)
-		return fCStatus;
-	const BMessage settings = SettingsOf(fType);
-	const char* path = NULL;
-	if (settings.FindString(kAppHint, &path) != B_OK)
-		return B_ENTRY_NOT_FOUND;
-	return get_ref_for_path(path, _ref);
-}
-
-
-status_t
-BMimeType::SetAppHint(const entry_ref* ref)
-{
-	if (fCStatus != B_OK)
-		return fCStatus;
-	BPath path;
-	if (ref != NULL) {
-		const status_t status = path.SetTo(ref);
-		if (status != B_OK)
-			return status;
-	}
-	return ChangeSettings(fType, [&](BMessage& settings) -> status_t {
-		settings.RemoveName(kAppHint);
-		return ref != NULL ? settings.AddString(kAppHint, path.Path()) : B_OK;
-	});
-}
-
-
-status_t
-BMimeType::GetIcon(BBitmap* icon, icon_size size) const
-{
-	return GetIconForType(NULL, icon, size);
-}
-
-
-status_t
-BMimeType::SetIcon(const BBitmap* icon, icon_size size)
-{
-	return SetIconForType(NULL, icon, size);
-}
-
-
-status_t
-BMimeType::GetIconForType(const char* type, BBitmap* icon, icon_size size) const
-{
-	if (icon == NULL || (type != NULL && !IsValid(type)))
-		return B_BAD_VALUE;
-	if (fCStatus != B_OK)
-		return fCStatus;
-	const BMessage settings = SettingsOf(fType);
-	const void* data;
-	ssize_t length;
-	if (settings.FindData(IconField(type, size).c_str(), IconType(size), &data, &length) != B_OK)
-		return B_ENTRY_NOT_FOUND;
-	return DataToIcon(data, length, size, icon);
-}
-
-
-status_t
-BMimeType::SetIconForType(const char* type, const BBitmap* icon, icon_size size)
-{
-	if (type != NULL && !IsValid(type))
-		return B_BAD_VALUE;
-	if (fCStatus != B_OK)
-		return fCStatus;
-	std::string data;
-	if (icon != NULL) {
-		const status_t status = IconToData(icon, size, &data);
-		if (status != B_OK)
-			return status;
-	}
-	return ChangeSettings(fType, [&](BMessage& settings) -> status_t {
-		const std::string field = IconField(type, size);
-		settings.RemoveName(field.c_str());
-		return icon != NULL
-			? settings.AddData(field.c_str(), IconType(size), data.data(), data.size())
-			: B_OK;
-	});
+	return RemoveMimeSettings(LowerCaseType(fType));
 }
 
 
@@ -517,7 +231,7 @@ BMimeType::GetInstalledTypes(const char* supertype, BMessage* _types)
 	if (_types == NULL || (supertype != NULL && !IsValid(supertype)))
 		return B_BAD_VALUE;
 	_types->MakeEmpty();
-	const std::string prefix = supertype != NULL ? LowerCase(supertype) + "/" : "";
+	const std::string prefix = supertype != NULL ? LowerCaseType(supertype) + "/" : "";
 	for (const std::string& type : AllTypes()) {
 		if (type.compare(0, prefix.size(), prefix) == 0)
 			_types->AddString("types", type.c_str());

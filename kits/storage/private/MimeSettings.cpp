@@ -2,6 +2,7 @@
 
 #include <unistd.h>
 
+#include <mutex>
 #include <vector>
 
 #include <Directory.h>
@@ -18,6 +19,8 @@ namespace BPrivate {
 namespace {
 
 constexpr off_t kLargestSettings = 1024 * 1024;
+
+std::mutex sSettingsLock; // a change is read, changed and written back
 
 
 // The type's slash would make a folder, so another character stands for it; types have none.
@@ -80,6 +83,7 @@ WriteMimeSettings(const std::string& type, const BMessage& settings)
 status_t
 RemoveMimeSettings(const std::string& type)
 {
+	std::lock_guard<std::mutex> guard(sSettingsLock);
 	BPath path;
 	const status_t status = PathFor(type, false, &path);
 	if (status != B_OK)
@@ -107,6 +111,38 @@ TypesWithMimeSettings()
 		types.insert(type);
 	}
 	return types;
+}
+
+
+std::string
+LowerCaseType(const char* type)
+{
+	std::string lower(type);
+	for (char& character : lower) {
+		if (character >= 'A' && character <= 'Z')
+			character += 'a' - 'A';
+	}
+	return lower;
+}
+
+
+BMessage
+MimeSettingsOf(const char* type)
+{
+	BMessage settings;
+	if (ReadMimeSettings(LowerCaseType(type), &settings) != B_OK)
+		settings.MakeEmpty();
+	return settings;
+}
+
+
+status_t
+ChangeMimeSettings(const char* type, const std::function<status_t(BMessage& settings)>& change)
+{
+	std::lock_guard<std::mutex> guard(sSettingsLock);
+	BMessage settings = MimeSettingsOf(type);
+	const status_t status = change(settings);
+	return status == B_OK ? WriteMimeSettings(LowerCaseType(type), settings) : status;
 }
 
 } // namespace BPrivate

@@ -1,6 +1,7 @@
 // What programs set about types: a message per type, in the user's settings folder.
 #pragma once
 
+#include <functional>
 #include <set>
 #include <string>
 
@@ -13,5 +14,14 @@ status_t ReadMimeSettings(const std::string& type, BMessage* _settings);
 status_t WriteMimeSettings(const std::string& type, const BMessage& settings);
 status_t RemoveMimeSettings(const std::string& type);
 std::set<std::string> TypesWithMimeSettings();
+
+// Types are the same whatever the case of their letters; settings are kept under the lower one.
+std::string LowerCaseType(const char* type);
+// The type's settings; an empty message when it has none.
+BMessage MimeSettingsOf(const char* type);
+// Lets `change` work on the settings and writes them back if that answers B_OK. Other changes by
+// this program wait meanwhile.
+status_t ChangeMimeSettings(
+	const char* type, const std::function<status_t(BMessage& settings)>& change);
 
 } // namespace BPrivate

@@ -1,6 +1,28 @@
 #include "storage/private/ResourceTable.h"
 
+#include <stdlib.h>
+#include <string.h>
+
+#include <algorithm>
+
 namespace BPrivate {
+
+std::unique_ptr<ResourceItem>
+NewResourceItem(type_code type, int32 id, const char* name, const void* data, size_t size)
+{
+	auto item = std::make_unique<ResourceItem>();
+	item->type = type;
+	item->id = id;
+	item->named = name != NULL;
+	item->name = name != NULL ? name : "";
+	item->size = size;
+	item->data = malloc(std::max<size_t>(size, 1));
+	if (item->data == NULL)
+		return nullptr;
+	memcpy(item->data, data, size);
+	return item;
+}
+
 
 // #pragma mark - ResourceItemList
 

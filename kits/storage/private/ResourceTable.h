@@ -11,6 +11,10 @@
 
 namespace BPrivate {
 
+// A new item with a copy of the bytes; NULL without memory. The name may be NULL.
+std::unique_ptr<ResourceItem> NewResourceItem(
+	type_code type, int32 id, const char* name, const void* data, size_t size);
+
 // Items in their order. Each knows its slot, so taking one out is constant time; the holes that
 // this leaves are closed when an item is next asked for by its index.
 class ResourceItemList {
