@@ -242,14 +242,19 @@ BMessage::HasData(const char* name, type_code type, int32 index) const
 // #pragma mark - private
 
 
+static int32
+number_of(const MessageData* data, bool isWrittenBack, const char* name)
+{
+	if (data == nullptr)
+		return -1;
+	return isWrittenBack ? BPrivate::WriteBack::Find(*data, name, strlen(name)) : data->Find(name);
+}
+
+
 int32
 BMessage::_Find(const char* name) const
 {
-	if (fData == nullptr)
-		return -1;
-	const int32 number = fWriteBack == nullptr
-		? fData->Find(name)
-		: BPrivate::WriteBack::Find(*fData, name, strlen(name));
+	const int32 number = number_of(fData, fWriteBack != nullptr, name);
 	if (fLookUps != nullptr)
 		fLookUps->Mark(fData, number, name);
 	return number;
@@ -261,12 +266,15 @@ BMessage::_FindItem(const char* name, type_code type, int32 index, uint32* _numb
 {
 	if (name == nullptr)
 		return B_BAD_VALUE;
-	const int32 number = _Find(name);
+	const int32 number = number_of(fData, fWriteBack != nullptr, name);
+	// Who asks for another type does not know this field, and it is carried along.
+	if (number >= 0 && type != B_ANY_TYPE && type != fData->FieldAt(uint32(number)).type)
+		return B_BAD_TYPE;
+	if (fLookUps != nullptr)
+		fLookUps->Mark(fData, number, name);
 	if (number < 0)
 		return B_NAME_NOT_FOUND;
 	const MessageField& field = fData->FieldAt(uint32(number));
-	if (type != B_ANY_TYPE && type != field.type)
-		return B_BAD_TYPE;
 	if (index < 0 || uint32(index) >= field.count)
 		return B_BAD_INDEX;
 	*_number = uint32(number);
