@@ -1,9 +1,9 @@
 // BMimeType: what the system knows about a type of file.
 #pragma once
 
-#include <SupportDefs.h>
-
 #include <StorageDefs.h>
+#include <SupportDefs.h>
+#include <TypeConstants.h>
 
 class BBitmap;
 class BMessage;
@@ -20,20 +20,6 @@ typedef enum { B_OPEN = 0 } app_verb;
 #define B_PE_APP_MIME_TYPE "application/x-vnd.Be-peexecutable"
 #define B_RESOURCE_MIME_TYPE "application/x-be-resource"
 #define B_FILE_MIME_TYPE "application/octet-stream"
-
-// Of addresses, by their schemes.
-#define B_URL_HTTP "application/x-vnd.Be.URL.http"
-#define B_URL_HTTPS "application/x-vnd.Be.URL.https"
-#define B_URL_FTP "application/x-vnd.Be.URL.ftp"
-#define B_URL_GOPHER "application/x-vnd.Be.URL.gopher"
-#define B_URL_MAILTO "application/x-vnd.Be.URL.mailto"
-#define B_URL_NEWS "application/x-vnd.Be.URL.news"
-#define B_URL_NNTP "application/x-vnd.Be.URL.nntp"
-#define B_URL_TELNET "application/x-vnd.Be.URL.telnet"
-#define B_URL_RLOGIN "application/x-vnd.Be.URL.rlogin"
-#define B_URL_TN3270 "application/x-vnd.Be.URL.tn3270"
-#define B_URL_WAIS "application/x-vnd.Be.URL.wais"
-#define B_URL_FILE "application/x-vnd.Be.URL.file"
 
 enum {
 	B_META_MIME_CHANGED = 'MMCH',
