@@ -1,3 +1,6 @@
+// What checks and prints is tried in release builds, too.
+#undef NDEBUG
+
 #include <cerrno>
 #include <cstring>
 
