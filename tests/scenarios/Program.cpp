@@ -63,6 +63,8 @@ RunningProgram::RunningProgram(const std::vector<std::string>& command,
 		if (inheritedPipe >= 0)
 			fcntl(inheritedPipe, F_SETFD, 0);
 		setenv("XDG_CONFIG_HOME", fFolder.c_str(), 1); // the user's own settings are not ours
+		// A bus that libraries start where there is none would outlive the program.
+		setenv("DBUS_SESSION_BUS_ADDRESS", "disabled:", 1);
 		Execute(command, environment);
 	}
 	fHandle = static_cast<int>(syscall(SYS_pidfd_open, fProcess, 0));
