@@ -162,7 +162,8 @@ TEST(RdefCompiler, HeadsGiveIdNameAndType)
 									  "resource 1; resource(5) #'ABCD' 2; resource(6, \"six\") 3;"
 									  "resource(\"seven\") (int8)4; resource(kTwo) 5;"
 									  "resource(-3) #0x41414141 6; resource() #200 true;"
-									  "resource(kOne, \"k\") 7; resource(#'CSTR') $\"00\";");
+									  "resource(kOne, \"k\") 7; resource(#'CSTR') $\"00\";"
+									  "resource(9, \"nine\") ( #'WXYZ' ) (int8)8;");
 	ASSERT_TRUE(compiled.fine) << compiled.error;
 	const char* name = NULL;
 	EXPECT_TRUE(compiled.resources->HasResource(B_INT32_TYPE, 1));
@@ -175,6 +176,9 @@ TEST(RdefCompiler, HeadsGiveIdNameAndType)
 	EXPECT_TRUE(compiled.resources->HasResource('AAAA', -3));
 	EXPECT_TRUE(compiled.resources->HasResource(200, 1));
 	EXPECT_TRUE(compiled.resources->HasResource('CSTR', 1));
+	EXPECT_EQ("\x08", compiled.Bytes('WXYZ', 9));
+	ExpectError("resource(1)\n(#'ABCD' 5);", "')' is expected", 2);
+	ExpectError("resource(1) 5 + (#'ABCD') 5;", "a value is expected");
 	ExpectError("resource 1;\nresource 2;", "duplicate resource LONG:1", 2);
 	CompileOptions merging;
 	merging.merge = true;
@@ -184,6 +188,34 @@ TEST(RdefCompiler, HeadsGiveIdNameAndType)
 	const Compiled named = Compile("enum { kId = 4 }; resource(kId) 1;", naming);
 	ASSERT_TRUE(named.resources->GetResourceInfo(B_INT32_TYPE, 4, &name, NULL));
 	EXPECT_STREQ("kId", name);
+}
+
+
+TEST(RdefCompiler, ResourcesOfApplicationsHaveTheirOwnNamesAndIds)
+{
+	const struct {
+		const char* data;
+		type_code type;
+		int32 id;
+		const char* name;
+	} kResources[] = { { "app_signature \"a/b\"", 'MIMS', 1, "BEOS:APP_SIG" },
+		{ "app_name_catalog_entry \"a:b:c\"", 'CSTR', 1, "SYS:NAME" },
+		{ "app_flags B_ARGV_ONLY", 'APPF', 1, "BEOS:APP_FLAGS" },
+		{ "app_version { 1 }", 'APPV', 1, "BEOS:APP_VERSION" },
+		{ "file_types message { \"types\" = \"a/b\" }", 'MSGG', 1, "BEOS:FILE_TYPES" },
+		{ "large_icon array { $\"00\" }", 'ICON', 101, "BEOS:L:STD_ICON" },
+		{ "mini_icon array { $\"00\" }", 'MICN', 101, "BEOS:M:STD_ICON" },
+		{ "vector_icon array { $\"00\" }", 'VICN', 101, "BEOS:ICON" },
+		{ "png_icon array { $\"00\" }", 'PNG ', 101, "BEOS:ICON" } };
+	for (const auto& resource : kResources) {
+		const Compiled compiled = Compile(std::string("resource ") + resource.data + ";");
+		ASSERT_TRUE(compiled.fine) << resource.data << ": " << compiled.error;
+		const char* name = NULL;
+		ASSERT_TRUE(
+			compiled.resources->GetResourceInfo(resource.type, resource.id, &name, NULL))
+			<< resource.data;
+		EXPECT_STREQ(resource.name, name);
+	}
 }
 
 

@@ -118,14 +118,9 @@ Compiler::_Resource()
 bool
 Compiler::_Head(Head* _head)
 {
-	if (fToken.Is('(')) {
+	if (fToken.Is('(') && !fLexer->SeesTypeCode()) {
 		if (!_Advance())
 			return false;
-		// What looks like the head may be the type code: resource (#'CSTR') "text";
-		if (fToken.kind == TokenKind::kTypeCode) {
-			_head->type = fToken.integer;
-			return _Advance() && _Expect(')');
-		}
 		if (!fToken.Is(')') && fToken.kind != TokenKind::kString) {
 			const std::string symbol =
 				fToken.kind == TokenKind::kIdentifier ? fToken.text : std::string();
@@ -166,14 +161,17 @@ Compiler::_Id(int32* _id)
 }
 
 
+// A type code, with or without parentheses, or none.
 bool
 Compiler::_TypeCode(std::optional<type_code>* _type)
 {
-	if (fToken.kind == TokenKind::kTypeCode) {
-		*_type = fToken.integer;
-		return _Advance();
-	}
-	return true;
+	const bool enclosed = fToken.Is('(') && fLexer->SeesTypeCode();
+	if (enclosed && !_Advance())
+		return false;
+	if (fToken.kind != TokenKind::kTypeCode)
+		return true;
+	*_type = fToken.integer;
+	return _Advance() && (!enclosed || _Expect(')'));
 }
 
 

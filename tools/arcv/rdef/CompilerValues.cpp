@@ -125,10 +125,6 @@ Compiler::_Parenthesis(Value* _value)
 {
 	if (!_Advance())
 		return false;
-	if (fToken.kind == TokenKind::kTypeCode) {
-		// (#'CSTR') says the resource's type, which a cast cannot.
-		return _Fail("a type code is expected in front of the data only");
-	}
 	if (fToken.kind == TokenKind::kIdentifier && _FindType(fToken.text) != nullptr) {
 		const RdefType* type = _FindType(fToken.text);
 		const Token name = fToken;

@@ -117,6 +117,14 @@ Lexer::Next(Token* _token)
 }
 
 
+bool
+Lexer::SeesTypeCode()
+{
+	_SkipWhite();
+	return _Peek() == '#';
+}
+
+
 // #pragma mark - private
 
 

@@ -52,6 +52,8 @@ public:
 
 	// False when the text cannot be cut up further; Error() says why.
 	bool Next(Token* _token);
+	// Whether the next token begins as a type code does.
+	bool SeesTypeCode();
 	const RdefError& Error() const { return fError; }
 	const std::string& FileName(int32 file) const { return fNames[file]; }
 

@@ -111,6 +111,7 @@ MakeTable()
 	for (const char* name : { "message", "archive" })
 		AddType(table, name, B_MESSAGE_TYPE, Kind::kMessage, 0);
 	AddResourceType(table, "app_signature", 'MIMS', Kind::kBytes, 1, "BEOS:APP_SIG");
+	AddResourceType(table, "app_name_catalog_entry", 'CSTR', Kind::kBytes, 1, "SYS:NAME");
 	AddResourceType(table, "app_flags", 'APPF', Kind::kInteger, 1, "BEOS:APP_FLAGS");
 	AddResourceType(table, "file_types", 'MSGG', Kind::kMessage, 1, "BEOS:FILE_TYPES");
 	AddResourceType(table, "large_icon", 'ICON', Kind::kBytes, kIconId, "BEOS:L:STD_ICON");
