@@ -1,5 +1,6 @@
 // From the nested form back to the managed one.
 
+#include <cstring>
 #include <vector>
 
 #include "app/private/ManagedNote.h"
@@ -36,7 +37,7 @@ public:
 	}
 
 private:
-	// Indices of the objects in each of kObjectFields.
+	// Indices of the objects in each of kObjectFields, kNoObject for the page that a tab lacks.
 	struct Children {
 		std::vector<int32> objects[3];
 	};
@@ -50,6 +51,11 @@ private:
 
 	static void clear_note(BMessage* message) { set_note(message, nullptr); }
 
+	static bool is_no_page(const BMessage& view)
+	{
+		return view.IsEmpty() && view.what == 0 && note_of(view) == nullptr;
+	}
+
 	// Parents come first, in the order in which the form numbers its objects.
 	Children _Collect(const BMessage& parent, int32 depth)
 	{
@@ -57,8 +63,14 @@ private:
 		for (size_t f = 0; f < 3; f++) {
 			if (!holds_objects(parent, kObjectFields[f]))
 				continue;
+			const bool ofPages =
+				strcmp(kObjectFields[f], kTabViews) == 0 && !children.objects[1].empty();
 			BMessage child;
 			for (int32 i = 0; parent.FindMessage(kObjectFields[f], i, &child) == B_OK; i++) {
+				if (ofPages && is_no_page(child)) {
+					children.objects[f].push_back(kNoObject);
+					continue;
+				}
 				const auto index = int32(fObjects.size());
 				fObjects.push_back({ child, _OldToken(child), kNoObject, {} });
 				children.objects[f].push_back(index);
@@ -169,7 +181,7 @@ private:
 				continue;
 			BMessage tokens;
 			for (int32 index : children.objects[f])
-				tokens.AddInt32(name, fObjects[size_t(index)].token);
+				tokens.AddInt32(name, index < 0 ? kNoObject : fObjects[size_t(index)].token);
 			status = put_field(message, name, tokens);
 		}
 		const bool isOfOrigin =
@@ -221,7 +233,7 @@ private:
 		const std::vector<int32>& views = children.objects[2];
 		const int32 front = tabView.FindInt32("_sel");
 		if (children.objects[0].empty() || !tabView.HasInt32("_sel") || front < 0
-			|| size_t(front) >= views.size())
+			|| size_t(front) >= views.size() || views[size_t(front)] < 0)
 			return B_OK;
 
 		Object& container = fObjects[size_t(children.objects[0][0])];

@@ -108,9 +108,11 @@ private:
 			if (is_ambiguous(*object, name))
 				return B_BAD_DATA;
 		}
+		const bool hasTabs = count_of(*object, kTabs, B_INT32_TYPE) > 0;
 		for (const char* name : kObjectFields) {
 			if (status == B_OK)
-				status = _ConvertField(object, name, depth);
+				status =
+					_ConvertField(object, name, hasTabs && strcmp(name, kTabViews) == 0, depth);
 		}
 		for (const char* name : kObjectFields) {
 			if (status == B_OK && holds_objects(*object, name))
@@ -138,7 +140,9 @@ private:
 		return B_OK;
 	}
 
-	status_t _ConvertField(BMessage* object, const char* name, int32 depth)
+	// Pages keep their numbers, so a tab without one gets an empty message. Other fields that name no
+	// object at all are no lists of objects and stay as they are.
+	status_t _ConvertField(BMessage* object, const char* name, bool ofPages, int32 depth)
 	{
 		const int32 count = count_of(*object, name, B_INT32_TYPE);
 		if (count == 0)
@@ -148,26 +152,39 @@ private:
 			return B_BAD_DATA;
 
 		BMessage children;
+		bool namesNone = true;
 		for (int32 i = 0; i < count; i++) {
 			const int32 token = object->FindInt32(name, i);
-			if (token < 0
-				|| (strcmp(name, kViews) == 0 && token <= fOrigin->objectCount
-					&& fIsTabView[size_t(token)]))
+			namesNone &= token < 0 && !ofPages;
+			if (token < 0 ? !ofPages : _IsShownPage(name, token))
 				continue;
-			// An object in two places could not be written back.
-			if (token == 0 || token > fOrigin->objectCount || fPlaced[size_t(token)])
-				return B_BAD_DATA;
-			fPlaced[size_t(token)] = true;
 			BMessage child;
-			status_t status = fOrigin->root.FindMessage(kObjects, token - 1, &child);
-			if (status == B_OK)
-				status = _ConvertObject(&child, token, depth + 1);
+			status_t status = token < 0 ? B_OK : _Place(token, &child, depth);
 			if (status == B_OK)
 				status = children.AddMessage(name, &child);
 			if (status != B_OK)
 				return status;
 		}
+		if (namesNone)
+			return B_OK;
 		return children.IsEmpty() ? object->RemoveName(name) : put_field(object, name, children);
+	}
+
+	// Whether a container names it only because it is the view of the tab in front.
+	bool _IsShownPage(const char* name, int32 token) const
+	{
+		return strcmp(name, kViews) == 0 && token <= fOrigin->objectCount
+			&& fIsTabView[size_t(token)];
+	}
+
+	status_t _Place(int32 token, BMessage* _object, int32 depth)
+	{
+		// An object in two places could not be written back.
+		if (token == 0 || token > fOrigin->objectCount || fPlaced[size_t(token)])
+			return B_BAD_DATA;
+		fPlaced[size_t(token)] = true;
+		const status_t status = fOrigin->root.FindMessage(kObjects, token - 1, _object);
+		return status == B_OK ? _ConvertObject(_object, token, depth + 1) : status;
 	}
 
 	ManagedOrigin* fOrigin; // a reference

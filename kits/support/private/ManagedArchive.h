@@ -12,13 +12,14 @@ bool is_managed_archive(const BMessage& archive);
 // Turns a managed archive into the nested form in place: each token of "_views", and of a tab view's
 // "_l_items" and "_view_list", becomes the message that it names. A page that both "_view_list" and
 // the tab view's container name is left in "_view_list" only, as the nested form has it, and goes
-// into both again on the way back (the container of the selected page, "_sel"). A note stays with
-// the message and with each child (no field: it is not flattened, and goes along with copies) of
-// where it came from, and with the root of all objects that are no children of a view. B_BAD_DATA,
-// and nothing is changed, for a token that is out of range, or would put a view into itself or into
-// two places, and when several fields have one of these names. Does nothing to an archive that is
-// not managed. instantiate_object() does this before the class sees the archive, and gives the
-// caller's message back as it was.
+// into both again on the way back (the container of the selected page, "_sel"). A tab without a
+// page, a negative token, has an empty message there; a list of negative tokens alone stays. A note
+// stays with the message and with each child (no field: it is not flattened, and goes along with
+// copies) of where it came from, and with the root of all objects that are no children of a view.
+// B_BAD_DATA, and nothing is changed, for a token that is out of range, or would put a view into
+// itself or into two places, and when several fields have one of these names. Does nothing to an
+// archive that is not managed. instantiate_object() does this before the class sees the archive, and
+// gives the caller's message back as it was.
 status_t unmanage_archive(BMessage* archive);
 
 // The opposite, for a tree whose root carries a note: collects the children below "_views" into the

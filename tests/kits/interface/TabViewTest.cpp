@@ -6,6 +6,7 @@
 #include <Font.h>
 
 #include "ControlFixture.h"
+#include "support/Dump.h"
 
 namespace {
 
@@ -411,36 +412,61 @@ TEST(TabView, APageOfAnUnknownClassStaysWhatItIs)
 }
 
 
+// The objects by their numbers: the container, then each tab and its page. The page in front is
+// named by the list and by the container.
+BMessage
+ManagedArchiveOf(const BTabView& view)
+{
+	BMessage archive = ArchiveOf(view);
+	BMessage container;
+	EXPECT_EQ(B_OK, archive.FindMessage("_views", &container));
+	container.AddInt32("_views", 3 + 2 * view.Selection());
+	archive.AddMessage("_managed_archivable", &container);
+	for (const char* name : { "_views", "_l_items", "_view_list" })
+		archive.RemoveName(name);
+	archive.AddInt32("_views", 1);
+	for (int32 i = 0; i < view.CountTabs(); i++) {
+		archive.AddInt32("_l_items", 2 + 2 * i);
+		archive.AddInt32("_view_list", 3 + 2 * i);
+		const BMessage tab = ArchiveOf(*view.TabAt(i));
+		archive.AddMessage("_managed_archivable", &tab);
+		const BMessage page = ArchiveOf(*view.ViewForTab(i));
+		archive.AddMessage("_managed_archivable", &page);
+	}
+	archive.AddBool("_managed_archive", true);
+	return archive;
+}
+
+
 TEST(TabView, AManagedArchiveOfATabViewStaysManaged)
 {
 	BApplication app("application/x-vnd.Archway-test");
 	std::unique_ptr<BTabView> model(NewTabView(2));
 	model->Select(1);
-	BMessage archive = ArchiveOf(*model);
-	BMessage container;
-	ASSERT_EQ(B_OK, archive.FindMessage("_views", &container));
-
-	// The objects by their numbers: the container, then each tab and its page. The page in front
-	// is named by the list and by the container.
-	std::vector<BMessage> objects = { container };
-	objects[0].AddInt32("_views", 5);
-	for (int32 i = 0; i < 2; i++) {
-		objects.push_back(ArchiveOf(*model->TabAt(i)));
-		objects.push_back(ArchiveOf(*model->ViewForTab(i)));
-	}
-	for (const char* name : { "_views", "_l_items", "_view_list" })
-		archive.RemoveName(name);
-	archive.AddInt32("_views", 1);
-	for (int32 i = 0; i < 2; i++) {
-		archive.AddInt32("_l_items", 2 + 2 * i);
-		archive.AddInt32("_view_list", 3 + 2 * i);
-	}
-	for (const BMessage& object : objects)
-		archive.AddMessage("_managed_archivable", &object);
-	archive.AddBool("_managed_archive", true);
-
+	BMessage archive = ManagedArchiveOf(*model);
 	std::unique_ptr<BTabView> revived = Revive<BTabView>(archive);
 	EXPECT_EQ("First Second", Labels(revived.get()));
 	EXPECT_EQ(revived->ContainerView(), revived->ViewForTab(1)->Parent());
 	EXPECT_TRUE(archive.HasSameData(ArchiveOf(*revived), true, true));
+}
+
+
+TEST(TabView, APageThatAManagedArchiveLacksMovesNoOther)
+{
+	ControlFixture fixture;
+	std::unique_ptr<BTabView> model(NewTabView(3));
+	model->Select(0);
+	BMessage archive = ManagedArchiveOf(*model);
+	archive.ReplaceInt32("_view_list", 1, -42);
+	BTabView* revived = fixture.Add(Revive<BTabView>(archive).release());
+	fixture.driver.Click(revived, MiddleOfTab(revived, 1));
+	EXPECT_EQ(1, revived->Selection());
+	fixture.driver.Click(revived, MiddleOfTab(revived, 2));
+	const BMessage written = fixture.Locked([&] {
+		EXPECT_EQ(3, revived->CountTabs());
+		EXPECT_STREQ("Third", revived->TabAt(2)->Label());
+		revived->Select(0);
+		return ArchiveOf(*revived);
+	});
+	EXPECT_EQ("", test::first_difference(archive, written));
 }

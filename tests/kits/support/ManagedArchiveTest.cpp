@@ -276,6 +276,55 @@ TEST(ManagedArchive, ATabViewOwnsTheViewOfItsFrontTab)
 }
 
 
+// Else the page of the second tab would be shown by the first.
+TEST(ManagedArchive, ATabWithoutAPageKeepsTheNumbersOfTheOthers)
+{
+	BMessage root = object("BTabView", { 1 });
+	root.AddInt32("_sel", 0);
+	for (int32 token : { 2, 3 })
+		root.AddInt32("_l_items", token);
+	for (int32 token : { -42, 4 })
+		root.AddInt32("_view_list", token);
+	for (const char* name : { "BView", "BTab", "BTab", "BBox" }) {
+		const BMessage child = object(name);
+		root.AddMessage("_managed_archivable", &child);
+	}
+	root.AddBool("_managed_archive", true);
+
+	BMessage archive(root);
+	ASSERT_EQ(B_OK, unmanage_archive(&archive));
+	BMessage page;
+	ASSERT_EQ(B_OK, archive.FindMessage("_view_list", 0, &page));
+	EXPECT_TRUE(page.IsEmpty());
+	ASSERT_EQ(B_OK, archive.FindMessage("_view_list", 1, &page));
+	EXPECT_STREQ("BBox", page.FindString("class"));
+	ASSERT_EQ(B_OK, manage_archive(&archive));
+	EXPECT_EQ("", test::first_difference(root, archive));
+}
+
+
+TEST(ManagedArchive, FieldsThatNameNoObjectStayAsTheyAre)
+{
+	for (const char* name : { "_views", "_l_items", "_view_list" }) {
+		SCOPED_TRACE(name);
+		BMessage child = object("BButton");
+		child.RemoveName("_views");
+		child.AddInt32(name, -1);
+		child.AddInt32(name, -2);
+		BMessage root = object("BView", { 1 });
+		root.AddMessage("_managed_archivable", &child);
+		root.AddBool("_managed_archive", true);
+		BMessage archive(root);
+		ASSERT_EQ(B_OK, unmanage_archive(&archive));
+		BMessage button;
+		ASSERT_EQ(B_OK, archive.FindMessage("_views", &button));
+		EXPECT_TRUE(button.HasInt32(name, 1));
+		ASSERT_EQ(B_OK, manage_archive(&archive));
+		EXPECT_EQ("", test::first_difference(root, archive));
+	}
+}
+
+
 TEST(ManagedArchive, SamplesComeBackExactly)
 {
 	if (test::samples_folder().empty())
