@@ -246,7 +246,8 @@ NewPageGroup(BRect frame)
 	second->SetViewColor(216, 216, 216);
 	second->AddChild(new BStringView(BRect(10, 8, 300, 24), "text", "The second page"));
 	tabs->AddTab(second);
+	tabs->AddTab(NewValuePage(page));
 	tabs->AddTab(new BView(page, "Disabled", B_FOLLOW_ALL, B_WILL_DRAW));
-	tabs->TabAt(2)->SetEnabled(false);
+	tabs->TabAt(3)->SetEnabled(false);
 	return tabs;
 }

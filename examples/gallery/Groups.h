@@ -16,3 +16,6 @@ BView* NewStatusGroup(BRect frame);
 BView* NewListGroup(BRect frame);
 BView* NewTextGroup(BRect frame);
 BView* NewPageGroup(BRect frame);
+
+// A page of the last group.
+BView* NewValuePage(BRect frame);

@@ -17,6 +17,8 @@
 #include <MenuBar.h>
 #include <MenuField.h>
 #include <MenuItem.h>
+#include <OptionControl.h>
+#include <OptionPopUp.h>
 #include <OutlineListView.h>
 #include <PictureButton.h>
 #include <Point.h>

@@ -18,12 +18,12 @@ extern "C" size_t LLVMFuzzerMutate(uint8_t* data, size_t size, size_t maxSize);
 namespace {
 
 const char* const kClasses[] = { "BView", "BBox", "BButton", "BCheckBox", "BColorControl",
-	"BControl", "BListView", "BMenu", "BMenuBar", "BMenuField", "BMenuItem", "BOutlineListView",
-	"BPictureButton", "BPopUpMenu", "BRadioButton", "BScrollBar", "BScrollView", "BSeparatorItem",
-	"BShape", "BSlider", "BStatusBar", "BStringItem", "BStringView", "BTab", "BTabView",
-	"BTextControl", "BTextView", "BBitmap", "BCursor", "BHandler", "BLooper", "BWindow", "BAlert",
-	"BApplication", "BitmapView", "LayoutInheritedView", "HiliteView", "Unknown", "A::Stranger",
-	"_BMCMenuBar_", "_BTextInput_", "" };
+	"BControl", "BListView", "BMenu", "BMenuBar", "BMenuField", "BMenuItem", "BOptionPopUp",
+	"BOutlineListView", "BPictureButton", "BPopUpMenu", "BRadioButton", "BScrollBar", "BScrollView",
+	"BSeparatorItem", "BShape", "BSlider", "BStatusBar", "BStringItem", "BStringView", "BTab",
+	"BTabView", "BTextControl", "BTextView", "BBitmap", "BCursor", "BHandler", "BLooper", "BWindow",
+	"BAlert", "BApplication", "BitmapView", "LayoutInheritedView", "HiliteView", "Unknown",
+	"A::Stranger", "_BMCMenuBar_", "_BTextInput_", "" };
 
 const char* const kNames[] = { "class", "add_on", "_views", "_view_list", "_l_items", "_name",
 	"_frame", "_resize_mode", "_flags", "_evmask", "_fname", "_fflt", "_color", "_uicolor",

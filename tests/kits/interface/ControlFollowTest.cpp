@@ -6,6 +6,7 @@
 #include <ListView.h>
 #include <MenuBar.h>
 #include <MenuField.h>
+#include <OptionPopUp.h>
 #include <OutlineListView.h>
 #include <PictureButton.h>
 #include <RadioButton.h>
@@ -32,6 +33,7 @@ OneOfEachClass()
 		new BButton(kFrame, "button", "Label", NULL),
 		new BCheckBox(kFrame, "check", "Label", NULL),
 		new BColorControl(kFrame.LeftTop(), B_CELLS_32x8, 6, "color"),
+		new BOptionPopUp(kFrame, "options", "Label", NULL),
 		new BPictureButton(kFrame, "picture", NULL),
 		new BRadioButton(kFrame, "radio", "Label", NULL),
 		new BSlider(kFrame, "slider", "Label", NULL, 0, 100),

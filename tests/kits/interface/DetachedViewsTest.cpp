@@ -83,6 +83,7 @@ INSTANTIATE_TEST_SUITE_P(Classes, DetachedViews,
 		+[]() -> BView* {
 			return new BMenuField(kFrame, nullptr, nullptr, new BPopUpMenu("menu"));
 		},
+		+[]() -> BView* { return new BOptionPopUp(kFrame, nullptr, nullptr, nullptr); },
 		+[]() -> BView* { return new BOutlineListView(kFrame, nullptr); },
 		+[]() -> BView* { return new BPictureButton(kFrame, nullptr, nullptr); },
 		+[]() -> BView* { return new BRadioButton(kFrame, nullptr, nullptr, nullptr); },

@@ -10,6 +10,7 @@
 #include <ListView.h>
 #include <MenuBar.h>
 #include <MenuField.h>
+#include <OptionPopUp.h>
 #include <OutlineListView.h>
 #include <PopUpMenu.h>
 #include <RadioButton.h>
@@ -87,7 +88,8 @@ TEST(Scripting, EveryClassNamesItsSuites)
 	BTextControl field(kFrame, "", "", "", NULL);
 	BSlider slider(kFrame, "", "", NULL, 0, 1);
 	BColorControl color(BPoint(0, 0), B_CELLS_16x16, 4, "");
-	BControl* const controls[] = { &button, &check, &radio, &field, &slider, &color };
+	BOptionPopUp options(kFrame, "", "", NULL);
+	BControl* const controls[] = { &button, &check, &radio, &field, &slider, &color, &options };
 	for (BControl* control : controls)
 		EXPECT_EQ("suite/vnd.Be-control " + base, SuitesOf(*control)) << "GetSupportedSuites()";
 
@@ -142,9 +144,10 @@ TEST(Scripting, EveryClassFindsItsChildrenByNameAndPlace)
 	BPopUpMenu popUp("");
 	BMenu menu("menu");
 	BControl control(kFrame, "", "", NULL, 0, 0);
+	BOptionPopUp options(kFrame, "", "", NULL);
 	BView* const views[] = { &view, &box, &button, &check, &radio, &field, &slider, &color, &status,
 		&string, &text, &list, &outline, &tabs, &scroller, &bar, &menuField, &menuBar, &popUp,
-		&menu, &control };
+		&menu, &control, &options };
 	for (BView* each : views) {
 		SCOPED_TRACE(typeid(*each).name());
 		BView* inner = new BView(BRect(0, 0, 5, 5), "inner", 0, 0);

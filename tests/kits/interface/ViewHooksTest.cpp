@@ -10,6 +10,7 @@
 #include <MenuBar.h>
 #include <MenuField.h>
 #include <MenuItem.h>
+#include <OptionPopUp.h>
 #include <OutlineListView.h>
 #include <PictureButton.h>
 #include <RadioButton.h>
@@ -167,6 +168,9 @@ TEST(ViewHooks, OfControlsAreCalled)
 	});
 	ExpectHooks("BSlider", [](HookCounts& counts) {
 		return new Hooked<BSlider>(counts, kFrame, "s", "Label", nullptr, 0, 10);
+	});
+	ExpectHooks("BOptionPopUp", [](HookCounts& counts) {
+		return new Hooked<BOptionPopUp>(counts, kFrame, "o", "Label", nullptr);
 	});
 	ExpectHooks("BColorControl", [](HookCounts& counts) {
 		return new Hooked<BColorControl>(counts, BPoint(20, 20), B_CELLS_32x8, 6.0f, "c");
