@@ -6,6 +6,30 @@
 
 #include <Flattenable.h>
 
+namespace {
+
+// What the object flattens to, as the function's data and size.
+template<typename Function>
+status_t
+WithFlatData(const BFlattenable* object, Function function)
+{
+	if (object == nullptr)
+		return B_BAD_VALUE;
+	const ssize_t size = object->FlattenedSize();
+	if (size <= 0)
+		return B_BAD_VALUE;
+	void* data = malloc(size_t(size));
+	if (data == nullptr)
+		return B_NO_MEMORY;
+	status_t status = object->Flatten(data, size);
+	if (status == B_OK)
+		status = function(data, size);
+	free(data);
+	return status;
+}
+
+} // namespace
+
 
 status_t
 BMessage::AddFlat(const char* name, BFlattenable* object, int32 count)
@@ -17,19 +41,9 @@ BMessage::AddFlat(const char* name, BFlattenable* object, int32 count)
 status_t
 BMessage::AddFlat(const char* name, const BFlattenable* object, int32 count)
 {
-	if (name == nullptr || object == nullptr)
-		return B_BAD_VALUE;
-	const ssize_t size = object->FlattenedSize();
-	if (size <= 0)
-		return B_BAD_VALUE;
-	void* buffer = malloc(size_t(size));
-	if (buffer == nullptr)
-		return B_NO_MEMORY;
-	status_t status = object->Flatten(buffer, size);
-	if (status == B_OK)
-		status = AddData(name, object->TypeCode(), buffer, size, false, count);
-	free(buffer);
-	return status;
+	return WithFlatData(object, [&](const void* data, ssize_t size) {
+		return AddData(name, object->TypeCode(), data, size, false, count);
+	});
 }
 
 
@@ -62,19 +76,9 @@ BMessage::ReplaceFlat(const char* name, BFlattenable* object)
 status_t
 BMessage::ReplaceFlat(const char* name, int32 index, BFlattenable* object)
 {
-	if (object == nullptr)
-		return B_BAD_VALUE;
-	const ssize_t size = object->FlattenedSize();
-	if (size <= 0)
-		return B_BAD_VALUE;
-	void* buffer = malloc(size_t(size));
-	if (buffer == nullptr)
-		return B_NO_MEMORY;
-	status_t status = object->Flatten(buffer, size);
-	if (status == B_OK)
-		status = ReplaceData(name, object->TypeCode(), index, buffer, size);
-	free(buffer);
-	return status;
+	return WithFlatData(object, [&](const void* data, ssize_t size) {
+		return ReplaceData(name, object->TypeCode(), index, data, size);
+	});
 }
 
 
