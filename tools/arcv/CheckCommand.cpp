@@ -271,13 +271,10 @@ PrintReport(const Report& report, const std::string& file)
 
 
 void
-PrintJson(const Report& report)
+WriteFindings(JsonWriter& json, const std::vector<Finding>& findings)
 {
-	JsonWriter json;
-	json.OpenObject();
-	json.Name("findings");
 	json.OpenArray();
-	for (const Finding& finding : report.findings) {
+	for (const Finding& finding : findings) {
 		json.OpenObject(true);
 		json.Name("offset");
 		json.Integer(finding.offset);
@@ -286,9 +283,14 @@ PrintJson(const Report& report)
 		json.CloseObject();
 	}
 	json.CloseArray();
-	json.Name("items");
+}
+
+
+void
+WritePlaces(JsonWriter& json, const std::vector<resource_place>& places)
+{
 	json.OpenArray();
-	for (const resource_place& place : report.places) {
+	for (const resource_place& place : places) {
 		json.OpenObject(true);
 		json.Name("type");
 		json.String(TypeText(place.type));
@@ -303,6 +305,18 @@ PrintJson(const Report& report)
 		json.CloseObject();
 	}
 	json.CloseArray();
+}
+
+
+void
+PrintJson(const Report& report)
+{
+	JsonWriter json;
+	json.OpenObject();
+	json.Name("findings");
+	WriteFindings(json, report.findings);
+	json.Name("items");
+	WritePlaces(json, report.places);
 	json.Name("remains");
 	json.OpenArray();
 	for (const auto& [key, remains] : report.remains) {

@@ -58,15 +58,42 @@ CompareBytes(const Item& item, const void* oldData, size_t oldSize, const void* 
 }
 
 
-// For each item how many before it have its type and id: normally 0.
-std::vector<int32>
-TwinNumbers(const std::vector<Item>& items)
+// Type and id, and how many before it have the same: normally 0.
+using ItemKey = std::tuple<type_code, int32, int32>;
+
+std::vector<ItemKey>
+KeysOf(const std::vector<Item>& items)
 {
 	std::map<std::pair<type_code, int32>, int32> counts;
-	std::vector<int32> numbers;
+	std::vector<ItemKey> keys;
 	for (const Item& item : items)
-		numbers.push_back(counts[{ item.type, item.id }]++);
-	return numbers;
+		keys.emplace_back(item.type, item.id, counts[{ item.type, item.id }]++);
+	return keys;
+}
+
+
+ItemDifference
+WholeItem(const Item& item, const char* what)
+{
+	return { ItemText(item.type, item.id), what,
+		"\"" + item.name + "\", " + std::to_string(item.size) + " bytes", {} };
+}
+
+
+// False after a complaint.
+bool
+CompareItem(Input& oldInput, const Item& item, Input& newInput, const Item& other,
+	std::vector<ItemDifference>* _differences)
+{
+	if (item.name != other.name)
+		_differences->push_back({ ItemText(item.type, item.id), "renamed",
+			"\"" + item.name + "\" became \"" + other.name + "\"", {} });
+	const void* oldData = oldInput.Load(item);
+	const void* newData = newInput.Load(other);
+	if (oldData == NULL || newData == NULL)
+		return false;
+	CompareBytes(item, oldData, item.size, newData, other.size, _differences);
+	return true;
 }
 
 
@@ -74,48 +101,31 @@ TwinNumbers(const std::vector<Item>& items)
 bool
 CompareItems(Input& oldInput, Input& newInput, std::vector<ItemDifference>* _differences)
 {
-	using Key = std::tuple<type_code, int32, int32>;
-	const std::vector<int32> oldTwins = TwinNumbers(oldInput.Items());
-	const std::vector<int32> newTwins = TwinNumbers(newInput.Items());
-	const auto oldKey = [&](const Item& item) {
-		return Key(item.type, item.id, oldTwins[item.index]);
-	};
-	const auto newKey = [&](const Item& item) {
-		return Key(item.type, item.id, newTwins[item.index]);
-	};
-	std::map<Key, const Item*> news;
+	const std::vector<ItemKey> oldKeys = KeysOf(oldInput.Items());
+	const std::vector<ItemKey> newKeys = KeysOf(newInput.Items());
+	std::map<ItemKey, const Item*> news;
 	for (const Item& item : newInput.Items())
-		news.emplace(newKey(item), &item);
+		news.emplace(newKeys[item.index], &item);
 
-	std::vector<Key> oldOrder;
+	std::vector<ItemKey> oldOrder;
 	for (const Item& item : oldInput.Items()) {
-		const Key key = oldKey(item);
-		const auto found = news.find(key);
+		const auto found = news.find(oldKeys[item.index]);
 		if (found == news.end()) {
-			_differences->push_back({ ItemText(item.type, item.id), "removed",
-				"\"" + item.name + "\", " + std::to_string(item.size) + " bytes", {} });
+			_differences->push_back(WholeItem(item, "removed"));
 			continue;
 		}
-		oldOrder.push_back(key);
-		const Item& other = *found->second;
-		if (item.name != other.name)
-			_differences->push_back({ ItemText(item.type, item.id), "renamed",
-				"\"" + item.name + "\" became \"" + other.name + "\"", {} });
-		const void* oldData = oldInput.Load(item);
-		const void* newData = newInput.Load(other);
-		if (oldData == NULL || newData == NULL)
+		oldOrder.push_back(found->first);
+		if (!CompareItem(oldInput, item, newInput, *found->second, _differences))
 			return false;
-		CompareBytes(item, oldData, item.size, newData, other.size, _differences);
 		news.erase(found);
 	}
 
-	std::vector<Key> newOrder;
+	std::vector<ItemKey> newOrder;
 	for (const Item& item : newInput.Items()) {
-		if (news.count(newKey(item)) == 0)
-			newOrder.push_back(newKey(item));
+		if (news.count(newKeys[item.index]) == 0)
+			newOrder.push_back(newKeys[item.index]);
 		else
-			_differences->push_back({ ItemText(item.type, item.id), "added",
-				"\"" + item.name + "\", " + std::to_string(item.size) + " bytes", {} });
+			_differences->push_back(WholeItem(item, "added"));
 	}
 	if (oldOrder != newOrder)
 		_differences->push_back({ "items", "moved", "the items have another order", {} });

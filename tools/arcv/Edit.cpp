@@ -13,50 +13,27 @@ namespace Arcv {
 
 namespace {
 
-// Saves into a file of its own, so that the output is never seen half done.
 int
-SaveAs(const std::string& file, const std::string& output,
-	const std::function<int(BResources& resources)>& change)
+Create(const std::string& file, const ResourceChange& change)
 {
-	const std::string temporary = output + "." + std::to_string(getpid()) + ".new";
-	if (!CopyFile(file, temporary))
-		return kUnreadable;
-	int status = EditFile(temporary, "", false, change);
-	if (status == kFine && rename(temporary.c_str(), output.c_str()) < 0) {
-		Complain(output, "it cannot be written");
-		status = kUnreadable;
-	}
+	BResources resources;
+	const int status = change(resources);
 	if (status != kFine)
-		unlink(temporary.c_str());
-	return status;
+		return status;
+	BFile created(file.c_str(), B_READ_WRITE | B_CREATE_FILE | B_FAIL_IF_EXISTS);
+	status_t error = created.InitCheck();
+	if (error == B_OK)
+		error = resources.WriteTo(&created);
+	if (error == B_OK)
+		return kFine;
+	Complain(file, StatusText(error));
+	return kUnreadable;
 }
 
-} // namespace
-
 
 int
-EditFile(const std::string& file, const std::string& output, bool create,
-	const std::function<int(BResources& resources)>& change)
+EditInPlace(const std::string& file, const ResourceChange& change)
 {
-	const bool missing = !Exists(file);
-	if (create && missing) {
-		const std::string target = output.empty() ? file : output;
-		BResources resources;
-		const int status = change(resources);
-		if (status != kFine)
-			return status;
-		BFile created(target.c_str(), B_READ_WRITE | B_CREATE_FILE | B_FAIL_IF_EXISTS);
-		status_t error = created.InitCheck();
-		if (error == B_OK)
-			error = resources.WriteTo(&created);
-		if (error == B_OK)
-			return kFine;
-		Complain(target, StatusText(error));
-		return kUnreadable;
-	}
-	if (!output.empty() && output != file)
-		return SaveAs(file, output, change);
-
 	Input input; // says what is wrong, and where
 	if (!input.Open(file))
 		return kUnreadable;
@@ -80,6 +57,38 @@ EditFile(const std::string& file, const std::string& output, bool create,
 		return kUnreadable;
 	}
 	return status;
+}
+
+
+// Saves into a file of its own, so that the output is never seen half done.
+int
+SaveAs(const std::string& file, const std::string& output, const ResourceChange& change)
+{
+	const std::string temporary = output + "." + std::to_string(getpid()) + ".new";
+	if (!CopyFile(file, temporary))
+		return kUnreadable;
+	int status = EditInPlace(temporary, change);
+	if (status == kFine && rename(temporary.c_str(), output.c_str()) < 0) {
+		Complain(output, "it cannot be written");
+		status = kUnreadable;
+	}
+	if (status != kFine)
+		unlink(temporary.c_str());
+	return status;
+}
+
+} // namespace
+
+
+int
+EditFile(
+	const std::string& file, const std::string& output, bool create, const ResourceChange& change)
+{
+	if (create && !Exists(file))
+		return Create(output.empty() ? file : output, change);
+	if (!output.empty() && output != file)
+		return SaveAs(file, output, change);
+	return EditInPlace(file, change);
 }
 
 } // namespace Arcv

@@ -62,32 +62,13 @@ bool
 Lexer::Next(Token* _token)
 {
 	*_token = Token();
-	for (;;) {
-		_SkipWhite();
-		Source& source = _Source();
-		_token->file = source.file;
-		_token->line = source.line;
-		const char next = _Peek();
-		if (source.place >= source.text.size()) {
-			if (fSources.size() == 1)
-				return true;
-			fSources.pop_back(); // the rest of the file that included this one
-			continue;
-		}
-		if (next == '/' && (_Peek(1) == '/' || _Peek(1) == '*')) {
-			if (!_SkipComment(_token))
-				return false;
-			if (_token->kind == TokenKind::kMark)
-				return true;
-			continue;
-		}
-		if (next == '#' && source.text.compare(source.place, 8, "#include") == 0) {
-			if (!_Include())
-				return false;
-			continue;
-		}
-		break;
+	bool atToken = false;
+	while (!atToken) {
+		if (!_SkipToToken(_token, &atToken))
+			return false;
 	}
+	if (_token->kind == TokenKind::kMark || _Source().place >= _Source().text.size())
+		return true;
 
 	const char next = _Peek();
 	if (next == '#')
@@ -102,18 +83,7 @@ Lexer::Next(Token* _token)
 	}
 	if (IsDigit(next) || (next == '.' && IsDigit(_Peek(1))))
 		return _Number(_token);
-	if (IsLetter(next)) {
-		_token->kind = TokenKind::kIdentifier;
-		while (IsLetter(_Peek()) || IsDigit(_Peek()))
-			_token->text += _Source().text[_Source().place++];
-		return true;
-	}
-	if (strchr("(){}[],;=|^&+-*/%~", next) == NULL || next == '\0')
-		return _Fail("there is a character that means nothing here");
-	_token->kind = TokenKind::kSign;
-	_token->sign = next;
-	_Source().place++;
-	return true;
+	return IsLetter(next) ? _Identifier(_token) : _Sign(_token);
 }
 
 
@@ -141,6 +111,32 @@ Lexer::_Fail(const std::string& reason)
 {
 	fError = { fNames[_Source().file], _Source().line, reason };
 	return false;
+}
+
+
+// One step over what is no token, which may be into an included file or out of it.
+bool
+Lexer::_SkipToToken(Token* _token, bool* _atToken)
+{
+	_SkipWhite();
+	Source& source = _Source();
+	_token->file = source.file;
+	_token->line = source.line;
+	if (source.place >= source.text.size()) {
+		*_atToken = fSources.size() == 1;
+		if (!*_atToken)
+			fSources.pop_back(); // the rest of the file that included this one
+		return true;
+	}
+	if (_Peek() == '/' && (_Peek(1) == '/' || _Peek(1) == '*')) {
+		const bool skipped = _SkipComment(_token);
+		*_atToken = _token->kind == TokenKind::kMark;
+		return skipped;
+	}
+	if (_Peek() == '#' && source.text.compare(source.place, 8, "#include") == 0)
+		return _Include();
+	*_atToken = true;
+	return true;
 }
 
 
@@ -175,6 +171,29 @@ Lexer::_SkipComment(Token* _mark)
 		_mark->kind = TokenKind::kMark;
 		_mark->text = text;
 	}
+	return true;
+}
+
+
+bool
+Lexer::_Identifier(Token* _token)
+{
+	_token->kind = TokenKind::kIdentifier;
+	while (IsLetter(_Peek()) || IsDigit(_Peek()))
+		_token->text += _Source().text[_Source().place++];
+	return true;
+}
+
+
+bool
+Lexer::_Sign(Token* _token)
+{
+	const char next = _Peek();
+	if (strchr("(){}[],;=|^&+-*/%~", next) == NULL || next == '\0')
+		return _Fail("there is a character that means nothing here");
+	_token->kind = TokenKind::kSign;
+	_token->sign = next;
+	_Source().place++;
 	return true;
 }
 

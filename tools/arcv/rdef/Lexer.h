@@ -68,8 +68,11 @@ private:
 	Source& _Source() { return fSources.back(); }
 	char _Peek(size_t ahead = 0);
 	bool _Fail(const std::string& reason);
+	bool _SkipToToken(Token* _token, bool* _atToken);
 	void _SkipWhite();
 	bool _SkipComment(Token* _mark);
+	bool _Identifier(Token* _token);
+	bool _Sign(Token* _token);
 	bool _Hash(Token* _token);
 	bool _Include();
 	bool _Number(Token* _token);
