@@ -29,13 +29,6 @@ IsTypeCharacter(char character)
 		&& strchr("/<>@,;:\"()[]?=\\", character) == NULL && character != 0x7f;
 }
 
-
-status_t
-SetGuess(const std::string& type, BMimeType* _type)
-{
-	return _type->SetTo(type.empty() ? B_FILE_MIME_TYPE : type.c_str());
-}
-
 } // namespace
 
 
@@ -69,6 +62,13 @@ BMimeType::SetTo(const char* type)
 		return fCStatus = B_NO_MEMORY;
 	fType = copy;
 	return fCStatus = B_OK;
+}
+
+
+status_t
+BMimeType::SetType(const char* type)
+{
+	return SetTo(type);
 }
 
 
@@ -237,50 +237,6 @@ BMimeType::GetInstalledTypes(const char* supertype, BMessage* _types)
 			_types->AddString("types", type.c_str());
 	}
 	return B_OK;
-}
-
-
-status_t
-BMimeType::GuessMimeType(const entry_ref* file, BMimeType* _type)
-{
-	if (file == NULL || file->name == NULL || _type == NULL)
-		return B_BAD_VALUE;
-	const BEntry entry(file);
-	struct stat stat;
-	const status_t status = entry.GetStat(&stat);
-	if (status != B_OK)
-		return status;
-	if (S_ISDIR(stat.st_mode))
-		return _type->SetTo("application/x-vnd.Be-directory");
-	if (S_ISLNK(stat.st_mode))
-		return _type->SetTo("application/x-vnd.Be-symlink");
-
-	std::vector<char> start(S_ISREG(stat.st_mode) ? MimeDatabase::Get().BytesNeeded() : 0);
-	BFile opened;
-	ssize_t read = 0;
-	if (!start.empty() && opened.SetTo(&entry, B_READ_ONLY) == B_OK)
-		read = opened.ReadAt(0, start.data(), start.size());
-	return SetGuess(
-		MimeDatabase::Get().TypeOf(file->name, start.data(), read > 0 ? read : 0), _type);
-}
-
-
-status_t
-BMimeType::GuessMimeType(const void* buffer, int32 length, BMimeType* _type)
-{
-	if (buffer == NULL || length < 0 || _type == NULL)
-		return B_BAD_VALUE;
-	return SetGuess(MimeDatabase::Get().TypeOfBytes(buffer, length), _type);
-}
-
-
-status_t
-BMimeType::GuessMimeType(const char* filename, BMimeType* _type)
-{
-	if (filename == NULL || _type == NULL)
-		return B_BAD_VALUE;
-	const char* slash = strrchr(filename, '/');
-	return SetGuess(MimeDatabase::Get().TypeOfName(slash != NULL ? slash + 1 : filename), _type);
 }
 
 

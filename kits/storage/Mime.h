@@ -55,6 +55,7 @@ public:
 
 	// B_BAD_VALUE for what is no type. Case does not matter when types are compared.
 	status_t SetTo(const char* type);
+	status_t SetType(const char* type);
 	void Unset();
 	status_t InitCheck() const;
 
@@ -94,13 +95,30 @@ public:
 	status_t GetIconForType(const char* type, BBitmap* icon, icon_size size) const;
 	status_t SetIconForType(const char* type, const BBitmap* icon, icon_size size);
 
+	// How the first bytes of a file tell that it is of this type, as a priority and expressions:
+	//
+	//	0.8 [0:16] ("%PDF" | "%!PS") (-i "title" | [4] 0xff00 & 0xfff0)
+	//
+	// All expressions must match, and one pattern of each. The range says at which places of the
+	// file a pattern may begin, at most 64 KB are looked at; "-i" stands before patterns in which
+	// the case of letters does not matter; a mask says which bits count. Texts and words know the
+	// escapes of C. B_BAD_MIME_SNIFFER_RULE for anything else, and for more than 4096 bytes.
+	status_t GetSnifferRule(BString* _rule) const;
+	status_t SetSnifferRule(const char* rule);
+	// Says in `_error`, which may be NULL, what is wrong and at which character, counted from 1.
+	static status_t CheckSnifferRule(const char* rule, BString* _error);
+
 	// Strings in the field "super_types", or in "types".
 	static status_t GetInstalledSupertypes(BMessage* _supertypes);
 	static status_t GetInstalledTypes(BMessage* _types);
 	static status_t GetInstalledTypes(const char* supertype, BMessage* _types);
 
 	// By the file's name and first bytes; by bytes alone; by name alone. What cannot be told is
-	// B_FILE_MIME_TYPE.
+	// B_FILE_MIME_TYPE. A rule that a program set is compared with what the shared database says:
+	// the rule's priority is on a scale up to 1.0 what a name's weight or the priority of the
+	// database's own rules, both usually 50, is on a scale up to 100. The rule wins when it is
+	// not lower. Otherwise a name comes before bytes, since it knows the member where bytes often
+	// know the family only; and an extension that a program set before all others.
 	static status_t GuessMimeType(const entry_ref* file, BMimeType* _type);
 	static status_t GuessMimeType(const void* buffer, int32 length, BMimeType* _type);
 	static status_t GuessMimeType(const char* filename, BMimeType* _type);

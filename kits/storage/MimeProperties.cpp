@@ -21,7 +21,6 @@ namespace {
 
 constexpr char kShortDescription[] = "short_description";
 constexpr char kLongDescription[] = "long_description";
-constexpr char kExtensions[] = "extensions";
 constexpr char kPreferredApp[] = "preferred_app";
 constexpr char kAttrInfo[] = "attr_info";
 constexpr char kAppHint[] = "app_hint";
@@ -111,7 +110,7 @@ BMimeType::GetFileExtensions(BMessage* _extensions) const
 		return fCStatus;
 	_extensions->MakeEmpty();
 	const BMessage settings = MimeSettingsOf(fType);
-	if (settings.FindMessage(kExtensions, _extensions) == B_OK)
+	if (settings.FindMessage(kMimeExtensions, _extensions) == B_OK)
 		return B_OK;
 	for (const std::string& extension : MimeDatabase::Get().ExtensionsOf(LowerCaseType(fType)))
 		_extensions->AddString("extensions", extension.c_str());
@@ -136,7 +135,7 @@ SetMessage(const char* type, const char* field, const BMessage* message)
 status_t
 BMimeType::SetFileExtensions(const BMessage* extensions)
 {
-	return fCStatus != B_OK ? fCStatus : SetMessage(fType, kExtensions, extensions);
+	return fCStatus != B_OK ? fCStatus : SetMessage(fType, kMimeExtensions, extensions);
 }
 
 

@@ -160,13 +160,26 @@ MimeDatabase::DescriptionOf(const std::string& type) const
 
 
 std::string
-MimeDatabase::TypeOfName(std::string_view leaf) const
+MimeDatabase::TypeOfName(std::string_view leaf, int32* _weight) const
+{
+	const Glob* best = _GlobOf(leaf);
+	if (best == NULL)
+		return std::string();
+	if (_weight != NULL)
+		*_weight = best->weight;
+	return best->type;
+}
+
+
+// A whole name comes first.
+const MimeDatabase::Glob*
+MimeDatabase::_GlobOf(std::string_view leaf) const
 {
 	const std::string exact(leaf);
 	const std::string lower = LowerCase(leaf);
 	const auto literal = fLiterals.find(exact);
 	if (literal != fLiterals.end())
-		return literal->second;
+		return &literal->second;
 
 	// The longest suffix wins among those of the greatest weight.
 	const Glob* best = NULL;
@@ -188,29 +201,22 @@ MimeDatabase::TypeOfName(std::string_view leaf) const
 		if (fnmatch(glob.pattern.c_str(), (glob.caseSensitive ? exact : lower).c_str(), 0) == 0)
 			consider(glob);
 	}
-	return best != NULL ? best->type : std::string();
+	return best;
 }
 
 
 std::string
-MimeDatabase::TypeOfBytes(const void* data, size_t size) const
+MimeDatabase::TypeOfBytes(const void* data, size_t size, int32* _weight) const
 {
 	const std::string_view bytes(static_cast<const char*>(data), size);
 	for (const Magic& magic : fMagic) {
-		if (_Matches(magic, bytes))
-			return magic.type;
+		if (!_Matches(magic, bytes))
+			continue;
+		if (_weight != NULL)
+			*_weight = magic.priority;
+		return magic.type;
 	}
 	return std::string();
-}
-
-
-std::string
-MimeDatabase::TypeOf(std::string_view leaf, const void* data, size_t size) const
-{
-	std::string type = TypeOfName(leaf);
-	if (type.empty())
-		type = TypeOfBytes(data, size);
-	return type;
 }
 
 
@@ -257,7 +263,7 @@ MimeDatabase::_AddGlob(Glob glob)
 	fTypes.insert(glob.type);
 	const size_t special = glob.pattern.find_first_of("*?[");
 	if (special == std::string::npos) {
-		fLiterals.emplace(glob.pattern, glob.type);
+		fLiterals.emplace(glob.pattern, glob);
 		return;
 	}
 	const bool suffix = special == 0 && glob.pattern[0] == '*'

@@ -27,11 +27,9 @@ public:
 	// The comment in the language that fits best; empty without one.
 	std::string DescriptionOf(const std::string& type) const;
 
-	// Empty when nothing fits.
-	std::string TypeOfName(std::string_view leaf) const;
-	std::string TypeOfBytes(const void* data, size_t size) const;
-	// A name that fits comes first: it knows the member where bytes often know the family only.
-	std::string TypeOf(std::string_view leaf, const void* data, size_t size) const;
+	// Empty when nothing fits. The weight, from 0 to 100, says how sure a name or a rule is.
+	std::string TypeOfName(std::string_view leaf, int32* _weight = NULL) const;
+	std::string TypeOfBytes(const void* data, size_t size, int32* _weight = NULL) const;
 	// So many bytes are enough for every rule.
 	size_t BytesNeeded() const { return fBytesNeeded; }
 
@@ -55,6 +53,7 @@ private:
 		std::vector<MagicLine> lines;
 	};
 
+	const Glob* _GlobOf(std::string_view leaf) const;
 	void _ReadTypes(const std::string& folder);
 	void _ReadGlobs(const std::string& folder);
 	void _AddGlob(Glob glob);
@@ -65,7 +64,7 @@ private:
 
 	std::vector<std::string> fFolders;
 	std::set<std::string> fTypes;
-	std::unordered_map<std::string, std::string> fLiterals; // whole names
+	std::unordered_map<std::string, Glob> fLiterals; // whole names
 	std::unordered_map<std::string, std::vector<Glob>> fSuffixes; // "*" and what follows it
 	std::vector<Glob> fGlobs; // all others
 	std::unordered_map<std::string, std::vector<std::string>> fExtensions;

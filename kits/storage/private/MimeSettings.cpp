@@ -13,6 +13,7 @@
 
 #include "storage/private/AtomicFile.h"
 #include "storage/private/Errno.h"
+#include "storage/private/MimeIndex.h"
 
 namespace BPrivate {
 
@@ -42,6 +43,14 @@ PathFor(const std::string& type, bool create, BPath* _path)
 }
 
 } // namespace
+
+
+std::string
+MimeSettingsFolder()
+{
+	BPath path;
+	return PathFor("", false, &path) == B_OK ? path.Path() : "";
+}
 
 
 status_t
@@ -76,7 +85,10 @@ WriteMimeSettings(const std::string& type, const BMessage& settings)
 		status = file.SetTo(path.Path());
 	if (status == B_OK)
 		status = file.Write(bytes.data(), bytes.size());
-	return status == B_OK ? file.Commit() : status;
+	if (status == B_OK)
+		status = file.Commit();
+	MimeIndex::Forget();
+	return status;
 }
 
 
@@ -88,7 +100,9 @@ RemoveMimeSettings(const std::string& type)
 	const status_t status = PathFor(type, false, &path);
 	if (status != B_OK)
 		return status;
-	return unlink(path.Path()) < 0 ? LastStatus() : B_OK;
+	const status_t removed = unlink(path.Path()) < 0 ? LastStatus() : B_OK;
+	MimeIndex::Forget();
+	return removed;
 }
 
 

@@ -9,6 +9,16 @@
 
 namespace BPrivate {
 
+// The fields of a type's settings that more than one place knows.
+constexpr char kMimeExtensions[] = "extensions";
+constexpr char kMimeSnifferRule[] = "sniffer_rule";
+constexpr char kMimeSupportedTypes[] = "supported_types";
+// Those that a program supported, and is still listed with.
+constexpr char kMimeStrandedTypes[] = "stranded_types";
+
+// Where a file per type is kept; empty when it cannot be told. The folder need not exist.
+std::string MimeSettingsFolder();
+
 // Each is a whole read or a whole replacement, so that threads and programs see no half message.
 status_t ReadMimeSettings(const std::string& type, BMessage* _settings);
 status_t WriteMimeSettings(const std::string& type, const BMessage& settings);
