@@ -14,10 +14,11 @@ namespace {
 constexpr const char* kTable = ARCHWAY_SOURCES "/docs/CLASSES.md";
 
 const char* const kClasses[] = { "BView", "BControl", "BButton", "BCheckBox", "BRadioButton",
-	"BPictureButton", "BTextControl", "BOptionControl", "BOptionPopUp", "BSlider", "BColorControl",
-	"BStatusBar", "BStringView", "BBox", "BTextView", "BScrollView", "BScrollBar", "BTabView",
-	"BTab", "BListView", "BOutlineListView", "BListItem", "BStringItem", "BMenuField", "BMenu",
-	"BMenuBar", "BPopUpMenu", "BMenuItem", "BSeparatorItem", "BAlert", "BWindow", "BBitmap" };
+	"BPictureButton", "BTextControl", "BOptionControl", "BOptionPopUp", "BSlider",
+	"BChannelControl", "BChannelSlider", "BColorControl", "BStatusBar", "BStringView", "BBox",
+	"BTextView", "BScrollView", "BScrollBar", "BTabView", "BTab", "BListView", "BOutlineListView",
+	"BListItem", "BStringItem", "BMenuField", "BMenu", "BMenuBar", "BPopUpMenu", "BMenuItem",
+	"BSeparatorItem", "BAlert", "BWindow", "BBitmap" };
 
 const char* const kIntroduction =
 	"# The classes of the Interface Kit\n"

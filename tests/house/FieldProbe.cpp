@@ -9,6 +9,7 @@
 #include <Archivable.h>
 #include <Box.h>
 #include <Button.h>
+#include <ChannelSlider.h>
 #include <CheckBox.h>
 #include <ColorControl.h>
 #include <ListView.h>
@@ -104,6 +105,17 @@ FilledSlider()
 }
 
 
+BChannelSlider*
+FilledChannels()
+{
+	BChannelSlider* slider =
+		new BChannelSlider(kFrame, "channels", "Channels", NULL, B_HORIZONTAL, 3);
+	slider->SetLimitLabels("low", "high");
+	slider->SetAllValue(40);
+	return slider;
+}
+
+
 BMenuField*
 FilledField()
 {
@@ -135,6 +147,8 @@ Samples()
 		{ "BTextControl",
 			{ [] { return new BTextControl(kFrame, "control", "Label", "Text", NULL); } } },
 		{ "BSlider", { FilledSlider } },
+		{ "BChannelControl", { FilledChannels } },
+		{ "BChannelSlider", { FilledChannels } },
 		{ "BColorControl",
 			{ [] { return new BColorControl(BPoint(20, 20), B_CELLS_32x8, 4, "color"); } } },
 		{ "BStatusBar", { FilledStatus } },

@@ -1,6 +1,7 @@
 // Controls of every class follow a parent that is resized by their mode.
 #include <Box.h>
 #include <Button.h>
+#include <ChannelSlider.h>
 #include <CheckBox.h>
 #include <ColorControl.h>
 #include <ListView.h>
@@ -31,6 +32,7 @@ OneOfEachClass()
 	return {
 		new BBox(kFrame, "box"),
 		new BButton(kFrame, "button", "Label", NULL),
+		new BChannelSlider(kFrame, "channels", "Label", NULL, 3),
 		new BCheckBox(kFrame, "check", "Label", NULL),
 		new BColorControl(kFrame.LeftTop(), B_CELLS_32x8, 6, "color"),
 		new BOptionPopUp(kFrame, "options", "Label", NULL),

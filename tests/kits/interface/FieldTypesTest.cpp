@@ -9,6 +9,7 @@
 #include <Application.h>
 #include <Box.h>
 #include <Button.h>
+#include <ChannelSlider.h>
 #include <ListView.h>
 #include <Message.h>
 #include <Slider.h>
@@ -44,6 +45,8 @@ protected:
 			return std::make_unique<BBox>(frame, "box");
 		if (name == "BButton")
 			return std::make_unique<BButton>(frame, "button", "Press", new BMessage('pres'));
+		if (name == "BChannelSlider")
+			return std::make_unique<BChannelSlider>(frame, "channels", "How much", nullptr, 2);
 		if (name == "BListView")
 			return std::make_unique<BListView>(frame, "list");
 		if (name == "BSlider")
@@ -77,9 +80,9 @@ TEST_P(FieldTypes, OfNoUseAreCarriedAlong)
 INSTANTIATE_TEST_SUITE_P(Of, FieldTypes,
 	testing::Values(Field { "BView", "_evmask" }, Field { "BView", "_frame" },
 		Field { "BView", "_origin" }, Field { "BBox", "_lblview" }, Field { "BButton", "_default" },
-		Field { "BButton", "_disable" }, Field { "BListView", "_l_items" },
-		Field { "BSlider", "_minlbl" }, Field { "BStatusBar", "_ltext" },
-		Field { "BTextView", "_nsel" }),
+		Field { "BButton", "_disable" }, Field { "BChannelSlider", "_orient" },
+		Field { "BListView", "_l_items" }, Field { "BSlider", "_minlbl" },
+		Field { "BStatusBar", "_ltext" }, Field { "BTextView", "_nsel" }),
 	[](const auto& info) { return std::string(info.param.className) + info.param.name; });
 
 

@@ -5,6 +5,7 @@
 #include <Alert.h>
 #include <Box.h>
 #include <Button.h>
+#include <ChannelSlider.h>
 #include <CheckBox.h>
 #include <ColorControl.h>
 #include <ListView.h>
@@ -93,6 +94,9 @@ TEST(Scripting, EveryClassNamesItsSuites)
 	for (BControl* control : controls)
 		EXPECT_EQ("suite/vnd.Be-control " + base, SuitesOf(*control)) << "GetSupportedSuites()";
 
+	BChannelSlider channels(kFrame, "", "", NULL);
+	EXPECT_EQ("suite/vnd.Be-channel-control suite/vnd.Be-control " + base, SuitesOf(channels));
+
 	BListView list(kFrame, "");
 	BOutlineListView outline(kFrame, "");
 	EXPECT_EQ("suite/vnd.Be-list-view " + base, SuitesOf(list));
@@ -144,10 +148,11 @@ TEST(Scripting, EveryClassFindsItsChildrenByNameAndPlace)
 	BPopUpMenu popUp("");
 	BMenu menu("menu");
 	BControl control(kFrame, "", "", NULL, 0, 0);
+	BChannelSlider channels(kFrame, "", "", NULL);
 	BOptionPopUp options(kFrame, "", "", NULL);
 	BView* const views[] = { &view, &box, &button, &check, &radio, &field, &slider, &color, &status,
 		&string, &text, &list, &outline, &tabs, &scroller, &bar, &menuField, &menuBar, &popUp,
-		&menu, &control, &options };
+		&menu, &control, &options, &channels };
 	for (BView* each : views) {
 		SCOPED_TRACE(typeid(*each).name());
 		BView* inner = new BView(BRect(0, 0, 5, 5), "inner", 0, 0);

@@ -4,6 +4,7 @@
 
 #include <Box.h>
 #include <Button.h>
+#include <ChannelSlider.h>
 #include <CheckBox.h>
 #include <ColorControl.h>
 #include <ListView.h>
@@ -171,6 +172,9 @@ TEST(ViewHooks, OfControlsAreCalled)
 	});
 	ExpectHooks("BOptionPopUp", [](HookCounts& counts) {
 		return new Hooked<BOptionPopUp>(counts, kFrame, "o", "Label", nullptr);
+	});
+	ExpectHooks("BChannelSlider", [](HookCounts& counts) {
+		return new Hooked<BChannelSlider>(counts, kFrame, "c", "Label", nullptr, 3);
 	});
 	ExpectHooks("BColorControl", [](HookCounts& counts) {
 		return new Hooked<BColorControl>(counts, BPoint(20, 20), B_CELLS_32x8, 6.0f, "c");
