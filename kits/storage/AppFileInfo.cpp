@@ -151,19 +151,23 @@ BAppFileInfo::SetSupportedTypes(const BMessage* types)
 
 
 status_t
-BAppFileInfo::SetSupportedTypes(const BMessage* types, bool)
+BAppFileInfo::SetSupportedTypes(const BMessage* types, bool syncAll)
 {
-	const Item item = { B_MESSAGE_TYPE, kItemId, "BEOS:FILE_TYPES" };
-	if (types == NULL)
-		return _Write(item, NULL, 0);
 	const char* type;
-	for (int32 i = 0; types->FindString("types", i, &type) == B_OK; i++) {
+	for (int32 i = 0; types != NULL && types->FindString("types", i, &type) == B_OK; i++) {
 		if (!BMimeType::IsValid(type))
 			return B_BAD_VALUE;
 	}
-	std::vector<char> bytes(types->FlattenedSize());
-	const status_t status = types->Flatten(bytes.data(), bytes.size());
-	return status == B_OK ? _Write(item, bytes.data(), bytes.size()) : status;
+	const Item item = { B_MESSAGE_TYPE, kItemId, "BEOS:FILE_TYPES" };
+	std::vector<char> bytes(types != NULL ? types->FlattenedSize() : 0);
+	status_t status = types != NULL ? types->Flatten(bytes.data(), bytes.size()) : B_OK;
+	if (status == B_OK)
+		status = _Write(item, types != NULL ? bytes.data() : NULL, bytes.size());
+	// A file without a signature says nothing about a program.
+	char signature[B_MIME_TYPE_LENGTH + 1];
+	if (status != B_OK || GetSignature(signature) != B_OK || !BMimeType::IsValid(signature))
+		return status;
+	return BMimeType(signature).SetSupportedTypes(types, syncAll);
 }
 
 

@@ -42,7 +42,8 @@ public:
 	status_t SetSignature(const char* signature);
 	status_t GetAppFlags(uint32* _flags) const;
 	status_t SetAppFlags(uint32 flags);
-	// Strings in the field "types".
+	// Strings in the field "types". When the file has a signature, the signature's BMimeType is told
+	// too; types that are no longer supported forget the program only if `syncAll` is set.
 	status_t GetSupportedTypes(BMessage* _types) const;
 	status_t SetSupportedTypes(const BMessage* types);
 	status_t SetSupportedTypes(const BMessage* types, bool syncAll);

@@ -85,6 +85,17 @@ public:
 	// `signature` has room for B_MIME_TYPE_LENGTH + 1 bytes.
 	status_t GetPreferredApp(char* signature, app_verb verb = B_OPEN) const;
 	status_t SetPreferredApp(const char* signature, app_verb verb = B_OPEN);
+	// The programs that support the type, as "applications": first those that name it, as many as
+	// "be:sub" says, then the other ones that support its supertype, "be:super". The first number
+	// is left out for a supertype.
+	status_t GetSupportingApps(BMessage* _signatures) const;
+	// Those that support any file: they name B_FILE_MIME_TYPE.
+	static status_t GetWildcardApps(BMessage* _signatures);
+	// Strings in the field "types"; this type is the signature of the program that supports them.
+	// Types that are not installed are. Without `fullSync` the program stays listed with those
+	// that it no longer supports, until a later call has it.
+	status_t GetSupportedTypes(BMessage* _types) const;
+	status_t SetSupportedTypes(const BMessage* types, bool fullSync = true);
 	status_t GetAttrInfo(BMessage* _info) const;
 	status_t SetAttrInfo(const BMessage* info);
 	status_t GetAppHint(entry_ref* _ref) const;
