@@ -10,6 +10,7 @@
 #include <CheckBox.h>
 #include <ColorControl.h>
 #include <Control.h>
+#include <Dragger.h>
 #include <Font.h>
 #include <GraphicsDefs.h>
 #include <InterfaceDefs.h>
@@ -34,6 +35,7 @@
 #include <ScrollView.h>
 #include <SeparatorItem.h>
 #include <Shape.h>
+#include <Shelf.h>
 #include <Slider.h>
 #include <StatusBar.h>
 #include <StringItem.h>

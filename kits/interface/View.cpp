@@ -7,6 +7,7 @@
 #include <Debug.h>
 #include <Message.h>
 #include <ScrollBar.h>
+#include <Shelf.h>
 #include <Window.h>
 
 #include "app/private/ArchiveSource.h"
@@ -62,6 +63,8 @@ BView::~BView()
 		debugger("A view was deleted that still belongs to a window. Call RemoveSelf() first.");
 		RemoveSelf();
 	}
+	if (fExtras != nullptr && fExtras->shelf != nullptr)
+		fExtras->shelf->_ContainerGone();
 	fNode->Unlink();
 	while (ServerView* child = fNode->FirstChild())
 		delete child->Owner();
@@ -173,6 +176,13 @@ BView::MessageReceived(BMessage* message)
 		case B_SET_PROPERTY:
 		case B_COUNT_PROPERTIES:
 			if (!handle_view_property(this, message))
+				BHandler::MessageReceived(message);
+			break;
+
+		case B_ARCHIVED_OBJECT:
+			if (message->WasDropped() && fExtras != nullptr && fExtras->shelf != nullptr)
+				fExtras->shelf->MessageReceived(message);
+			else
 				BHandler::MessageReceived(message);
 			break;
 

@@ -3,6 +3,7 @@
 
 #include <Debug.h>
 #include <ScrollBar.h>
+#include <Shelf.h>
 #include <Window.h>
 
 #include "app/private/HandlerPrivate.h"
@@ -67,6 +68,8 @@ ViewPrivate::Attach(BWindow* window)
 		handler.SetLooper(window);
 		BView* parent = node->Parent()->Owner();
 		handler.SetNextHandler(parent != nullptr ? static_cast<BHandler*>(parent) : window);
+		if (view->fExtras != nullptr && view->fExtras->shelf != nullptr)
+			window->AddHandler(view->fExtras->shelf);
 	}
 	internals.ViewsEntered(top);
 	ViewWalk walk(top, internals.walks, ViewWalk::kAttachment);
@@ -98,7 +101,23 @@ ViewPrivate::Detach()
 		handler.SetLooper(nullptr);
 		const ServerView* parent = node->Parent();
 		handler.SetNextHandler(parent != nullptr ? parent->Owner() : nullptr);
+		if (view->fExtras != nullptr && view->fExtras->shelf != nullptr)
+			window->RemoveHandler(view->fExtras->shelf);
 	}
+}
+
+
+void
+ViewPrivate::SetShelf(BShelf* shelf)
+{
+	BShelf*& current = fView->_Extras()->shelf;
+	if (current != nullptr && shelf != nullptr)
+		current->_ContainerGone();
+	else if (current != nullptr && current->Looper() != nullptr)
+		current->Looper()->RemoveHandler(current);
+	current = shelf;
+	if (shelf != nullptr && fView->fOwner != nullptr)
+		fView->fOwner->AddHandler(shelf);
 }
 
 

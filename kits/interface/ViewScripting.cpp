@@ -6,8 +6,10 @@
 #include <AppDefs.h>
 #include <Message.h>
 #include <PropertyInfo.h>
+#include <Shelf.h>
 
 #include "interface/private/ViewScripting.h"
+#include "interface/private/ViewState.h"
 
 using namespace BPrivate;
 
@@ -128,6 +130,12 @@ BView::ResolveSpecifier(
 {
 	if (BPropertyInfo(sProperties).FindMatch(message, index, specifier, form, property) >= 0)
 		return this;
+	if (property != nullptr && std::strcmp(property, "Shelf") == 0) {
+		if (BShelf* shelf = fExtras != nullptr ? fExtras->shelf : nullptr) {
+			message->PopSpecifier();
+			return shelf;
+		}
+	}
 	if (property != nullptr && std::strcmp(property, "View") == 0) {
 		if (BView* child = find_child(this, specifier, form)) {
 			message->PopSpecifier();

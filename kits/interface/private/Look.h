@@ -113,6 +113,10 @@ void DrawScrollBarArea(
 void DrawScrollBarThumb(
 	BView* view, BRect frame, orientation direction, rgb_color base, uint32 state);
 
+// The handle of a dragger, kDragHandleSize pixels in both directions up to the corner, that included.
+constexpr float kDragHandleSize = 8;
+void DrawDragHandle(BView* view, BPoint rightBottom, rgb_color base);
+
 // Menus.
 void DrawMenuFrame(BView* view, BRect frame, rgb_color base); // a menu's own window
 void DrawMenuBarFrame(BView* view, BRect frame, rgb_color base);

@@ -310,4 +310,31 @@ DrawScrollBarThumb(BView* view, BRect frame, orientation direction, rgb_color ba
 	}
 }
 
+
+// A raised plate with ridges across the corner to take hold of.
+void
+DrawDragHandle(BView* view, BPoint rightBottom, rgb_color base)
+{
+	PlainPen pen(view);
+	BRect frame(rightBottom, rightBottom);
+	frame.left -= kDragHandleSize - 1;
+	frame.top -= kDragHandleSize - 1;
+	const rgb_color dark = tint_color(base, B_DARKEN_4_TINT);
+	const rgb_color light = tint_color(base, B_LIGHTEN_MAX_TINT);
+	Fill(view, frame, tint_color(base, B_DARKEN_1_TINT));
+	DrawRing(view, frame, tint_color(base, B_DARKEN_2_TINT), dark);
+	DrawLeftTop(
+		view, BRect(frame.left + 1, frame.top + 1, frame.right - 1, frame.bottom - 1), light);
+	DrawLines(view,
+		{
+			{ BPoint(frame.left + 2, frame.bottom - 1), BPoint(frame.right - 1, frame.top + 2),
+				dark },
+			{ BPoint(frame.left + 3, frame.bottom - 1), BPoint(frame.right - 1, frame.top + 3),
+				light },
+			{ BPoint(frame.left + 5, frame.bottom - 1), BPoint(frame.right - 1, frame.top + 5),
+				dark },
+		});
+}
+
+
 } // namespace BPrivate::Look

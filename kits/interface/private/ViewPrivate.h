@@ -5,6 +5,8 @@
 
 #include "server/ServerView.h"
 
+class BShelf;
+
 namespace BPrivate {
 
 
@@ -19,6 +21,8 @@ public:
 
 	// A bar enters or leaves its target; NULL takes it out.
 	void SetScrollBar(orientation direction, BScrollBar* bar);
+	// The view becomes the shelf's container; NULL ends that.
+	void SetShelf(BShelf* shelf);
 	// The first view of this or an ancestor that has bars; wheel movements go there.
 	static bool ScrollByWheel(BView* view, float dx, float dy);
 

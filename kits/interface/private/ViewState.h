@@ -12,6 +12,8 @@
 #include "server/paint/DrawState.h"
 #include "server/paint/Painter.h"
 
+class BShelf;
+
 namespace BPrivate {
 
 
@@ -45,6 +47,7 @@ struct ViewExtras {
 	uint32 eventOptions = 0;
 	uint32 mouseEventMask = 0; // until the next mouse-up
 	uint32 mouseEventOptions = 0;
+	BShelf* shelf = nullptr; // borrowed; this view is its container
 	std::unique_ptr<BCursor> cursor;
 	std::string toolTip;
 	std::vector<PaintedLine> lines; // between BeginLineArray() and EndLineArray()

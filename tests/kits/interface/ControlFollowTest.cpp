@@ -4,6 +4,7 @@
 #include <ChannelSlider.h>
 #include <CheckBox.h>
 #include <ColorControl.h>
+#include <Dragger.h>
 #include <ListView.h>
 #include <MenuBar.h>
 #include <MenuField.h>
@@ -35,6 +36,7 @@ OneOfEachClass()
 		new BChannelSlider(kFrame, "channels", "Label", NULL, 3),
 		new BCheckBox(kFrame, "check", "Label", NULL),
 		new BColorControl(kFrame.LeftTop(), B_CELLS_32x8, 6, "color"),
+		new BDragger(kFrame, NULL),
 		new BOptionPopUp(kFrame, "options", "Label", NULL),
 		new BPictureButton(kFrame, "picture", NULL),
 		new BRadioButton(kFrame, "radio", "Label", NULL),

@@ -79,6 +79,7 @@ INSTANTIATE_TEST_SUITE_P(Classes, DetachedViews,
 		+[]() -> BView* { return new BChannelSlider(kFrame, nullptr, nullptr, nullptr, 2); },
 		+[]() -> BView* { return new BCheckBox(kFrame, nullptr, nullptr, nullptr); },
 		+[]() -> BView* { return new BColorControl(BPoint(0, 0), B_CELLS_32x8, 8, nullptr); },
+		+[]() -> BView* { return new BDragger(kFrame, nullptr); },
 		+[]() -> BView* { return new BListView(kFrame, nullptr); },
 		+[]() -> BView* { return new BMenuBar(kFrame, nullptr); },
 		+[]() -> BView* {

@@ -7,6 +7,7 @@
 #include <ChannelSlider.h>
 #include <CheckBox.h>
 #include <ColorControl.h>
+#include <Dragger.h>
 #include <ListView.h>
 #include <MenuBar.h>
 #include <MenuField.h>
@@ -145,6 +146,9 @@ TEST(ViewHooks, OfGroupsAndTextsAreCalled)
 		[](HookCounts& counts) { return new Hooked<BStringView>(counts, kFrame, "text", "Text"); });
 	ExpectHooks("BStatusBar",
 		[](HookCounts& counts) { return new Hooked<BStatusBar>(counts, kFrame, "bar", "Label"); });
+	ExpectHooks("BDragger", [](HookCounts& counts) {
+		return new Hooked<BDragger>(counts, kFrame, static_cast<BView*>(nullptr));
+	});
 	ExpectHooks("BTextView", [](HookCounts& counts) {
 		return new Hooked<BTextView>(
 			counts, kFrame, "text", kFrame.OffsetToCopy(0, 0), B_FOLLOW_NONE, B_WILL_DRAW);
