@@ -4,9 +4,11 @@
 #include <Button.h>
 #include <CheckBox.h>
 #include <ColorControl.h>
+#include <Dragger.h>
 #include <Message.h>
 #include <PictureButton.h>
 #include <RadioButton.h>
+#include <Shelf.h>
 #include <Slider.h>
 #include <StatusBar.h>
 #include <StringView.h>
@@ -30,6 +32,20 @@ public:
 
 private:
 	mutable std::string fText;
+};
+
+
+// A field that keeps the replicants which are dropped on it.
+class ShelfView : public BView {
+public:
+	explicit ShelfView(BRect frame) :
+		BView(frame, "shelf", B_FOLLOW_LEFT | B_FOLLOW_TOP, B_WILL_DRAW), fShelf(this)
+	{
+		SetViewColor(152, 152, 152);
+	}
+
+private:
+	BShelf fShelf;
 };
 
 
@@ -244,7 +260,11 @@ NewPageGroup(BRect frame)
 
 	BView* second = new BView(page, "Second", B_FOLLOW_ALL, B_WILL_DRAW);
 	second->SetViewColor(216, 216, 216);
-	second->AddChild(new BStringView(BRect(10, 8, 300, 24), "text", "The second page"));
+	second->AddChild(new BStringView(BRect(10, 8, 209, 24), "text", "The second page"));
+	BStringView* replicant = new BStringView(BRect(10, 36, 159, 55), "replicant", "To the shelf");
+	replicant->AddChild(new BDragger(BRect(142, 12, 149, 19), replicant));
+	second->AddChild(replicant);
+	second->AddChild(new ShelfView(BRect(300, 8, 696, 60)));
 	tabs->AddTab(second);
 	tabs->AddTab(NewValuePage(page));
 	tabs->AddTab(new BView(page, "Disabled", B_FOLLOW_ALL, B_WILL_DRAW));

@@ -1,4 +1,4 @@
-// Every control is used without a mouse.
+// Every control is used without a mouse, and a replicant with one.
 
 #include <gtest/gtest.h>
 
@@ -10,9 +10,19 @@ namespace {
 
 const std::string kGallery = ARCHWAY_BINARIES "/gallery";
 const std::string kScript = "ARCHWAY_PLAY=" ARCHWAY_PLAYS "/gallery-keyboard.play";
+const std::string kReplicants = "ARCHWAY_PLAY=" ARCHWAY_PLAYS "/gallery-replicants.play";
 
 
 } // namespace
+
+
+TEST(Gallery, DragsAReplicantIntoItsShelf)
+{
+	const ProgramResult result = ::Run(
+		{ kGallery }, { "ARCHWAY_BACKEND=headless", "QT_QPA_PLATFORM=offscreen", kReplicants });
+
+	EXPECT_EQ(0, result.status) << result.errors;
+}
 
 
 TEST(Gallery, IsUsedByTheKeyboardAlone)

@@ -1,6 +1,7 @@
 #include "work/WorkView.h"
 
 #include <AppDefs.h>
+#include <Dragger.h>
 
 #include "work/WorkViewFixture.h"
 
@@ -117,6 +118,37 @@ TEST_F(WorkViewTest, AClickOnAButtonDoesNotPressIt)
 	window.driver.Click(button);
 	EXPECT_EQ(button, workView->SelectedView());
 	EXPECT_EQ(0, button->Value());
+}
+
+
+// Nor does a dragger of the design drag anything away.
+TEST_F(WorkViewTest, APressOnADraggerDragsNoReplicant)
+{
+	struct Noting : BDragger {
+		using BDragger::BDragger;
+
+		BBitmap* DragBitmap(BPoint*, drawing_mode*) override
+		{
+			drags++;
+			return NULL;
+		}
+
+		int drags = 0;
+	};
+	Noting* dragger = new Noting(BRect(120, 100, 149, 129), button);
+	window.Locked([&] { root->AddChild(dragger); });
+	ASSERT_EQ(button, dragger->Target());
+
+	for (const uint32 mouseButton : { B_PRIMARY_MOUSE_BUTTON, B_SECONDARY_MOUSE_BUTTON }) {
+		window.driver.MoveTo(dragger, BPoint(15, 15));
+		window.driver.Press(mouseButton);
+		window.driver.MoveTo(dragger, BPoint(5, 5));
+		window.driver.MoveTo(plain, BPoint(5, 5));
+		window.driver.Release(mouseButton);
+		EXPECT_EQ(0, dragger->drags) << mouseButton;
+		EXPECT_EQ(root, dragger->Parent());
+	}
+	EXPECT_THAT(listener->selections, testing::Contains(dragger));
 }
 
 
