@@ -12,11 +12,13 @@
 #include <Entry.h>
 #include <File.h>
 #include <Message.h>
+#include <Messenger.h>
 #include <NodeInfo.h>
 #include <Path.h>
 
 #include "storage/private/MimeDatabase.h"
 #include "storage/private/MimeSettings.h"
+#include "storage/private/MimeWatchers.h"
 
 using namespace BPrivate;
 
@@ -116,13 +118,7 @@ BMimeType::IsInstalled() const
 		return false;
 	const std::string type = LowerCaseType(fType);
 	BMessage settings;
-	if (MimeDatabase::Get().IsKnown(type) || ReadMimeSettings(type, &settings) == B_OK)
-		return true;
-	if (!IsSupertypeOnly())
-		return false;
-	const auto& types = MimeDatabase::Get().Types();
-	const auto first = types.lower_bound(type + "/");
-	return first != types.end() && first->compare(0, type.size() + 1, type + "/") == 0;
+	return MimeDatabase::Get().IsKnown(type) || ReadMimeSettings(type, &settings) == B_OK;
 }
 
 
@@ -183,6 +179,23 @@ BMimeType::Delete()
 	if (fCStatus != B_OK)
 		return fCStatus;
 	return RemoveMimeSettings(LowerCaseType(fType));
+}
+
+
+// #pragma mark - watching
+
+
+status_t
+BMimeType::StartWatching(BMessenger target)
+{
+	return MimeWatchers::Get().Start(target);
+}
+
+
+status_t
+BMimeType::StopWatching(BMessenger target)
+{
+	return MimeWatchers::Get().Stop(target);
 }
 
 

@@ -7,6 +7,7 @@
 
 class BBitmap;
 class BMessage;
+class BMessenger;
 class BString;
 struct entry_ref;
 
@@ -133,6 +134,14 @@ public:
 	static status_t GuessMimeType(const entry_ref* file, BMimeType* _type);
 	static status_t GuessMimeType(const void* buffer, int32 length, BMimeType* _type);
 	static status_t GuessMimeType(const char* filename, BMimeType* _type);
+
+	// The target gets a B_META_MIME_CHANGED for every change, whichever program made it: "be:type"
+	// and, as int32 "be:which", one of the bits above. B_ICON_FOR_TYPE_CHANGED has the other type
+	// as "be:extra_type", and both changes of icons say as bool "be:large_icon" which one it was.
+	// Setting what is set already is no change. A target that is gone is forgotten.
+	static status_t StartWatching(BMessenger target);
+	// B_ENTRY_NOT_FOUND for one who does not watch; the last message was sent before it returns.
+	static status_t StopWatching(BMessenger target);
 
 	static bool IsValid(const char* type);
 

@@ -19,12 +19,6 @@ using namespace BPrivate;
 
 namespace {
 
-constexpr char kShortDescription[] = "short_description";
-constexpr char kLongDescription[] = "long_description";
-constexpr char kPreferredApp[] = "preferred_app";
-constexpr char kAttrInfo[] = "attr_info";
-constexpr char kAppHint[] = "app_hint";
-
 
 status_t
 SetText(const char* type, const char* field, const char* text)
@@ -56,7 +50,7 @@ GetText(const char* type, const char* field, const std::string& standard, char* 
 std::string
 IconField(const char* type, icon_size size)
 {
-	const std::string prefix = size == B_LARGE_ICON ? "large_icon" : "mini_icon";
+	const std::string prefix = size == B_LARGE_ICON ? kMimeLargeIcon : kMimeMiniIcon;
 	return type == NULL ? prefix : prefix + ":" + LowerCaseType(type);
 }
 
@@ -71,14 +65,14 @@ BMimeType::GetShortDescription(char* description) const
 	if (fCStatus != B_OK)
 		return fCStatus;
 	const std::string standard = MimeDatabase::Get().DescriptionOf(LowerCaseType(fType));
-	return GetText(fType, kShortDescription, standard, description);
+	return GetText(fType, kMimeShortDescription, standard, description);
 }
 
 
 status_t
 BMimeType::SetShortDescription(const char* description)
 {
-	return fCStatus != B_OK ? fCStatus : SetText(fType, kShortDescription, description);
+	return fCStatus != B_OK ? fCStatus : SetText(fType, kMimeShortDescription, description);
 }
 
 
@@ -90,14 +84,14 @@ BMimeType::GetLongDescription(char* description) const
 	if (fCStatus != B_OK)
 		return fCStatus;
 	const std::string standard = MimeDatabase::Get().DescriptionOf(LowerCaseType(fType));
-	return GetText(fType, kLongDescription, standard, description);
+	return GetText(fType, kMimeLongDescription, standard, description);
 }
 
 
 status_t
 BMimeType::SetLongDescription(const char* description)
 {
-	return fCStatus != B_OK ? fCStatus : SetText(fType, kLongDescription, description);
+	return fCStatus != B_OK ? fCStatus : SetText(fType, kMimeLongDescription, description);
 }
 
 
@@ -144,14 +138,14 @@ BMimeType::GetPreferredApp(char* signature, app_verb) const
 {
 	if (signature == NULL)
 		return B_BAD_VALUE;
-	return fCStatus != B_OK ? fCStatus : GetText(fType, kPreferredApp, "", signature);
+	return fCStatus != B_OK ? fCStatus : GetText(fType, kMimePreferredApp, "", signature);
 }
 
 
 status_t
 BMimeType::SetPreferredApp(const char* signature, app_verb)
 {
-	return fCStatus != B_OK ? fCStatus : SetText(fType, kPreferredApp, signature);
+	return fCStatus != B_OK ? fCStatus : SetText(fType, kMimePreferredApp, signature);
 }
 
 
@@ -162,7 +156,7 @@ BMimeType::GetAttrInfo(BMessage* _info) const
 		return B_BAD_VALUE;
 	if (fCStatus != B_OK)
 		return fCStatus;
-	return MimeSettingsOf(fType).FindMessage(kAttrInfo, _info) == B_OK
+	return MimeSettingsOf(fType).FindMessage(kMimeAttrInfo, _info) == B_OK
 		? static_cast<status_t>(B_OK)
 		: static_cast<status_t>(B_ENTRY_NOT_FOUND);
 }
@@ -171,7 +165,7 @@ BMimeType::GetAttrInfo(BMessage* _info) const
 status_t
 BMimeType::SetAttrInfo(const BMessage* info)
 {
-	return fCStatus != B_OK ? fCStatus : SetMessage(fType, kAttrInfo, info);
+	return fCStatus != B_OK ? fCStatus : SetMessage(fType, kMimeAttrInfo, info);
 }
 
 
@@ -185,7 +179,7 @@ BMimeType::GetAppHint(entry_ref* _ref) const
 		return fCStatus;
 	const BMessage settings = MimeSettingsOf(fType);
 	const char* path = NULL;
-	if (settings.FindString(kAppHint, &path) != B_OK)
+	if (settings.FindString(kMimeAppHint, &path) != B_OK)
 		return B_ENTRY_NOT_FOUND;
 	return get_ref_for_path(path, _ref);
 }
@@ -203,8 +197,8 @@ BMimeType::SetAppHint(const entry_ref* ref)
 			return status;
 	}
 	return ChangeMimeSettings(fType, [&](BMessage& settings) -> status_t {
-		settings.RemoveName(kAppHint);
-		return ref != NULL ? settings.AddString(kAppHint, path.Path()) : B_OK;
+		settings.RemoveName(kMimeAppHint);
+		return ref != NULL ? settings.AddString(kMimeAppHint, path.Path()) : B_OK;
 	});
 }
 

@@ -132,6 +132,16 @@ MimeDatabase::MimeDatabase(const std::vector<std::string>& folders) :
 }
 
 
+bool
+MimeDatabase::IsKnown(const std::string& type) const
+{
+	if (fTypes.count(type) != 0)
+		return true;
+	const auto first = fTypes.lower_bound(type + "/");
+	return first != fTypes.end() && first->compare(0, type.size() + 1, type + "/") == 0;
+}
+
+
 std::vector<std::string>
 MimeDatabase::ExtensionsOf(const std::string& type) const
 {

@@ -21,7 +21,8 @@ public:
 	// From the folders given, the most important first.
 	explicit MimeDatabase(const std::vector<std::string>& folders);
 
-	bool IsKnown(const std::string& type) const { return fTypes.count(type) != 0; }
+	// A supertype is known if one of its types is.
+	bool IsKnown(const std::string& type) const;
 	const std::set<std::string>& Types() const { return fTypes; }
 	std::vector<std::string> ExtensionsOf(const std::string& type) const;
 	// The comment in the language that fits best; empty without one.

@@ -14,6 +14,7 @@
 #include "storage/private/AtomicFile.h"
 #include "storage/private/Errno.h"
 #include "storage/private/MimeIndex.h"
+#include "storage/private/MimeWatchers.h"
 
 namespace BPrivate {
 
@@ -88,6 +89,7 @@ WriteMimeSettings(const std::string& type, const BMessage& settings)
 	if (status == B_OK)
 		status = file.Commit();
 	MimeIndex::Forget();
+	MimeWatchers::Get().Check(type);
 	return status;
 }
 
@@ -102,6 +104,7 @@ RemoveMimeSettings(const std::string& type)
 		return status;
 	const status_t removed = unlink(path.Path()) < 0 ? LastStatus() : B_OK;
 	MimeIndex::Forget();
+	MimeWatchers::Get().Check(type);
 	return removed;
 }
 
@@ -116,15 +119,23 @@ TypesWithMimeSettings()
 	BDirectory directory(path.Path());
 	entry_ref ref;
 	while (directory.GetNextRef(&ref) == B_OK) {
-		std::string type(ref.name);
-		const size_t comma = type.find(',');
-		if (type[0] == '.')
-			continue; // a file that is just being written
-		if (comma != std::string::npos)
-			type[comma] = '/';
-		types.insert(type);
+		const std::string type = TypeOfMimeSettings(ref.name);
+		if (!type.empty())
+			types.insert(type);
 	}
 	return types;
+}
+
+
+// One that begins with a dot is just being written.
+std::string
+TypeOfMimeSettings(const std::string& leaf)
+{
+	std::string type = leaf[0] == '.' ? std::string() : leaf;
+	const size_t comma = type.find(',');
+	if (comma != std::string::npos)
+		type[comma] = '/';
+	return type;
 }
 
 
