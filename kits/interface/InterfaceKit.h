@@ -2,6 +2,7 @@
 #pragma once
 
 #include <Alert.h>
+#include <Alignment.h>
 #include <Bitmap.h>
 #include <Box.h>
 #include <Button.h>
@@ -34,6 +35,7 @@
 #include <ScrollBar.h>
 #include <ScrollView.h>
 #include <SeparatorItem.h>
+#include <SeparatorView.h>
 #include <Shape.h>
 #include <Shelf.h>
 #include <Slider.h>

@@ -20,9 +20,9 @@ namespace {
 const char* const kClasses[] = { "BView", "BBox", "BButton", "BChannelSlider", "BCheckBox",
 	"BColorControl", "BControl", "BDragger", "BListView", "BMenu", "BMenuBar", "BMenuField",
 	"BMenuItem", "BOptionPopUp", "BOutlineListView", "BPictureButton", "BPopUpMenu", "BRadioButton",
-	"BScrollBar", "BScrollView", "BSeparatorItem", "BShape", "BShelf", "BSlider", "BStatusBar",
-	"BStringItem", "BStringView", "BTab", "BTabView", "BTextControl", "BTextView", "BBitmap",
-	"BCursor", "BHandler", "BLooper", "BWindow", "BAlert", "BApplication", "BitmapView",
+	"BScrollBar", "BScrollView", "BSeparatorItem", "BSeparatorView", "BShape", "BShelf", "BSlider",
+	"BStatusBar", "BStringItem", "BStringView", "BTab", "BTabView", "BTextControl", "BTextView",
+	"BBitmap", "BCursor", "BHandler", "BLooper", "BWindow", "BAlert", "BApplication", "BitmapView",
 	"LayoutInheritedView", "HiliteView", "Unknown", "A::Stranger", "_BMCMenuBar_", "_BTextInput_",
 	"" };
 
@@ -38,10 +38,11 @@ const char* const kNames[] = { "class", "add_on", "_views", "_view_list", "_l_it
 	"_l_full_items", "_li_expanded", "_li_outline_level", "_submenu", "_radio", "_marked",
 	"_shortcut", "_mods", "_user_trig", "_dyn_label", "_maxwidth", "_trig_disabled", "_i_frames",
 	"be:_m_channel_count", "be:_m_value_channel", "be:_m_channel_min", "be:_m_channel_max",
-	"be:_m_channel_val", "be:_m_min_label", "_behave", "_rel", "_popup", "__widget", "_border",
-	"_but_key", "_but_alert", "_mc_mb_", "_data", "_cspace", "_rowbytes", "_bmflags", "_title",
-	"_wlook", "_wfeel", "_type", "_sizel", "_pulse", "bitmap", "_managed_archive",
-	"_managed_archivable", "BView:layout", "stranger", "stranger 2", "stranger 3" };
+	"be:_m_channel_val", "be:_m_min_label", "_behave", "_labelview", "_orientation", "_halignment",
+	"_valignment", "_rel", "_popup", "__widget", "_border", "_but_key", "_but_alert", "_mc_mb_",
+	"_data", "_cspace", "_rowbytes", "_bmflags", "_title", "_wlook", "_wfeel", "_type", "_sizel",
+	"_pulse", "bitmap", "_managed_archive", "_managed_archivable", "BView:layout", "stranger",
+	"stranger 2", "stranger 3" };
 
 constexpr float kReals[] = { 0, -0.0f, 1, -1, 0.5f, 12, 216, 1e9f, -1e9f, 1e30f, 3.5e9f, INFINITY,
 	-INFINITY, NAN };

@@ -18,7 +18,7 @@ const char* const kClasses[] = { "BView", "BControl", "BButton", "BCheckBox", "B
 	"BChannelControl", "BChannelSlider", "BColorControl", "BStatusBar", "BStringView", "BBox",
 	"BTextView", "BScrollView", "BScrollBar", "BTabView", "BTab", "BListView", "BOutlineListView",
 	"BListItem", "BStringItem", "BMenuField", "BMenu", "BMenuBar", "BPopUpMenu", "BMenuItem",
-	"BSeparatorItem", "BDragger", "BShelf", "BAlert", "BWindow", "BBitmap" };
+	"BSeparatorItem", "BSeparatorView", "BDragger", "BShelf", "BAlert", "BWindow", "BBitmap" };
 
 const char* const kIntroduction =
 	"# The classes of the Interface Kit\n"

@@ -22,6 +22,7 @@
 #include <RadioButton.h>
 #include <ScrollBar.h>
 #include <ScrollView.h>
+#include <SeparatorView.h>
 #include <Slider.h>
 #include <StatusBar.h>
 #include <StringItem.h>
@@ -153,6 +154,12 @@ Samples()
 			{ [] { return new BColorControl(BPoint(20, 20), B_CELLS_32x8, 4, "color"); } } },
 		{ "BStatusBar", { FilledStatus } },
 		{ "BStringView", { [] { return new BStringView(kFrame, "string", "Text"); } } },
+		{ "BSeparatorView", { [] {
+			 BSeparatorView* line = new BSeparatorView("line", "Label");
+			 line->MoveTo(kFrame.LeftTop());
+			 line->ResizeTo(kFrame.Width(), kFrame.Height());
+			 return line;
+		 } } },
 		{ "BBox", { [] {
 			 BBox* box = new BBox(kFrame, "box");
 			 box->SetLabel("Label");

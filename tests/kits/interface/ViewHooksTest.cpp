@@ -18,6 +18,7 @@
 #include <RadioButton.h>
 #include <ScrollBar.h>
 #include <ScrollView.h>
+#include <SeparatorView.h>
 #include <Slider.h>
 #include <StatusBar.h>
 #include <StringView.h>
@@ -144,6 +145,8 @@ TEST(ViewHooks, OfGroupsAndTextsAreCalled)
 	ExpectHooks("BBox", [](HookCounts& counts) { return new Hooked<BBox>(counts, kFrame, "box"); });
 	ExpectHooks("BStringView",
 		[](HookCounts& counts) { return new Hooked<BStringView>(counts, kFrame, "text", "Text"); });
+	ExpectHooks("BSeparatorView",
+		[](HookCounts& counts) { return new Hooked<BSeparatorView>(counts, "line", "Label"); });
 	ExpectHooks("BStatusBar",
 		[](HookCounts& counts) { return new Hooked<BStatusBar>(counts, kFrame, "bar", "Label"); });
 	ExpectHooks("BDragger", [](HookCounts& counts) {
