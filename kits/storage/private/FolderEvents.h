@@ -24,6 +24,7 @@ public:
 
 	status_t InitCheck() const { return fStatus; }
 	status_t Run();
+	const std::string& Folder() const { return fFolder; }
 
 private:
 	FolderEvents(const FolderEvents&);

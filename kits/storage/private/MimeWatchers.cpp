@@ -95,13 +95,15 @@ MimeWatchers::Start(const BMessenger& target)
 	};
 	if (!target.IsValid())
 		return B_BAD_VALUE;
+	std::unique_ptr<FolderEvents> former; // ends without the lock, which its thread may wait for
 	std::lock_guard<std::mutex> guard(fLock);
-	if (std::find(fTargets.begin(), fTargets.end(), target) != fTargets.end())
-		return B_OK;
+	if (fEvents != nullptr && fEvents->Folder() != MimeSettingsFolder())
+		former = std::move(fEvents); // another user's
 	const status_t status = fEvents == nullptr ? _Begin() : B_OK;
 	if (status != B_OK)
 		return status;
-	fTargets.push_back(target);
+	if (std::find(fTargets.begin(), fTargets.end(), target) == fTargets.end())
+		fTargets.push_back(target);
 	// Made last, so that it ends the thread before anything goes that the thread uses.
 	static const Ender ender;
 	return B_OK;
@@ -111,7 +113,7 @@ MimeWatchers::Start(const BMessenger& target)
 status_t
 MimeWatchers::Stop(const BMessenger& target)
 {
-	std::unique_ptr<FolderEvents> ended; // without the lock, which its thread may wait for
+	std::unique_ptr<FolderEvents> ended; // like the former one above
 	std::lock_guard<std::mutex> guard(fLock);
 	const auto found = std::find(fTargets.begin(), fTargets.end(), target);
 	if (found == fTargets.end())
