@@ -266,12 +266,8 @@ private:
 		status_t status = B_OK;
 		if (!fOrder.empty())
 			status = put_field_like(root, fOrigin->root, kObjects, list);
-		BMessage mark;
-		mark.AddBool(kMark, true);
-		const bool hadMark = fOrigin->root.FindBool(kMark);
-		if (status == B_OK) {
-			status = put_field_like(root, fOrigin->root, kMark, hadMark ? mark : fOrigin->root);
-		}
+		if (status == B_OK)
+			status = put_field_like(root, fOrigin->root, kMark, fOrigin->root);
 		return status;
 	}
 

@@ -9,7 +9,12 @@ namespace BPrivate {
 bool
 is_managed_archive(const BMessage& archive)
 {
-	return archive.HasBool(kMark);
+	if (!archive.HasBool(kMark))
+		return false;
+	// Children that are there themselves, and no list: such a tree is nested whatever its mark says.
+	return archive.HasMessage(kObjects)
+		|| (count_of(archive, kViews, B_MESSAGE_TYPE) == 0
+			&& count_of(archive, kTabViews, B_MESSAGE_TYPE) == 0);
 }
 
 

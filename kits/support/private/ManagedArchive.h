@@ -6,7 +6,8 @@
 namespace BPrivate {
 
 
-// Whether the message carries the mark of a managed archive's root.
+// Whether the message is a managed archive's root: it carries the mark, and its children, if it has
+// any, are not nested.
 bool is_managed_archive(const BMessage& archive);
 
 // Turns a managed archive into the nested form in place: each token of "_views", and of a tab view's

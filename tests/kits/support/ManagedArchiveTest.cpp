@@ -93,6 +93,18 @@ TEST(ManagedArchive, BecomesNestedAndManagedAgain)
 }
 
 
+TEST(ManagedArchive, TheMarkKeepsItsByte)
+{
+	BMessage archive = managed_tree();
+	const uint8 odd = 0x25;
+	ASSERT_EQ(B_OK, archive.ReplaceData("_managed_archive", B_BOOL_TYPE, &odd, sizeof(odd)));
+	const BMessage original(archive);
+	ASSERT_EQ(B_OK, unmanage_archive(&archive));
+	ASSERT_EQ(B_OK, manage_archive(&archive));
+	EXPECT_EQ("", test::first_difference(original, archive));
+}
+
+
 TEST(ManagedArchive, WhatIsNestedStaysNested)
 {
 	BMessage root = object("BView");
@@ -102,6 +114,24 @@ TEST(ManagedArchive, WhatIsNestedStaysNested)
 	EXPECT_EQ(B_OK, unmanage_archive(&root));
 	EXPECT_EQ(B_OK, manage_archive(&root));
 	EXPECT_TRUE(root.HasSameData(original, false, true));
+}
+
+
+TEST(ManagedArchive, AMarkOnANestedTreeIsAFieldLikeOthers)
+{
+	BMessage archive = object("BView");
+	const BMessage child = object("BBox");
+	archive.AddMessage("_views", &child);
+	archive.AddBool("_managed_archive", true);
+	const BMessage original(archive);
+	EXPECT_FALSE(is_managed_archive(archive));
+	ASSERT_EQ(B_OK, unmanage_archive(&archive));
+	EXPECT_FALSE(has_managed_note(archive));
+	ASSERT_EQ(B_OK, manage_archive(&archive));
+	EXPECT_EQ("", test::first_difference(original, archive));
+
+	archive.RemoveName("_views");
+	EXPECT_TRUE(is_managed_archive(archive));
 }
 
 
