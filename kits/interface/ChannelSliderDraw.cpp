@@ -174,7 +174,9 @@ BChannelSlider::_ValueAt(BPoint where, int32 channel)
 	if (range <= 0 || minimum >= maximum)
 		return ValueFor(channel);
 	const BPoint place = where - fGrabbed - MiddleOf(ThumbFrameFor(channel));
-	double part = std::clamp((_IsVertical() ? place.y : place.x) / range, 0.0, 1.0);
+	double part = (_IsVertical() ? place.y : place.x) / range;
+	// Not clamped: a frame without end gives a place that is no number.
+	part = part > 0 ? std::min(part, 1.0) : 0;
 	if (_IsVertical())
 		part = 1 - part;
 	return static_cast<int32>(std::round(minimum + part * (maximum - minimum)));

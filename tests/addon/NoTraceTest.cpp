@@ -12,6 +12,7 @@
 
 #include <Box.h>
 #include <Button.h>
+#include <ChannelSlider.h>
 #include <CheckBox.h>
 #include <Slider.h>
 #include <StringView.h>
@@ -37,6 +38,7 @@ Design()
 	box->AddChild(new BButton(BRect(21, 33, 119, 57), "button", "Press", NULL));
 	box->AddChild(new BSlider(BRect(21, 83, 219, 120), "slider", "How much", NULL, 0, 99));
 	box->AddChild(new BCheckBox(BRect(131, 37, 230, 53), "check", "Check", NULL));
+	root.AddChild(new BChannelSlider(BRect(161, 197, 291, 247), "channels", "Both", NULL, 2));
 	root.AddChild(new BStringView(BRect(17, 203, 150, 220), "text", "Some text"));
 	BMessage archive;
 	root.Archive(&archive, true);
@@ -78,7 +80,7 @@ protected:
 TEST_P(NoTrace, IsLeftByKeysResizesAndDrags)
 {
 	Driver& input = scene.Input();
-	for (const char* name : { "button", "slider", "check", "text", "box" }) {
+	for (const char* name : { "button", "slider", "check", "text", "channels", "box" }) {
 		BView* view = scene.Root()->FindView(name);
 		input.Click(view, BPoint(3, 3));
 		ASSERT_EQ(view, scene.Work()->SelectedView()) << name;
