@@ -1,5 +1,8 @@
 #include "storage/private/MimeSettings.h"
 
+#include <errno.h>
+#include <fcntl.h>
+#include <sys/file.h>
 #include <unistd.h>
 
 #include <mutex>
@@ -12,6 +15,7 @@
 #include <Path.h>
 
 #include "storage/private/AtomicFile.h"
+#include "storage/private/Descriptor.h"
 #include "storage/private/Errno.h"
 #include "storage/private/MimeIndex.h"
 #include "storage/private/MimeWatchers.h"
@@ -42,6 +46,36 @@ PathFor(const std::string& type, bool create, BPath* _path)
 		status = _path->Append(leaf.c_str());
 	return status;
 }
+
+
+// While it lives no other thread and no other program changes settings. Where the folder cannot be
+// locked, as on some file systems of other machines, only threads wait.
+class SettingsLock {
+public:
+	explicit SettingsLock(bool createFolder) : fGuard(sSettingsLock), fFolder(-1)
+	{
+		BPath path;
+		if (PathFor("", createFolder, &path) == B_OK)
+			fFolder = OpenAt(AT_FDCWD, path.Path(), O_RDONLY | O_DIRECTORY);
+		if (fFolder < 0)
+			return;
+		while (flock(fFolder, LOCK_EX) < 0 && errno == EINTR) {
+		}
+	}
+
+	~SettingsLock()
+	{
+		if (fFolder >= 0)
+			close(fFolder);
+	}
+
+private:
+	SettingsLock(const SettingsLock&);
+	SettingsLock& operator=(const SettingsLock&);
+
+	std::lock_guard<std::mutex> fGuard;
+	int fFolder; // open as long as it is locked
+};
 
 } // namespace
 
@@ -97,7 +131,7 @@ WriteMimeSettings(const std::string& type, const BMessage& settings)
 status_t
 RemoveMimeSettings(const std::string& type)
 {
-	std::lock_guard<std::mutex> guard(sSettingsLock);
+	const SettingsLock lock(false);
 	BPath path;
 	const status_t status = PathFor(type, false, &path);
 	if (status != B_OK)
@@ -164,7 +198,7 @@ MimeSettingsOf(const char* type)
 status_t
 ChangeMimeSettings(const char* type, const std::function<status_t(BMessage& settings)>& change)
 {
-	std::lock_guard<std::mutex> guard(sSettingsLock);
+	const SettingsLock lock(true);
 	BMessage settings = MimeSettingsOf(type);
 	const status_t status = change(settings);
 	return status == B_OK ? WriteMimeSettings(LowerCaseType(type), settings) : status;

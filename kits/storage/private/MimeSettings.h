@@ -40,8 +40,8 @@ std::string TypeOfMimeSettings(const std::string& leaf);
 std::string LowerCaseType(const char* type);
 // The type's settings; an empty message when it has none.
 BMessage MimeSettingsOf(const char* type);
-// Lets `change` work on the settings and writes them back if that answers B_OK. Other changes by
-// this program wait meanwhile.
+// Lets `change` work on the settings and writes them back if that answers B_OK. Other changes, by
+// this and by other programs, wait meanwhile.
 status_t ChangeMimeSettings(
 	const char* type, const std::function<status_t(BMessage& settings)>& change);
 

@@ -135,6 +135,15 @@ TEST_F(MimeProgramTest, SetsADescription)
 }
 
 
+TEST_F(MimeProgramTest, SetsManyTimes)
+{
+	for (int32 i = 0; i < 100; i++) {
+		const std::string text = "other " + std::to_string(i);
+		EXPECT_EQ(B_OK, BMimeType("x-test/both").SetLongDescription(text.c_str()));
+	}
+}
+
+
 TEST_F(MimeProgramTest, DeletesAType)
 {
 	EXPECT_EQ(B_OK, BMimeType("x-test/other").Install());
@@ -277,6 +286,29 @@ TEST_F(MimeWatchTest, WhatOtherProgramsSetIsToldOnce)
 	ASSERT_EQ(0, RunOther("SetsADescription"));
 	EXPECT_EQ(Changes({ "x-test/other created", "x-test/other short" }),
 		fWatcher->TakeUntil("x-test/other short"));
+}
+
+
+// Each reads the settings, changes them and writes them back: neither undoes the other's change.
+TEST_F(MimeWatchTest, ProgramsThatSetAtOnceKeepEachOthersValues)
+{
+	BMimeType type("x-test/both");
+	int32 lost = 0;
+	std::thread other([] { EXPECT_EQ(0, RunOther("SetsManyTimes")); });
+	for (int32 i = 0; i < 100; i++) {
+		const std::string text = "this " + std::to_string(i);
+		EXPECT_EQ(B_OK, type.SetShortDescription(text.c_str()));
+		char found[B_MIME_TYPE_LENGTH + 1] = "";
+		type.GetShortDescription(found);
+		lost += text != found;
+	}
+	other.join();
+	char found[B_MIME_TYPE_LENGTH + 1] = "";
+	EXPECT_EQ(B_OK, type.GetShortDescription(found));
+	EXPECT_STREQ("this 99", found);
+	EXPECT_EQ(B_OK, type.GetLongDescription(found));
+	EXPECT_STREQ("other 99", found);
+	EXPECT_EQ(0, lost);
 }
 
 

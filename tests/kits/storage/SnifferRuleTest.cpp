@@ -313,7 +313,9 @@ TEST_F(BMimeTypeTest, RandomRulesAreReadOrRefused)
 			text += ")";
 		BString error;
 		if (BMimeType::CheckSnifferRule(text.c_str(), &error) == B_OK) {
-			rules++;
+			// Now and then one is tried, on bytes that some of them match.
+			if (++rules % 100 == 0)
+				Matches(text, "aaaa\nA" + text);
 			continue;
 		}
 		int place = 0;
