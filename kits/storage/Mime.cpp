@@ -6,15 +6,9 @@
 
 #include <set>
 #include <string>
-#include <vector>
 
-#include <Directory.h>
-#include <Entry.h>
-#include <File.h>
 #include <Message.h>
 #include <Messenger.h>
-#include <NodeInfo.h>
-#include <Path.h>
 
 #include "storage/private/MimeDatabase.h"
 #include "storage/private/MimeSettings.h"
@@ -266,38 +260,4 @@ BMimeType::IsValid(const char* type)
 			return false;
 	}
 	return true;
-}
-
-
-status_t
-update_mime_info(const char* path, int recursive, int, int force)
-{
-	if (path == NULL)
-		return B_BAD_VALUE;
-	const BEntry entry(path);
-	entry_ref ref;
-	status_t status = entry.GetRef(&ref);
-	if (status == B_OK && !entry.Exists())
-		status = B_ENTRY_NOT_FOUND;
-	if (status != B_OK)
-		return status;
-
-	BNode node(&entry);
-	attr_info info;
-	if (force != 0 || node.GetAttrInfo("BEOS:TYPE", &info) != B_OK) {
-		BMimeType type;
-		status = BMimeType::GuessMimeType(&ref, &type);
-		if (status == B_OK)
-			status = BNodeInfo(&node).SetType(type.Type());
-	}
-	if (status != B_OK || recursive == 0 || !entry.IsDirectory())
-		return status;
-	BDirectory directory(&entry);
-	BEntry child;
-	while (status == B_OK && directory.GetNextEntry(&child) == B_OK) {
-		BPath childPath;
-		if (child.GetPath(&childPath) == B_OK)
-			status = update_mime_info(childPath.Path(), 1, 1, force);
-	}
-	return status;
 }

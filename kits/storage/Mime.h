@@ -157,3 +157,9 @@ private:
 // Writes the type that is guessed to the file's attributes: where it has none, or always if
 // `force` is set. A folder's files too if `recursive` is set.
 status_t update_mime_info(const char* path, int recursive, int synchronous, int force);
+
+// Makes the signature of a program's file known as a type: with the file as its hint and the name
+// as its description, with the file's icons and the types that it supports. What is set already
+// stays unless `force` is set. B_ENTRY_NOT_FOUND for a file without a signature; of a folder all
+// programs are taken if `recursive` is set, and other files are passed over.
+status_t create_app_meta_mime(const char* path, int recursive, int synchronous, int force);

@@ -1,6 +1,11 @@
+#include <string.h>
+
+#include <filesystem>
 #include <string>
 
 #include <AppFileInfo.h>
+#include <Bitmap.h>
+#include <Entry.h>
 #include <File.h>
 #include <Message.h>
 #include <Mime.h>
@@ -149,4 +154,52 @@ TEST_F(BMimeTypeTest, AProgramsFileTellsWhatItSupports)
 	EXPECT_EQ("application/x-vnd.test", AppsFor("x-test/b"));
 	ASSERT_EQ(B_OK, info.SetSupportedTypes(NULL, true));
 	EXPECT_EQ("", AppsFor("x-test/b"));
+}
+
+
+TEST_F(BMimeTypeTest, AProgramsFileMakesItsSignatureKnown)
+{
+	std::filesystem::create_directories(fFolder / "apps/more");
+	const std::string path = fFolder / "apps/more/Program";
+	WriteFile(path, "");
+	WriteFile(fFolder / "apps/other", "no program");
+	BBitmap icon(BRect(0, 0, 15, 15), B_CMAP8);
+	memset(icon.Bits(), 7, icon.BitsLength());
+	BMessage types = Types({ "x-test/a" });
+	{
+		BFile file(path.c_str(), B_READ_WRITE);
+		BAppFileInfo info(&file);
+		ASSERT_EQ(B_OK, info.SetSupportedTypes(&types));
+		ASSERT_EQ(B_OK, info.SetIcon(&icon, B_MINI_ICON));
+		ASSERT_EQ(B_OK, info.SetIconForType("x-test/a", &icon, B_MINI_ICON));
+		ASSERT_EQ(B_OK, info.SetSignature("application/x-vnd.test"));
+	}
+	EXPECT_EQ(B_ENTRY_NOT_FOUND, create_app_meta_mime((fFolder / "apps/other").c_str(), 0, 1, 0));
+	EXPECT_EQ(B_ENTRY_NOT_FOUND, create_app_meta_mime((fFolder / "none").c_str(), 1, 1, 0));
+	EXPECT_EQ(B_BAD_VALUE, create_app_meta_mime(NULL, 1, 1, 0));
+	ASSERT_EQ(B_OK, create_app_meta_mime((fFolder / "apps").c_str(), 1, 1, 0));
+
+	BMimeType app("application/x-vnd.test");
+	entry_ref hint;
+	ASSERT_EQ(B_OK, app.GetAppHint(&hint));
+	EXPECT_STREQ("Program", hint.name);
+	char text[B_MIME_TYPE_LENGTH + 1];
+	ASSERT_EQ(B_OK, app.GetShortDescription(text));
+	EXPECT_STREQ("Program", text);
+	EXPECT_EQ("application/x-vnd.test", AppsFor("x-test/a"));
+	for (const char* type : { static_cast<const char*>(NULL), "x-test/a" }) {
+		BBitmap found(BRect(0, 0, 15, 15), B_CMAP8);
+		ASSERT_EQ(B_OK, app.GetIconForType(type, &found, B_MINI_ICON));
+		EXPECT_EQ(0, memcmp(icon.Bits(), found.Bits(), icon.BitsLength()));
+		EXPECT_EQ(B_ENTRY_NOT_FOUND, app.GetIconForType(type, &found, B_LARGE_ICON));
+	}
+
+	// What was set stays unless it is to be replaced.
+	ASSERT_EQ(B_OK, app.SetShortDescription("A test"));
+	ASSERT_EQ(B_OK, create_app_meta_mime(path.c_str(), 0, 1, 0));
+	ASSERT_EQ(B_OK, app.GetShortDescription(text));
+	EXPECT_STREQ("A test", text);
+	ASSERT_EQ(B_OK, create_app_meta_mime(path.c_str(), 0, 1, 1));
+	ASSERT_EQ(B_OK, app.GetShortDescription(text));
+	EXPECT_STREQ("Program", text);
 }
