@@ -178,7 +178,7 @@ ArchiveWriter::_Write(const char* name, std::span<const Value> values,
 		Value read;
 		if ((fSource.*find)(name, static_cast<int32>(i), &read) != B_OK)
 			read = absent[i];
-		unchanged = read == values[i];
+		unchanged = same_value(read, values[i]);
 	}
 	if (Keep(name, unchanged) || !wanted)
 		return;

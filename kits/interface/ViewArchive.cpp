@@ -208,7 +208,7 @@ BView::_ArchiveOwnFields(BMessage* archive) const
 	ArchiveWriter writer(archive);
 	const ArchivedState read = read_archived_state(writer.Source());
 	const BRect frame = Frame();
-	if (!writer.Keep("_frame", frame == read.frame))
+	if (!writer.Keep("_frame", same_value(frame, read.frame)))
 		archive->AddRect("_frame", frame);
 	const uint32 changed = fNode->Word() ^ fRevivedWord;
 	if (!writer.Keep("_resize_mode", (changed & _RESIZE_MASK_) == 0))
@@ -288,19 +288,20 @@ BView::_ArchiveModes(BMessage* archive, const DrawState& now, const DrawState& r
 {
 	ArchiveWriter writer(archive);
 	const auto touched = [this](uint32 bit) { return (fTouched & bit) != 0; };
-	if (!writer.Keep("_origin", now.origin == read.origin) && touched(kTouchedOrigin))
+	if (!writer.Keep("_origin", same_value(now.origin, read.origin)) && touched(kTouchedOrigin))
 		archive->AddPoint("_origin", now.origin);
-	if (!writer.Keep("_scale", now.scale == read.scale) && touched(kTouchedScale))
+	if (!writer.Keep("_scale", same_value(now.scale, read.scale)) && touched(kTouchedScale))
 		archive->AddFloat("_scale", now.scale);
-	if (!writer.Keep("_psize", now.penSize == read.penSize) && touched(kTouchedPenSize))
+	if (!writer.Keep("_psize", same_value(now.penSize, read.penSize)) && touched(kTouchedPenSize))
 		archive->AddFloat("_psize", now.penSize);
 	// Drawing moves the pen too, but that is nothing to remember.
-	const bool samePen = now.penLocation == read.penLocation || !touched(kTouchedPenLocation);
+	const bool samePen =
+		same_value(now.penLocation, read.penLocation) || !touched(kTouchedPenLocation);
 	if (!writer.Keep("_ploc", samePen) && touched(kTouchedPenLocation))
 		archive->AddPoint("_ploc", now.penLocation);
 
 	const bool sameLine = now.lineCap == read.lineCap && now.lineJoin == read.lineJoin
-		&& now.miterLimit == read.miterLimit;
+		&& same_value(now.miterLimit, read.miterLimit);
 	const bool keptMode = writer.Keep("_lmcapjoin", sameLine);
 	const bool keptMiter = writer.Keep("_lmmiter", sameLine);
 	if (!keptMode && !keptMiter && touched(kTouchedLineMode)) {

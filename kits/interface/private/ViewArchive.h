@@ -46,6 +46,7 @@
 // class's Archive().
 #pragma once
 
+#include <cmath>
 #include <span>
 
 #include <GraphicsDefs.h>
@@ -99,6 +100,36 @@ _EXPORT status_t archive_as_child(const BView* view, BMessage* archive);
 // Whether the archive that begin_archive() was called for has become, byte by byte, what the object
 // was read from. Fields that were kept are not looked at, whatever they hold.
 bool is_as_read(const BMessage& archive);
+
+
+// Whether a value is still what was read. Numbers that are none are the same as each other.
+template<typename Value>
+bool
+same_value(const Value& a, const Value& b)
+{
+	return a == b;
+}
+
+
+inline bool
+same_value(float a, float b)
+{
+	return a == b || (std::isnan(a) && std::isnan(b));
+}
+
+
+inline bool
+same_value(BPoint a, BPoint b)
+{
+	return same_value(a.x, b.x) && same_value(a.y, b.y);
+}
+
+
+inline bool
+same_value(BRect a, BRect b)
+{
+	return same_value(a.LeftTop(), b.LeftTop()) && same_value(a.RightBottom(), b.RightBottom());
+}
 
 
 // Writes fields into an archive that begin_archive() was called for, or into one of a new object.

@@ -1,9 +1,13 @@
 // Views that are in no window: everything may be called, and what needs a window does nothing.
+#include <limits>
 #include <memory>
+#include <vector>
 
 #include <Application.h>
 #include <InterfaceKit.h>
 #include <gtest/gtest.h>
+
+#include "support/Dump.h"
 
 namespace {
 
@@ -37,7 +41,51 @@ UseInput(BView* view)
 	view->Pulse();
 }
 
+// Values that count as none, in the field and behind it.
+void
+PutNoNumbers(BMessage* archive, const char* name, type_code type, size_t floats)
+{
+	const std::vector<float> none(floats, std::numeric_limits<float>::quiet_NaN());
+	const auto size = static_cast<ssize_t>(floats * sizeof(float));
+	archive->RemoveName(name);
+	for (int32 i = 0; i < 4; i++)
+		ASSERT_EQ(B_OK, archive->AddData(name, type, none.data(), size));
+}
+
 } // namespace
+
+
+TEST_P(DetachedViews, WriteNumbersThatAreNoneAsTheyWere)
+{
+	BMessage usual;
+	ASSERT_EQ(B_OK, view->Archive(&usual));
+	for (const char* name : { "_scale", "_psize", "_lmmiter" })
+		usual.AddFloat(name, 1);
+	usual.AddInt16("_lmcapjoin", B_BUTT_CAP);
+	usual.AddInt16("_lmcapjoin", B_MITER_JOIN);
+	for (const char* name : { "_origin", "_ploc" })
+		usual.AddPoint(name, BPoint(0, 0));
+
+	char* name;
+	type_code type;
+	for (int32 i = 0; usual.GetInfo(B_ANY_TYPE, i, &name, &type) == B_OK; i++) {
+		const size_t floats = type == B_FLOAT_TYPE ? 1
+			: type == B_POINT_TYPE                 ? 2
+			: type == B_RECT_TYPE                  ? 4
+												   : 0;
+		if (floats == 0)
+			continue;
+		SCOPED_TRACE(name);
+		BMessage archive(usual);
+		PutNoNumbers(&archive, name, type, floats);
+		BMessage read(archive);
+		const std::unique_ptr<BArchivable> object(instantiate_object(&read));
+		ASSERT_NE(nullptr, object);
+		BMessage written;
+		ASSERT_EQ(B_OK, object->Archive(&written));
+		EXPECT_EQ("", test::first_difference(archive, written));
+	}
+}
 
 
 TEST_P(DetachedViews, TakeInputWithoutAWindow)
