@@ -56,6 +56,18 @@ private:
 		return view.IsEmpty() && view.what == 0 && note_of(view) == nullptr;
 	}
 
+	// False for an item that names nothing: it is negative, or has another size.
+	static bool find_token(const BMessage& object, const char* name, int32 index, int32* _token)
+	{
+		const void* data;
+		ssize_t size;
+		if (object.FindData(name, B_INT32_TYPE, index, &data, &size) != B_OK
+			|| size != sizeof(*_token))
+			return false;
+		std::memcpy(_token, data, sizeof(*_token));
+		return *_token >= 0;
+	}
+
 	// Parents come first, in the order in which the form numbers its objects.
 	Children _Collect(const BMessage& parent, int32 depth)
 	{
@@ -200,8 +212,8 @@ private:
 		status_t status = B_OK;
 		const int32 count = count_of(*message, name, B_INT32_TYPE);
 		for (int32 i = 0; i < count && status == B_OK; i++) {
-			const int32 token = message->FindInt32(name, i);
-			if (token < 0)
+			int32 token;
+			if (!find_token(*message, name, i, &token))
 				continue;
 			// A number from somewhere else names nothing here.
 			const bool known = isOfOrigin && token <= fOrigin->objectCount;

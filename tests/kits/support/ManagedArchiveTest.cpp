@@ -355,6 +355,25 @@ TEST(ManagedArchive, FieldsThatNameNoObjectStayAsTheyAre)
 }
 
 
+TEST(ManagedArchive, ItemsThatAreLongerThanTokensAreNone)
+{
+	BMessage foreign = object("MyLayout");
+	const char bytes[] = { 3, 0, 0, 0, 127 };
+	for (int32 i = 0; i < 2; i++)
+		ASSERT_EQ(B_OK, foreign.AddData("_l_items", B_INT32_TYPE, bytes, sizeof(bytes), false));
+	BMessage root = object("BView", { 1 });
+	const BMessage child = object("BBox");
+	root.AddMessage("_managed_archivable", &child);
+	root.AddMessage("_managed_archivable", &foreign);
+	root.AddBool("_managed_archive", true);
+
+	BMessage archive(root);
+	ASSERT_EQ(B_OK, unmanage_archive(&archive));
+	ASSERT_EQ(B_OK, manage_archive(&archive));
+	EXPECT_EQ("", test::first_difference(root, archive));
+}
+
+
 TEST(ManagedArchive, SamplesComeBackExactly)
 {
 	if (test::samples_folder().empty())
