@@ -10,6 +10,7 @@
 #include <Message.h>
 #include <Window.h>
 
+#include "interface/private/InnerChild.h"
 #include "interface/private/Look.h"
 #include "interface/private/MenuFieldBar.h"
 #include "interface/private/MenuTracker.h"
@@ -64,7 +65,7 @@ BMenuField::BMenuField(BMessage* archive) : BView(archive)
 	if (archive->FindBool("be:dmark", &flag) == B_OK)
 		fPopUpMarker = flag;
 
-	if (FindView(kBarName) == NULL)
+	if (BPrivate::inner_child(this, kBarName) == NULL)
 		_CreateBar(new BMenu(""));
 }
 

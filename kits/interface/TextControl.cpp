@@ -7,6 +7,7 @@
 #include <TextView.h>
 #include <Window.h>
 
+#include "interface/private/InnerChild.h"
 #include "interface/private/Look.h"
 #include "interface/private/TextControlParts.h"
 #include "interface/private/TextInput.h"
@@ -52,7 +53,7 @@ BTextControl::BTextControl(BMessage* archive) : BControl(archive)
 	if (archive->FindMessage("_mod_msg", &modification) == B_OK)
 		fModificationMessage = new BMessage(modification);
 
-	BView* input = FindView(kInputName);
+	BView* input = BPrivate::inner_child(this, kInputName);
 	if (input == NULL) {
 		_CreateInput(Flags() & B_NAVIGABLE);
 		_ShowEnabled();

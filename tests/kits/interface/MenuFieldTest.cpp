@@ -186,3 +186,18 @@ TEST(MenuField, RevivedFieldIsNotAdjustedByAttaching)
 		EXPECT_TRUE(again.HasSameData(archive));
 	});
 }
+
+
+TEST(MenuField, HasABarThoughItBearsThatsName)
+{
+	BApplication app("application/x-vnd.Archway-test");
+	BMessage archive;
+	archive.AddString("class", "BMenuField");
+	archive.AddString("_name", "_mc_mb_");
+	archive.AddRect("_frame", BRect(0, 0, 99, 19));
+	const std::unique_ptr<BMenuField> revived(
+		dynamic_cast<BMenuField*>(instantiate_object(&archive)));
+	ASSERT_NE(nullptr, revived);
+	ASSERT_NE(nullptr, revived->MenuBar());
+	EXPECT_NE(nullptr, revived->Menu());
+}

@@ -315,3 +315,18 @@ TEST(TextControl, RevivedControlIsNotAdjustedByAttaching)
 		EXPECT_TRUE(again.HasSameData(archive));
 	});
 }
+
+
+TEST(TextControl, HasATextThoughItBearsThatsName)
+{
+	BApplication app("application/x-vnd.Archway-test");
+	BMessage archive;
+	archive.AddString("class", "BTextControl");
+	archive.AddString("_name", "_input_");
+	archive.AddRect("_frame", BRect(0, 0, 99, 19));
+	const std::unique_ptr<BTextControl> revived(
+		dynamic_cast<BTextControl*>(instantiate_object(&archive)));
+	ASSERT_NE(nullptr, revived);
+	ASSERT_NE(nullptr, revived->TextView());
+	EXPECT_EQ(revived.get(), revived->TextView()->Parent());
+}
